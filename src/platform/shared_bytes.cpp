@@ -1,0 +1,27 @@
+#include "platform/shared_bytes.h"
+
+#include <cstring>
+#include <new>
+#include <stdexcept>
+
+namespace vesk {
+
+SharedBytes SharedBytes::copy(std::string_view bytes) {
+  if (bytes.empty()) return SharedBytes();
+  if (bytes.size() > UINT32_MAX) throw std::length_error("text or data beyond 4 GiB");
+  void* storage = ::operator new(sizeof(Block) + bytes.size());
+  char* content = static_cast<char*>(storage) + sizeof(Block);
+  std::memcpy(content, bytes.data(), bytes.size());
+  return SharedBytes(new (storage) Block{content, static_cast<std::uint32_t>(bytes.size()), 1});
+}
+
+void SharedBytes::release() noexcept {
+  // The only owner need not pay for a locked decrement: nobody else can take a count any more.
+  if (block_->owners.load(std::memory_order_acquire) == 1 ||
+      block_->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
+    block_->~Block();
+    ::operator delete(block_);
+  }
+}
+
+}  // namespace vesk
