@@ -21,12 +21,21 @@ schema    protobuf-compiler   protoc
 shell     shellcheck          shellcheck
 '
 
+# is_there PROOF
+is_there() {
+  if [[ $1 == /* ]]; then
+    [[ -e $1 ]]
+  else
+    command -v "$1" >/dev/null
+  fi
+}
+
 # missing_packages PURPOSE…: sets `missing` to the packages of these purposes that are not installed.
 missing_packages() {
   local purpose package proof
   missing=()
   while read -r purpose package proof; do
-    if [[ -n $purpose && " $* " == *" $purpose "* && ! -e $proof ]] && ! command -v "$proof" >/dev/null; then
+    if [[ -n $purpose && " $* " == *" $purpose "* ]] && ! is_there "$proof"; then
       missing+=("$package")
     fi
   done <<<"$package_table"
