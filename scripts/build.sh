@@ -1,6 +1,6 @@
 # How a preset is built and tested. Sourced.
 
-source "$(dirname -- "${BASH_SOURCE[0]}")/packages.sh"
+source "${BASH_SOURCE[0]%/*}/packages.sh"
 
 # is_configured PRESET TESTS: whether the build directory was made in this very place, from the presets as they stand,
 # with the tests or (TESTS is OFF) at least without them.
@@ -32,7 +32,7 @@ ninja_in() {
 build() {
   local preset=$1 tests=$2 purposes=(build) lock
   shift 2
-  mkdir -p "$root/build"
+  [[ -d $root/build ]] || mkdir -p "$root/build"
   exec {lock}>"$root/build/$preset.lock"
   if ! flock --nonblock "$lock"; then
     say "waiting for another build of preset $preset"
