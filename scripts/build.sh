@@ -51,7 +51,7 @@ run_tests() {
   local preset=$1 log status=0 line
   build "$preset" ON
   log=$root/build/$preset/tests.log
-  (cd "$root" && ctest --preset "$preset" --parallel "$(nproc)" --no-tests=error) >"$log" 2>&1 </dev/null || status=$?
+  (cd "$root" && GTEST_BRIEF=1 ctest --preset "$preset" --parallel "$(nproc)" --no-tests=error) >"$log" 2>&1 </dev/null || status=$?
   ((status == 0)) || grep -vE '^ *Start +[0-9]+:|^ *[0-9]+/[0-9]+ Test .* Passed ' "$log" >&2 || true
   line=$(grep -E 'tests passed' "$log") || line='no test was run'
   printf '%s\n' "$line"
