@@ -116,8 +116,7 @@ bool RecordedEventParser::readFields(std::string_view line, Fields& fields) {
   if (first == std::string_view::npos || line[first] != '{') return fail("no JSON object");
 
   ondemand::parser& parser = json_->parser;
-  if (parser.capacity() < line.size() &&
-      parser.allocate(std::max(kUsualLine, line.size() * 2)) != simdjson::SUCCESS) {
+  if (parser.capacity() < line.size() && parser.allocate(std::max(kUsualLine, line.size() * 2)) != simdjson::SUCCESS) {
     return fail("too long for the memory there is");
   }
   ondemand::document document;

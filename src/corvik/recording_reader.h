@@ -31,8 +31,7 @@ class RecordingReader {
   /// Over the file at `path`; "-" is standard input. One that cannot be opened shows in failure().
   explicit RecordingReader(const std::string& path);
   /// Over an open descriptor, called `name` in messages.
-  RecordingReader(FileDescriptor descriptor, std::string name,
-                  std::size_t longestLine = LineReader::kLongestLine);
+  RecordingReader(FileDescriptor descriptor, std::string name, std::size_t longestLine = LineReader::kLongestLine);
 
   /// See LineReader::BeforeRead: the place to write out what is buffered, or to wait with a way out.
   void setBeforeRead(LineReader::BeforeRead beforeRead) { lines_.setBeforeRead(std::move(beforeRead)); }

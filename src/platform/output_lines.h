@@ -52,7 +52,7 @@ class DescriptorSink : public OutputSink {
   int descriptor_;
   std::string name_;
   bool isTerminal_;
-  /// The most that is written at once; a pipe that has room at all has room for this.
+  /// The most that is written at once while an interrupt is watched; a pipe that has room at all has room for this.
   std::size_t chunk_;
   const WakeUp* interrupt_ = nullptr;
   FailureHandler onFailure_;
