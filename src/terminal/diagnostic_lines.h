@@ -3,8 +3,11 @@
 #include <cstddef>
 #include <cstdint>
 #include <deque>
+#include <functional>
 #include <string>
 #include <string_view>
+
+#include "platform/output_lines.h"
 
 namespace vesk {
 
@@ -18,7 +21,10 @@ class DiagnosticLines {
     if (lines_.size() == capacity_) lines_.pop_front();
     lines_.emplace_back(line);
     ++total_;
+    if (observer_) observer_();
   }
+  /// `observer` is called after every line.
+  void setObserver(std::function<void()> observer) { observer_ = std::move(observer); }
 
   [[nodiscard]] const std::deque<std::string>& lines() const { return lines_; }
   /// How many there ever were.
@@ -28,6 +34,20 @@ class DiagnosticLines {
   std::size_t capacity_;
   std::deque<std::string> lines_;
   std::uint64_t total_ = 0;
+  std::function<void()> observer_;
+};
+
+/// Brings the program's output lines there instead of to standard output.
+class DiagnosticSink : public OutputSink {
+ public:
+  /// `lines` must outlive the sink.
+  explicit DiagnosticSink(DiagnosticLines& lines) : lines_(lines) {}
+
+  void write(std::string_view line) override { lines_.append(line); }
+  void flush() override {}
+
+ private:
+  DiagnosticLines& lines_;
 };
 
 }  // namespace vesk

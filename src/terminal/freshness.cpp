@@ -25,7 +25,7 @@ constexpr std::array kUnits{
 
 }  // namespace
 
-Freshness freshnessOf(const Arrivals& arrivals, TimePoint now) {
+Freshness freshnessOf(const Arrivals& arrivals, Clock::Instant now) {
   if (!arrivals.last || arrivals.count == 0) return {"never"};
   const auto age = std::max(std::chrono::duration_cast<std::chrono::seconds>(now - *arrivals.last),
                             std::chrono::seconds(0));

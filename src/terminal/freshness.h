@@ -11,9 +11,9 @@ namespace vesk {
 struct Freshness {
   std::string text;
   /// When the text will be another one by the passing of time.
-  std::optional<TimePoint> nextChange{};
+  std::optional<Clock::Instant> nextChange{};
 };
 
-[[nodiscard]] Freshness freshnessOf(const Arrivals& arrivals, TimePoint now);
+[[nodiscard]] Freshness freshnessOf(const Arrivals& arrivals, Clock::Instant now);
 
 }  // namespace vesk

@@ -46,7 +46,7 @@ bool opensString(unsigned char byte) {
 
 }  // namespace
 
-void InputMachine::feed(std::string_view bytes, TimePoint now, std::vector<InputEvent>& events) {
+void InputMachine::feed(std::string_view bytes, Clock::Instant now, std::vector<InputEvent>& events) {
   advance(now, events);
   for (const char byte : bytes)
     take(byte, events);
@@ -59,7 +59,7 @@ void InputMachine::feed(std::string_view bytes, TimePoint now, std::vector<Input
   }
 }
 
-void InputMachine::advance(TimePoint now, std::vector<InputEvent>& events) {
+void InputMachine::advance(Clock::Instant now, std::vector<InputEvent>& events) {
   if (!deadline_ || now < *deadline_) return;
   deadline_.reset();
   if (state_ == State::Escape) events.push_back(KeyEvent{.key = Key::Escape});

@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "platform/clock.h"
 #include "terminal/input_event.h"
 
 namespace vesk {
@@ -16,19 +17,17 @@ namespace vesk {
 /// swallowed whole, and so are bytes that are no UTF-8.
 class InputMachine {
  public:
-  using TimePoint = std::chrono::steady_clock::time_point;
-
   /// An Escape that nothing follows for this long was the key.
   static constexpr std::chrono::milliseconds kLoneEscape{50};
   /// A sequence that was begun, and that nobody can have typed, is given up after this long.
   static constexpr std::chrono::milliseconds kUnfinishedSequence{1000};
 
   /// Appends to `events` what `bytes`, which arrived at `now`, and the time until then amount to.
-  void feed(std::string_view bytes, TimePoint now, std::vector<InputEvent>& events);
+  void feed(std::string_view bytes, Clock::Instant now, std::vector<InputEvent>& events);
   /// Appends what the passing of time amounts to.
-  void advance(TimePoint now, std::vector<InputEvent>& events);
+  void advance(Clock::Instant now, std::vector<InputEvent>& events);
   /// When to call `advance`, unless bytes come first.
-  [[nodiscard]] std::optional<TimePoint> deadline() const { return deadline_; }
+  [[nodiscard]] std::optional<Clock::Instant> deadline() const { return deadline_; }
 
  private:
   enum class State {
@@ -55,7 +54,7 @@ class InputMachine {
   /// What the present state has collected, cut at kLongestSequence.
   std::string collected_;
   bool isAltHeld_ = false;
-  std::optional<TimePoint> deadline_;
+  std::optional<Clock::Instant> deadline_;
 };
 
 }  // namespace vesk

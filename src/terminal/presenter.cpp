@@ -280,11 +280,11 @@ PathBar Presenter::pathBar(int statusWidth) const {
   return layOutPath(titles(), width - statusRoom);
 }
 
-void Presenter::expectChange(std::optional<TimePoint> when) {
+void Presenter::expectChange(std::optional<Clock::Instant> when) {
   if (when && (!nextChange_ || *when < *nextChange_)) nextChange_ = when;
 }
 
-Picture Presenter::picture(TimePoint now) {
+Picture Presenter::picture(Clock::Instant now) {
   followStack();
   nextChange_.reset();
   Picture picture{.size = size_};

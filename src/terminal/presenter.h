@@ -28,9 +28,9 @@ class Presenter {
   void forgetMouse();
 
   /// What shows at `now`, as of the toolkit's present state.
-  [[nodiscard]] Picture picture(TimePoint now);
+  [[nodiscard]] Picture picture(Clock::Instant now);
   /// When the last picture will be another one by the passing of time alone.
-  [[nodiscard]] std::optional<TimePoint> nextChange() const { return nextChange_; }
+  [[nodiscard]] std::optional<Clock::Instant> nextChange() const { return nextChange_; }
 
  private:
   struct Screen {
@@ -56,7 +56,7 @@ class Presenter {
   [[nodiscard]] Regions regions() const { return Regions::of(size_, isPaneOpen_); }
   [[nodiscard]] std::vector<std::string> titles() const;
   [[nodiscard]] PathBar pathBar(int statusWidth) const;
-  void expectChange(std::optional<TimePoint> when);
+  void expectChange(std::optional<Clock::Instant> when);
 
   NavigationController& stack_;
   Surroundings surroundings_;
@@ -72,7 +72,7 @@ class Presenter {
   bool isTracking_ = false;
 
   int statusWidth_ = 0;
-  std::optional<TimePoint> nextChange_;
+  std::optional<Clock::Instant> nextChange_;
 };
 
 }  // namespace vesk

@@ -1,28 +1,26 @@
 #pragma once
 
-#include <chrono>
 #include <cstdint>
 #include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
 
+#include "platform/clock.h"
 #include "terminal/diagnostic_lines.h"
 
 namespace vesk {
-
-using TimePoint = std::chrono::steady_clock::time_point;
 
 /// What the source of the events is at: "live", "replaying 3:12 of 9:40", "ended", "waiting".
 struct SourceState {
   std::string text;
   /// When the text will be another one by the passing of time alone.
-  std::optional<TimePoint> nextChange{};
+  std::optional<Clock::Instant> nextChange{};
 };
 
 /// How often the metric behind a screen arrived.
 struct Arrivals {
-  std::optional<TimePoint> last{};
+  std::optional<Clock::Instant> last{};
   std::uint64_t count = 0;
 };
 

@@ -13,6 +13,7 @@ void NavigationController::push(std::shared_ptr<ViewController> screen) {
   screen->navigationController_ = this;
   stack_.push_back(screen);
   if (isViewLoaded()) screen->loadViewIfNeeded();
+  screenNeedsDisplay(*screen);
 }
 
 std::shared_ptr<ViewController> NavigationController::pop() {
@@ -22,12 +23,17 @@ std::shared_ptr<ViewController> NavigationController::pop() {
   screen->navigationController_ = nullptr;
   screen->didLeaveNavigationStack();
   stack_.back()->loadViewIfNeeded();
+  screenNeedsDisplay(*stack_.back());
   return screen;
 }
 
 void NavigationController::popToDepth(std::size_t depth) {
   while (stack_.size() > std::max<std::size_t>(depth, 1))
     pop();
+}
+
+void NavigationController::screenNeedsDisplay(const ViewController& screen) {
+  if (displayObserver_ && !stack_.empty() && stack_.back().get() == &screen) displayObserver_();
 }
 
 void NavigationController::loadViewIfNeeded() {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -27,6 +28,11 @@ class NavigationController : public ViewController {
   /// Takes screens away until `depth` are left, at least the first one.
   void popToDepth(std::size_t depth);
 
+  /// `observer` is called whenever what shows has changed: another screen, or other content of the top one.
+  void setDisplayObserver(std::function<void()> observer) { displayObserver_ = std::move(observer); }
+  /// A screen of this stack has something new to show.
+  void screenNeedsDisplay(const ViewController& screen);
+
   /// Loads the stack's own view first, then that of its top screen.
   void loadViewIfNeeded() override;
   /// Passes the warning on to every screen of the stack.
@@ -34,6 +40,7 @@ class NavigationController : public ViewController {
 
  private:
   std::vector<std::shared_ptr<ViewController>> stack_;
+  std::function<void()> displayObserver_;
 };
 
 }  // namespace vesk

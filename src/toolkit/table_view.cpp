@@ -17,6 +17,7 @@ void TableView::reloadData() {
   }
   sections_ = std::move(sections);
   ++reloadCount_;
+  if (reloadObserver_) reloadObserver_();
 }
 
 std::unique_ptr<TableViewCell> TableView::dequeueReusableCell(std::string_view identifier) {

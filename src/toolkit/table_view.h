@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
@@ -47,6 +48,8 @@ class TableView {
   [[nodiscard]] std::unique_ptr<TableViewCell> dequeueReusableCell(std::string_view identifier);
   /// `cells` must outlive the table.
   void declareCells(std::span<const CellDeclaration> cells) { declarations_ = cells; }
+  /// `observer` is called after every reload.
+  void setReloadObserver(std::function<void()> observer) { reloadObserver_ = std::move(observer); }
   void setFooterView(std::optional<FooterView> footer) { footer_ = footer; }
   /// Lets go of the cells that wait for reuse.
   void drainReusePool() { pool_.clear(); }
@@ -84,6 +87,7 @@ class TableView {
   std::span<const CellDeclaration> declarations_;
   std::vector<Section> sections_;
   std::uint64_t reloadCount_ = 0;
+  std::function<void()> reloadObserver_;
   std::optional<FooterView> footer_;
   CellsInView inView_;
   std::vector<std::unique_ptr<TableViewCell>> pool_;

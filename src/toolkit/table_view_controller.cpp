@@ -4,6 +4,10 @@
 
 namespace vesk {
 
+TableViewController::TableViewController() {
+  tableView_.setReloadObserver([this] { setNeedsDisplay(); });
+}
+
 void TableViewController::loadViewIfNeeded() {
   if (isViewLoaded()) return;
   ViewController::loadViewIfNeeded();

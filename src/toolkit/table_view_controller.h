@@ -10,6 +10,8 @@ namespace vesk {
 /// is an empty table of rows of the standard height.
 class TableViewController : public ViewController, public TableDataSource {
  public:
+  TableViewController();
+
   [[nodiscard]] TableView& tableView() { return tableView_; }
 
   /// Loads the table's content after the view has loaded.

@@ -31,6 +31,10 @@ bool ViewController::performTransition(std::string_view identifier, Responder* s
   return true;
 }
 
+void ViewController::setNeedsDisplay() {
+  if (navigationController_ != nullptr) navigationController_->screenNeedsDisplay(*this);
+}
+
 void ViewController::wasMade(const InterfaceLayout& layout, std::string_view name) {
   layout_ = &layout;
   nameInLayout_ = name;

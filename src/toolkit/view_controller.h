@@ -50,6 +50,9 @@ class ViewController : public Responder {
   [[nodiscard]] std::optional<Color> backgroundColor() const { return backgroundColor_; }
   void setBackgroundColor(std::optional<Color> color) { backgroundColor_ = color; }
 
+  /// What the screen shows is not what it should show any more. Said for a screen whose table was reloaded.
+  void setNeedsDisplay();
+
   /// The stack that the screen is on; null when on none.
   [[nodiscard]] NavigationController* navigationController() const { return navigationController_; }
   /// The layout that the screen was made from and its name there; null and empty for one made by hand.
