@@ -31,7 +31,7 @@ struct Surroundings {
   /// Absent for an area and category that no metric feeds.
   std::function<std::optional<Arrivals>(std::string_view area, std::string_view category)> arrivals;
   /// Must outlive the terminal.
-  const DiagnosticLines* diagnostics = nullptr;
+  DiagnosticLines* diagnostics = nullptr;
   /// While true, the user holds a list with the mouse: timers of the default mode wait.
   std::function<void(bool)> setTracking;
   std::function<void()> quit;
