@@ -1,0 +1,38 @@
+#include "platform/file.h"
+
+#include <array>
+#include <cerrno>
+#include <fcntl.h>
+#include <unistd.h>
+#include <vector>
+
+#include "platform/file_descriptor.h"
+
+namespace vesk {
+
+namespace {
+
+constexpr std::size_t kMost = std::size_t{256} << 20;
+constexpr std::size_t kChunk = 65536;
+
+}  // namespace
+
+std::optional<Data> readFile(const std::string& path) {
+  const FileDescriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+  if (!file.isOpen()) return std::nullopt;
+  std::vector<std::uint8_t> content;
+  std::array<std::uint8_t, kChunk> chunk;
+  for (;;) {
+    const ssize_t count = read(file.get(), chunk.data(), chunk.size());
+    if (count < 0 && errno == EINTR) continue;
+    if (count < 0) return std::nullopt;
+    if (count == 0) return Data::copy(content);
+    content.insert(content.end(), chunk.data(), chunk.data() + count);
+    if (content.size() > kMost) {
+      errno = EFBIG;
+      return std::nullopt;
+    }
+  }
+}
+
+}  // namespace vesk

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <utility>
+#include <vector>
+
+#include "platform/file_descriptor.h"
+#include "platform/value.h"
+
+namespace vesk {
+
+/// A dictionary as it travels between processes: text keys to signed 64-bit integers, byte strings, or open
+/// descriptors, which have no form outside a message. Copies share their content.
+class InterProcessDictionary {
+ public:
+  InterProcessDictionary() = default;
+
+  void reserve(std::size_t capacity) { values_.reserve(capacity); }
+  /// These replace the value under `key`, whatever its kind.
+  void setInteger(Text key, std::int64_t value) { setValue(std::move(key), value); }
+  void setData(Text key, Data value) { setValue(std::move(key), std::move(value)); }
+  void setDescriptor(Text key, FileDescriptor descriptor);
+
+  [[nodiscard]] std::size_t size() const { return values_.size() + descriptors_.size(); }
+  [[nodiscard]] bool empty() const { return size() == 0; }
+  /// Absent also when another kind of value lies under `key`.
+  [[nodiscard]] std::optional<std::int64_t> integer(std::string_view key) const;
+  [[nodiscard]] const Data* data(std::string_view key) const;
+  [[nodiscard]] const FileDescriptor* descriptor(std::string_view key) const;
+
+  /// The same entries, in the order they came, as an ordinary dictionary; absent when a value has no ordinary
+  /// form.
+  [[nodiscard]] std::optional<Dictionary> ordinary() const;
+
+ private:
+  struct Descriptor {
+    Text key;
+    std::shared_ptr<const FileDescriptor> descriptor;
+  };
+
+  void setValue(Text key, Value value);
+
+  Dictionary values_;
+  std::vector<Descriptor> descriptors_;
+};
+
+}  // namespace vesk

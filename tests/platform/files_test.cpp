@@ -1,0 +1,41 @@
+#include <fstream>
+#include <gtest/gtest.h>
+#include <string>
+
+#include "platform/bundle.h"
+#include "platform/file.h"
+
+namespace vesk {
+namespace {
+
+TEST(ReadFile, GivesTheWholeContentOrNothing) {
+  const std::string path = testing::TempDir() + "vesk_files_test.bin";
+  const std::string content(200'001, '\0');
+  std::ofstream(path, std::ios::binary) << content;
+  const std::optional<Data> data = readFile(path);
+  ASSERT_TRUE(data);
+  EXPECT_EQ(data->bytes().size(), content.size());
+  std::ofstream(path, std::ios::trunc).close();
+  EXPECT_EQ(readFile(path), Data());
+  EXPECT_EQ(readFile(testing::TempDir()), std::nullopt);
+  EXPECT_EQ(readFile(path + ".missing"), std::nullopt);
+}
+
+TEST(Bundle, FindsAResourceInTheFirstDirectoryThatHasIt) {
+  const std::filesystem::path root = testing::TempDir() + "vesk_bundle_test";
+  const std::filesystem::path first = root / "first";
+  const std::filesystem::path second = root / "second";
+  std::filesystem::create_directories(first / "folder.deviceconfig");
+  std::filesystem::create_directories(second);
+  for (const auto& path : {first / "both.deviceconfig", second / "both.deviceconfig", second / "one.txt"})
+    std::ofstream(path) << "content";
+  const Bundle bundle({first, second});
+  EXPECT_EQ(bundle.pathForResource("both", "deviceconfig"), (first / "both.deviceconfig").string());
+  EXPECT_EQ(bundle.pathForResource("one", "txt"), (second / "one.txt").string());
+  EXPECT_EQ(bundle.pathForResource("one", "deviceconfig"), std::nullopt);
+  EXPECT_EQ(bundle.pathForResource("folder", "deviceconfig"), std::nullopt);
+  std::filesystem::remove_all(root);
+}
+
+}  // namespace
+}  // namespace vesk
