@@ -34,8 +34,13 @@ struct Regions {
   [[nodiscard]] static Regions of(Size size, bool hasPane);
 };
 
-/// The columns of the bar before the path.
+/// The columns of the bar before the path and after the status.
 inline constexpr int kBarMargin = 1;
+
+/// Where the status starts on the bar; the column after the bar's text when there is none. The path ends one
+/// column before.
+[[nodiscard]] int statusColumn(int columns, int statusWidth);
+
 /// Lines wider than this tear a name from its value.
 inline constexpr int kWidestList = 100;
 

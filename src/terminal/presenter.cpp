@@ -275,9 +275,7 @@ std::vector<std::string> Presenter::titles() const {
 }
 
 PathBar Presenter::pathBar(int statusWidth) const {
-  const int width = size_.columns - 2 * kBarMargin;
-  const int statusRoom = statusWidth > 0 ? std::min(statusWidth, size_.columns / 2) + 1 : 0;
-  return layOutPath(titles(), width - statusRoom);
+  return layOutPath(titles(), statusColumn(size_.columns, statusWidth) - 1 - kBarMargin);
 }
 
 void Presenter::expectChange(std::optional<Clock::Instant> when) {

@@ -72,13 +72,9 @@ class Renderer {
   void drawBar() {
     const int line = regions_.bar;
     grid_.fill(0, line, Role::Bar, width());
-    int end = width() - kBarMargin;
-    if (!picture_.status.empty()) {
-      const int start = std::max(end - textWidth(picture_.status), width() / 2);
-      writeCut(start, line, picture_.status, Role::BarStatus, end);
-      end = start - 1;
-    }
-    writeCut(kBarMargin, line, picture_.path.text, Role::Bar, end);
+    const int status = statusColumn(width(), textWidth(picture_.status));
+    writeCut(status, line, picture_.status, Role::BarStatus, width() - kBarMargin);
+    writeCut(kBarMargin, line, picture_.path.text, Role::Bar, status - 1);
   }
 
   void drawTitle() {
@@ -120,7 +116,7 @@ class Renderer {
       value = row.isChanged ? Role::SelectedChanged : Role::Selected;
       grid_.fill(0, line, Role::Selected, regions_.listColumns);
     }
-    const int end = regions_.listColumns - kRowMargin;
+    const int end = rowTextEnd(regions_.listColumns, row.hasDisclosure);
     if (row.isFirstOfRow && row.isChanged) grid_.write(0, line, "•", value, end);
     if (row.isFirstOfRow && row.hasDisclosure) grid_.write(end + 1, line, "›", name, end + 2);
     if (row.text.valueIndent) {
@@ -144,8 +140,12 @@ class Renderer {
   }
 
   void writeRowText(int column, int line, std::string_view text, Role role, int end, bool isCut) {
-    column = writeCut(column, line, text, role, isCut ? end - 1 : end);
-    if (isCut) grid_.write(column, line, "…", role, end);
+    if (!isCut) {
+      writeCut(column, line, text, role, end);
+      return;
+    }
+    column = grid_.write(column, line, text, role, end - 1);
+    grid_.write(column, line, "…", role, end);
   }
 
   void drawScrollBar() {
@@ -232,6 +232,12 @@ Regions Regions::of(Size size, bool hasPane) {
   regions.list = {regions.title + 1, regions.pane.start};
   regions.listColumns = std::min(size.columns - 1, kWidestList);
   return regions;
+}
+
+int statusColumn(int columns, int statusWidth) {
+  constexpr int kLeastPath = 14;
+  const int end = columns - kBarMargin;
+  return statusWidth > 0 ? std::max(end - statusWidth, kBarMargin + kLeastPath + 1) : end + 1;
 }
 
 Grid render(const Picture& picture) {

@@ -1,5 +1,7 @@
 #include "terminal/row_layout.h"
 
+#include <algorithm>
+
 #include "terminal/column_width.h"
 #include "terminal/wrapping.h"
 
@@ -25,7 +27,8 @@ bool fitsBesideItsName(std::string_view name, std::string_view value, int width)
 
 }  // namespace
 
-std::vector<RowLine> layOutRow(const RowContent& row, int width) {
+std::vector<RowLine> layOutRow(const RowContent& row, int columns) {
+  const int width = rowTextEnd(columns, row.accessory == CellAccessory::Disclosure) - kRowGutter;
   const std::string_view name = viewOf(row.main);
   const std::string_view value = viewOf(row.detail);
   std::vector<RowLine> lines;
@@ -40,7 +43,7 @@ std::vector<RowLine> layOutRow(const RowContent& row, int width) {
       lines.push_back({.value = line, .valueIndent = kIndent});
   }
   if (const std::optional<int> fixed = row.height.lines()) {
-    const auto count = static_cast<std::size_t>(*fixed);
+    const auto count = static_cast<std::size_t>(std::max(*fixed, 1));
     const bool isCut = lines.size() > count;
     lines.resize(count);
     if (isCut) lines.back().isCut = true;

@@ -30,8 +30,15 @@ struct RowLine {
   bool isCut = false;
 };
 
-/// A row at `width` columns: name and value on one line where they fit, else the value below, indented and
-/// wrapped. A fixed height cuts the row or fills it up.
-[[nodiscard]] std::vector<RowLine> layOutRow(const RowContent& row, int width);
+/// The columns before a row's texts, where the mark of a change stands.
+inline constexpr int kRowGutter = 2;
+/// The column where a row's texts end: a margin, or the disclosure mark between two, come after.
+[[nodiscard]] constexpr int rowTextEnd(int columns, bool hasDisclosure) {
+  return columns - (hasDisclosure ? 3 : 1);
+}
+
+/// A row of a list `columns` wide: name and value on one line where they fit, else the value below, indented
+/// and wrapped. A fixed height cuts the row or fills it up.
+[[nodiscard]] std::vector<RowLine> layOutRow(const RowContent& row, int columns);
 
 }  // namespace vesk

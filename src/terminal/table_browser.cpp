@@ -82,7 +82,7 @@ bool TableBrowser::passesFilter(IndexPath at) {
 
 int TableBrowser::height(std::size_t entry) {
   const Entry& each = entries_[entry];
-  return each.isRow ? content_.height(each.at, rowWidth()) : 1;
+  return each.isRow ? content_.height(each.at, size_.columns) : 1;
 }
 
 /// `lines` further down, or up when negative; stops at the ends. The end of the list is the entry after the
@@ -91,7 +91,8 @@ TableBrowser::Position TableBrowser::moved(Position from, int lines) {
   from.line += lines;
   while (from.line < 0 && from.entry > 0)
     from.line += height(--from.entry);
-  while (from.entry < entries_.size() && from.line >= height(from.entry))
+  // Every entry has a line, so that the height of one whose first line it is need not be known.
+  while (from.entry < entries_.size() && from.line > 0 && from.line >= height(from.entry))
     from.line -= height(from.entry++);
   if (from.line < 0 || from.entry == entries_.size()) from.line = 0;
   return from;
@@ -222,7 +223,7 @@ std::vector<ListLine> TableBrowser::lines() {
       continue;
     }
     const RowContent& row = content_.row(at);
-    const std::vector<RowLine> rowLines = layOutRow(row, rowWidth());
+    const std::vector<RowLine> rowLines = layOutRow(row, size_.columns);
     const std::size_t end = std::min(rowLines.size(), static_cast<std::size_t>(skipped) + room);
     for (auto index = static_cast<std::size_t>(skipped); index < end; ++index) {
       lines.push_back({.text = rowLines[index],

@@ -31,11 +31,6 @@ struct ScrollExtent {
   int total = 0;
 };
 
-/// The columns that a row leaves free: a gutter for the mark of a change before it, a margin with the
-/// disclosure mark after it.
-inline constexpr int kRowGutter = 2;
-inline constexpr int kRowMargin = 3;
-
 /// A way through one screen's table: what of it shows in a viewport, which row is selected, which rows pass a
 /// filter. Only rows that show are asked for, unless a filter or a freeze needs them all.
 class TableBrowser {
@@ -93,7 +88,6 @@ class TableBrowser {
 
   void rebuild();
   [[nodiscard]] bool passesFilter(IndexPath at);
-  [[nodiscard]] int rowWidth() const { return size_.columns - kRowGutter - kRowMargin; }
   [[nodiscard]] int height(std::size_t entry);
   [[nodiscard]] Position moved(Position from, int lines);
   [[nodiscard]] std::size_t selectedEntry() const;

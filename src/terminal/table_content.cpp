@@ -35,11 +35,11 @@ const RowContent& TableContent::row(IndexPath at) {
   return *content;
 }
 
-int TableContent::height(IndexPath at, int width) {
+int TableContent::height(IndexPath at, int columns) {
   Row& kept = rowAt(at);
-  if (kept.widthOfHeight != width) {
-    kept.height = static_cast<int>(layOutRow(row(at), width).size());
-    kept.widthOfHeight = width;
+  if (kept.columnsOfHeight != columns) {
+    kept.height = static_cast<int>(layOutRow(row(at), columns).size());
+    kept.columnsOfHeight = columns;
   }
   return kept.height;
 }

@@ -30,17 +30,17 @@ class TableContent {
   }
   /// The row must be within the counts.
   const RowContent& row(IndexPath at);
-  /// The row's height in lines at `width` columns.
-  int height(IndexPath at, int width);
+  /// The row's height in lines in a list `columns` wide.
+  int height(IndexPath at, int columns);
   /// The same, or the table's estimate for a row that was not needed yet.
   [[nodiscard]] int likelyHeight(IndexPath at) const { return rowAt(at).height; }
 
  private:
   struct Row {
     std::optional<RowContent> content;
-    /// An estimate until the row was laid out at a width.
+    /// An estimate until the row was laid out.
     int height;
-    int widthOfHeight = 0;
+    int columnsOfHeight = 0;
   };
   struct Section {
     std::optional<Text> header;

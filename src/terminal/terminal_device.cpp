@@ -118,7 +118,8 @@ void TerminalDevice::wakeAfter(std::optional<Clock::Duration> delay) {
 
 Size TerminalDevice::size() const {
   winsize window{};
-  const bool isKnown = ioctl(terminal_.get(), TIOCGWINSZ, &window) == 0 && window.ws_col > 0 && window.ws_row > 0;
+  const bool isKnown =
+      ioctl(terminal_.get(), TIOCGWINSZ, &window) == 0 && window.ws_col > 0 && window.ws_row > 0;
   if (!isKnown) return {80, 24};
   return {window.ws_col, window.ws_row};
 }
