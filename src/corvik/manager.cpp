@@ -80,11 +80,8 @@ void Manager::scheduleDeliveries() {
 }
 
 void Manager::deliver() {
-  while (areEventsOn_ && hasBatch()) {
-    const std::shared_ptr<const Handlers> present = handlers();
-    while (areEventsOn_ && delivered_ < batch_.size())
-      deliver(batch_[delivered_++], *present);
-  }
+  while (areEventsOn_ && hasBatch())
+    deliver(batch_[delivered_++], *handlers());
 }
 
 bool Manager::hasBatch() {

@@ -110,8 +110,9 @@ TEST_F(RecordedServiceTest, KeepsTheRecordingsPaceAndDoesNotWaitForAStepBack) {
   clock_.advance(400ms);
   EXPECT_EQ(clock_.waitForSleeper(), 100ms);
   EXPECT_EQ(next(1), Ids{5});
-  loop_.run();
-  EXPECT_TRUE(isEnded_);
+  // The end may have come together with the last event.
+  while (!isEnded_)
+    loop_.run();
 }
 
 TEST_F(RecordedServiceTest, GoesRoundAndTellsBadLinesOnce) {
