@@ -1,5 +1,7 @@
 #include "terminal/capabilities.h"
 
+#include <algorithm>
+#include <cstdint>
 #include <cstdlib>
 #include <string_view>
 // curses.h must come before term.h, and both leave macros behind: they are seen by this file alone.
@@ -35,7 +37,7 @@ std::string withoutPadding(std::string_view capability) {
 
 std::string textCapability(const char* name) {
   const char* capability = tigetstr(name);
-  const bool isMissing = capability == nullptr || capability == reinterpret_cast<const char*>(-1);
+  const bool isMissing = capability == nullptr || reinterpret_cast<std::intptr_t>(capability) == -1;
   return isMissing ? std::string{} : withoutPadding(capability);
 }
 

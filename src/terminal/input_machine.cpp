@@ -62,7 +62,7 @@ void InputMachine::feed(std::string_view bytes, Clock::Instant now, std::vector<
 void InputMachine::advance(Clock::Instant now, std::vector<InputEvent>& events) {
   if (!deadline_ || now < *deadline_) return;
   deadline_.reset();
-  if (state_ == State::Escape) events.push_back(KeyEvent{.key = Key::Escape});
+  if (state_ == State::Escape) events.emplace_back(KeyEvent{.key = Key::Escape});
   isAltHeld_ = false;
   enter(State::Ground);
 }
@@ -113,7 +113,7 @@ void InputMachine::takeInGround(unsigned char byte, std::vector<InputEvent>& eve
   }
   KeyEvent event = isControl(byte) ? keyOfControl(byte) : KeyEvent{.character = byte};
   event.modifiers.alt = isAltHeld;
-  events.push_back(event);
+  events.emplace_back(event);
 }
 
 void InputMachine::takeInCharacter(unsigned char byte, std::vector<InputEvent>& events) {
@@ -125,7 +125,7 @@ void InputMachine::takeInCharacter(unsigned char byte, std::vector<InputEvent>& 
   }
   collected_ += static_cast<char>(byte);
   if (const std::size_t size = utf8CharacterSize(collected_); size == collected_.size()) {
-    events.push_back(KeyEvent{.character = codePointOf(collected_), .modifiers = {.alt = isAltHeld_}});
+    events.emplace_back(KeyEvent{.character = codePointOf(collected_), .modifiers = {.alt = isAltHeld_}});
   } else if (collected_.size() < kLongestCharacter) {
     return;
   }
@@ -135,7 +135,7 @@ void InputMachine::takeInCharacter(unsigned char byte, std::vector<InputEvent>& 
 
 void InputMachine::takeAfterEscape(unsigned char byte, std::vector<InputEvent>& events) {
   if (byte == kEscape) {
-    events.push_back(KeyEvent{.key = Key::Escape});
+    events.emplace_back(KeyEvent{.key = Key::Escape});
   } else if (byte == '[') {
     enter(State::Csi);
   } else if (byte == 'O') {

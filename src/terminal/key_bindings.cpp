@@ -20,6 +20,8 @@ const KeyBinding kBindings[] = {
     {Action::Filter, {letter(U'/')}, "filter", "show only rows with what is typed"},
     {Action::Freeze, {letter(U'f')}, "freeze", "hold the screen; intake goes on"},
     {Action::Diagnostics, {letter(U'd')}, "lines", "show or hide the diagnostic lines"},
+    {Action::OlderLines, {letter(U'[')}, "", "older diagnostic lines"},
+    {Action::NewerLines, {letter(U']')}, "", "newer diagnostic lines"},
     {Action::Quit, {letter(U'q')}, "quit", "end the program"},
     {Action::Up, {{Key::Up}, letter(U'k')}, "", "one row up"},
     {Action::Down, {{Key::Down}, letter(U'j')}, "", "one row down"},

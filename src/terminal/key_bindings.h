@@ -18,6 +18,8 @@ enum class Action {
   Filter,
   Freeze,
   Diagnostics,
+  OlderLines,
+  NewerLines,
   Quit,
   Up,
   Down,

@@ -65,6 +65,8 @@ struct Picture {
 
   bool hasPane = false;
   std::vector<std::string_view> paneLines{};
+  /// The number of the last line of the pane, and of the last line there is.
+  std::uint64_t paneEnd = 0;
   std::uint64_t paneTotal = 0;
 };
 

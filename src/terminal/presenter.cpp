@@ -142,7 +142,12 @@ void Presenter::perform(Action action) {
       return;
     case Action::Diagnostics:
       isPaneOpen_ = !isPaneOpen_;
+      paneEnd_.reset();
       return;
+    case Action::OlderLines:
+      return scrollPane(-std::max(regions().pane.count() - 2, 1));
+    case Action::NewerLines:
+      return scrollPane(+std::max(regions().pane.count() - 2, 1));
     case Action::Quit:
       if (surroundings_.quit) surroundings_.quit();
       return;
@@ -192,6 +197,8 @@ void Presenter::performInHelp(Action action) {
     case Action::Filter:
     case Action::Freeze:
     case Action::Diagnostics:
+    case Action::OlderLines:
+    case Action::NewerLines:
       return;
   }
 }
@@ -199,6 +206,16 @@ void Presenter::performInHelp(Action action) {
 void Presenter::scrollHelp(int lines) {
   const int last = std::max(helpLineCount() - regions().list.count(), 0);
   helpStart_ = std::clamp(*helpStart_ + lines, 0, last);
+}
+
+void Presenter::scrollPane(int lines) {
+  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
+  const auto total = static_cast<std::int64_t>(surroundings_.diagnostics->total());
+  const auto kept = static_cast<std::int64_t>(surroundings_.diagnostics->lines().size());
+  const std::int64_t first = std::min<std::int64_t>(total - kept + regions().pane.count() - 1, total);
+  const std::int64_t present = paneEnd_ ? static_cast<std::int64_t>(*paneEnd_) : total;
+  const std::int64_t end = std::clamp(present + lines, first, total);
+  paneEnd_ = end < total ? std::optional(static_cast<std::uint64_t>(end)) : std::nullopt;
 }
 
 void Presenter::open() {
@@ -222,7 +239,9 @@ void Presenter::handleMouse(const MouseEvent& event) {
     case MouseAction::WheelUp:
     case MouseAction::WheelDown: {
       const int lines = event.action == MouseAction::WheelUp ? -kWheelLines : kWheelLines;
-      if (helpStart_) {
+      if (regions().pane.has(event.line)) {
+        scrollPane(lines);
+      } else if (helpStart_) {
         scrollHelp(lines);
       } else if (shown != nullptr) {
         shown->scroll(lines);
@@ -312,15 +331,21 @@ Picture Presenter::picture(Clock::Instant now) {
     picture.filter = shown->filter();
     picture.isTypingFilter = isTypingFilter_;
   }
-  picture.hasPane = isPaneOpen_;
-  if (isPaneOpen_ && surroundings_.diagnostics != nullptr) {
-    const auto& lines = surroundings_.diagnostics->lines();
-    const auto room = static_cast<std::size_t>(std::max(regions().pane.count() - 1, 0));
-    const std::size_t first = lines.size() - std::min(lines.size(), room);
-    picture.paneLines.assign(lines.begin() + static_cast<std::ptrdiff_t>(first), lines.end());
-    picture.paneTotal = surroundings_.diagnostics->total();
-  }
+  fillPane(picture);
   return picture;
+}
+
+void Presenter::fillPane(Picture& picture) {
+  picture.hasPane = isPaneOpen_;
+  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
+  scrollPane(0);
+  const auto& lines = surroundings_.diagnostics->lines();
+  picture.paneTotal = surroundings_.diagnostics->total();
+  picture.paneEnd = paneEnd_.value_or(picture.paneTotal);
+  const auto newer = static_cast<std::ptrdiff_t>(picture.paneTotal - picture.paneEnd);
+  const auto room = static_cast<std::ptrdiff_t>(std::max(regions().pane.count() - 1, 0));
+  const auto end = lines.end() - newer;
+  picture.paneLines.assign(end - std::min(room, end - lines.begin()), end);
 }
 
 }  // namespace vesk

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <optional>
 #include <string>
@@ -48,6 +49,8 @@ class Presenter {
   void open();
   void goBack();
   void scrollHelp(int lines);
+  void scrollPane(int lines);
+  void fillPane(Picture& picture);
   void setTracking(bool isTracking);
 
   /// Brings the browsers in line with the navigation stack and the top one with its table.
@@ -65,6 +68,8 @@ class Presenter {
   std::vector<Screen> screens_;
   bool isTypingFilter_ = false;
   bool isPaneOpen_ = false;
+  /// The number of the last diagnostic line that shows, counted from 1; absent while the newest one does.
+  std::optional<std::uint64_t> paneEnd_;
   std::optional<int> helpStart_;
 
   /// Where the mouse's button went down or was last dragged to.

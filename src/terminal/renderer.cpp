@@ -180,6 +180,10 @@ class Renderer {
     int line = regions_.pane.start;
     grid_.fill(0, line, Role::PaneHeader, width());
     std::string count;
+    if (picture_.paneEnd < picture_.paneTotal) {
+      appendDecimal(count, picture_.paneEnd);
+      count += " of ";
+    }
     appendDecimal(count, picture_.paneTotal);
     count += picture_.paneTotal == 1 ? " line" : " lines";
     grid_.write(kBarMargin, line, "Diagnostics", Role::PaneHeader, width());

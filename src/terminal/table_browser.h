@@ -72,17 +72,15 @@ class TableBrowser {
     IndexPath at;
     bool isRow;
 
-    friend auto operator<=>(const Entry& a, const Entry& b) {
-      if (const auto order = a.at <=> b.at; order != 0) return order;
-      return a.isRow <=> b.isRow;
-    }
-    friend bool operator==(const Entry&, const Entry&) = default;
+    // NOLINTNEXTLINE(modernize-use-nullptr): the comparison with 0 is the compiler's own
+    friend auto operator<=>(const Entry&, const Entry&) = default;
   };
   /// A line of the list: the line within an entry.
   struct Position {
     std::size_t entry = 0;
     int line = 0;
 
+    // NOLINTNEXTLINE(modernize-use-nullptr): as above
     friend auto operator<=>(const Position&, const Position&) = default;
   };
 

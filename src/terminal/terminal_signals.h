@@ -5,10 +5,8 @@
 
 #include "platform/wake_up.h"
 
-namespace vesk {
-
 /// The signals that concern a terminal. There is one such terminal at a time.
-namespace terminal_signals {
+namespace vesk::terminal_signals {
 
 /// What has been signalled since it was last asked for.
 struct Seen {
@@ -34,6 +32,4 @@ void disarm();
 /// Stops the program as the signal would without a handler; returns when it is continued.
 void stopProgram();
 
-}  // namespace terminal_signals
-
-}  // namespace vesk
+}  // namespace vesk::terminal_signals

@@ -16,7 +16,7 @@ const Row* findRow(const std::vector<Row>& table, Predicate predicate) {
 
 std::shared_ptr<NavigationController> InterfaceLayout::makeRootStack() const {
   std::shared_ptr<NavigationController> stack = tables_.rootStack();
-  if (std::shared_ptr<ViewController> first = makeScreen(tables_.firstScreen)) stack->push(std::move(first));
+  if (const std::shared_ptr<ViewController> first = makeScreen(tables_.firstScreen)) stack->push(first);
   return stack;
 }
 

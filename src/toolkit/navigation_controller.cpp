@@ -9,7 +9,7 @@ std::shared_ptr<ViewController> NavigationController::topViewController() const 
   return stack_.empty() ? nullptr : stack_.back();
 }
 
-void NavigationController::push(std::shared_ptr<ViewController> screen) {
+void NavigationController::push(const std::shared_ptr<ViewController>& screen) {
   screen->navigationController_ = this;
   stack_.push_back(screen);
   if (isViewLoaded()) screen->loadViewIfNeeded();

@@ -13,7 +13,7 @@ namespace vesk {
 class NavigationController : public ViewController {
  public:
   NavigationController() = default;
-  explicit NavigationController(std::shared_ptr<ViewController> root) { push(std::move(root)); }
+  explicit NavigationController(const std::shared_ptr<ViewController>& root) { push(root); }
 
   /// From the first screen to the one that shows.
   [[nodiscard]] const std::vector<std::shared_ptr<ViewController>>& stack() const { return stack_; }
@@ -22,7 +22,7 @@ class NavigationController : public ViewController {
 
   /// Shows `screen`, which must be on no stack yet. It is loaded now, or with the stack's own view when that
   /// is still to come.
-  void push(std::shared_ptr<ViewController> screen);
+  void push(const std::shared_ptr<ViewController>& screen);
   /// Takes the top screen away; null when it is the first.
   std::shared_ptr<ViewController> pop();
   /// Takes screens away until `depth` are left, at least the first one.

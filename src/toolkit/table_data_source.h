@@ -15,6 +15,7 @@ struct IndexPath {
   std::size_t section = 0;
   std::size_t row = 0;
 
+  // NOLINTNEXTLINE(modernize-use-nullptr): the comparison with 0 is the compiler's own
   friend auto operator<=>(const IndexPath&, const IndexPath&) = default;
 };
 

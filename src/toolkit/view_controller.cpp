@@ -20,14 +20,14 @@ bool ViewController::performTransition(std::string_view identifier, Responder* s
   if (layout_ == nullptr || navigationController_ == nullptr) return false;
   const TransitionDeclaration* declared = layout_->transition(nameInLayout_, identifier);
   if (declared == nullptr) return false;
-  std::shared_ptr<ViewController> destination = layout_->makeScreen(declared->to);
+  const std::shared_ptr<ViewController> destination = layout_->makeScreen(declared->to);
   if (destination == nullptr) return false;
   prepareForTransition({declared->identifier, *this, *destination}, sender);
   if (const auto* cell = dynamic_cast<const TableViewCell*>(sender);
       cell != nullptr && !destination->title()) {
     destination->setTitle(cell->mainText());
   }
-  navigationController_->push(std::move(destination));
+  navigationController_->push(destination);
   return true;
 }
 

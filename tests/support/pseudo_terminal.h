@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <cerrno>
 #include <cstdlib>
 #include <fcntl.h>
 #include <poll.h>
@@ -17,7 +18,11 @@ namespace vesk {
 /// Waits until there is something to read; false after ten seconds, which is never.
 inline bool waitUntilReadable(int descriptor) {
   pollfd polled{descriptor, POLLIN, 0};
-  return poll(&polled, 1, 10000) == 1;
+  int count = 0;
+  do
+    count = poll(&polled, 1, 10000);
+  while (count < 0 && errno == EINTR);
+  return count == 1;
 }
 
 /// A terminal whose user is the test.

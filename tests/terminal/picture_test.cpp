@@ -177,6 +177,34 @@ TEST(Picture, ShowsTheDiagnosticLinesInAPane) {
   EXPECT_EQ(desk.line(7), "");
 }
 
+TEST(Picture, KeepsThePlaceInThePaneWhileLinesCome) {
+  FakeInterface interface;
+  DiagnosticLines lines(10);
+  const auto append = [&](int first, int last) {
+    for (int number = first; number <= last; ++number)
+      lines.append("line " + std::to_string(number));
+  };
+  Surroundings surroundings;
+  surroundings.diagnostics = &lines;
+  Desk desk(interface.stack(), {40, 12}, surroundings);
+  desk.type(U"d");
+  append(1, 8);
+  EXPECT_EQ(desk.line(10), " line 8");
+  desk.mouse(MouseAction::WheelUp, 5, 9);
+  append(9, 10);
+  EXPECT_EQ(desk.line(7), " Diagnostics              5 of 10 lines");
+  EXPECT_EQ(desk.line(10), " line 5");
+  append(11, 14);
+  EXPECT_EQ(desk.line(8), " line 5");
+  desk.type(U"[[");
+  EXPECT_EQ(desk.line(8), " line 5");
+  desk.type(U"]");
+  EXPECT_EQ(desk.line(10), " line 9");
+  desk.type(U"]]]");
+  append(15, 15);
+  EXPECT_EQ(desk.line(10), " line 15");
+}
+
 TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   FakeInterface interface;
   Desk desk(interface.stack(), {80, 24});
@@ -190,6 +218,8 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
 |  /                  show only rows with what is typed
 |  f                  hold the screen; intake goes on
 |  d                  show or hide the diagnostic lines
+|  [                  older diagnostic lines
+|  ]                  newer diagnostic lines
 |  q                  end the program
 |  ↑ k                one row up
 |  ↓ j                one row down
@@ -199,8 +229,6 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
 |  End                the last row
 |  click              select and open a row; on the path: go back
 |  wheel, drag        scroll
-|
-|
 |
 |
 |
