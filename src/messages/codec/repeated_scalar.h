@@ -26,11 +26,10 @@ class RepeatedScalar {
   }
 
   void add(Number value) { values_.push_back(value); }
-  /// Makes room for `more` values beyond those held.
-  void reserve(std::size_t more) { values_.reserve(count() + more); }
   /// Takes the values out and gives their storage back.
   void clear() { std::vector<Number>().swap(values_); }
-  void set(const Number* values, std::size_t count) { values_.assign(values, values + count); }
+  /// Replaces the values by a copy of `count` others, which may be some of those held.
+  void set(const Number* values, std::size_t count) { values_ = std::vector<Number>(values, values + count); }
   void append(const RepeatedScalar& other) {
     const std::size_t added = other.count();
     values_.reserve(count() + added);
