@@ -28,12 +28,10 @@ using EventHandler = std::function<void(const vesk::InterProcessDictionary& even
 
 /// Sends one command and waits for its outcome. `reply` is left as it is: this service has none.
 [[nodiscard]] Result PerformCommand(const std::shared_ptr<Manager>& manager, const vesk::Text& command,
-                                    const vesk::InterProcessDictionary& message,
-                                    vesk::InterProcessDictionary& reply);
+                                    const vesk::InterProcessDictionary& message, vesk::InterProcessDictionary& reply);
 
 /// Has `handler` called with each event of the name `event`, in the place of the handler registered before.
-void RegisterEventHandler(const std::shared_ptr<Manager>& manager, const vesk::Text& event,
-                          EventHandler handler);
+void RegisterEventHandler(const std::shared_ptr<Manager>& manager, const vesk::Text& event, EventHandler handler);
 
 /// Stops and starts the delivery of events: off at first. Those raised while it is off are delivered when it
 /// is on again.

@@ -49,10 +49,9 @@ class ClientTest : public testing::Test {
   }
   /// Registers a handler for metrics that notes their ids.
   void note(std::vector<std::int64_t>& ids) {
-    RegisterEventHandler(manager_, kEventMetric,
-                         [&ids](const InterProcessDictionary& event, const WorkGroup&) {
-                           ids.push_back(event.integer("kKeyMetricID").value_or(-1));
-                         });
+    RegisterEventHandler(manager_, kEventMetric, [&ids](const InterProcessDictionary& event, const WorkGroup&) {
+      ids.push_back(event.integer("kKeyMetricID").value_or(-1));
+    });
   }
   void raise(std::int64_t id) { service_->events->raise(kEventMetric, makeMetricEvent(id, kBytes)); }
   /// Runs until everything raised before has been delivered.
@@ -191,8 +190,7 @@ TEST_F(ClientTest, WantsMetricsOnceConfiguredAndOnAndHoldsASourceBackThatIsAhead
 }
 
 TEST_F(ClientTest, LetsASourceGoThatShallStop) {
-  std::jthread source(
-      [&](const std::stop_token& stop) { EXPECT_FALSE(service_->events->waitUntilWanted(stop)); });
+  std::jthread source([&](const std::stop_token& stop) { EXPECT_FALSE(service_->events->waitUntilWanted(stop)); });
 }
 
 }  // namespace

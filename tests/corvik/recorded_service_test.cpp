@@ -29,8 +29,7 @@ std::string line(double at, int id) {
 class RecordedServiceTest : public testing::Test {
  protected:
   void connect(vesk::FileDescriptor recording, Playback playback) {
-    service_ =
-        std::make_shared<RecordedService>(RecordingReader(std::move(recording), "r"), clock_, playback);
+    service_ = std::make_shared<RecordedService>(RecordingReader(std::move(recording), "r"), clock_, playback);
     service_->setBadLineHandler([this](const std::string& message) { badLines_.push_back(message); });
     service_->setEndHandler([this](const std::optional<std::string>& failure) {
       failure_ = failure;
