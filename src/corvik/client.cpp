@@ -9,9 +9,7 @@ namespace corvik::client {
 // NOLINTBEGIN(readability-identifier-naming): the library's own names
 
 std::shared_ptr<Manager> CreateManager(const std::string& name, vesk::WorkQueue& queue) {
-  auto manager = std::make_shared<Manager>(name, queue, installedService());
-  manager->connect();
-  return manager;
+  return std::make_shared<Manager>(name, queue, installedService());
 }
 
 Result PerformCommand(const std::shared_ptr<Manager>& manager, const vesk::Text& command,
@@ -20,16 +18,17 @@ Result PerformCommand(const std::shared_ptr<Manager>& manager, const vesk::Text&
   return manager->perform(command, message);
 }
 
-void RegisterEventHandler(const std::shared_ptr<Manager>& manager, const vesk::Text& event, EventHandler handler) {
-  manager->setHandler(event, std::move(handler));
+void RegisterEventHandler(const std::shared_ptr<Manager>& manager, const vesk::Text& event,
+                          EventHandler handler) {
+  manager->channel().setHandler(event, std::move(handler));
 }
 
 void EventsOff(const std::shared_ptr<Manager>& manager) {
-  manager->setEventsOn(false);
+  manager->channel().setEventsOn(false);
 }
 
 void EventsOn(const std::shared_ptr<Manager>& manager) {
-  manager->setEventsOn(true);
+  manager->channel().setEventsOn(true);
 }
 
 // NOLINTEND(readability-identifier-naming)

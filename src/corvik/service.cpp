@@ -29,14 +29,17 @@ vesk::InterProcessDictionary makeMetricEvent(std::int64_t metricId, std::span<co
 }
 
 void Service::connect(EventStream& events) {
-  if (events_ != nullptr) stop();
+  shutDown();
   events_ = &events;
   start(events);
 }
 
 void Service::disconnect(EventStream& events) {
-  if (events_ != &events) return;
-  stop();
+  if (events_ == &events) shutDown();
+}
+
+void Service::shutDown() {
+  if (events_ != nullptr) stop();
   events_ = nullptr;
 }
 

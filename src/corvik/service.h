@@ -62,10 +62,13 @@ class Service {
   void connect(EventStream& events);
   /// No event goes to `events` once this has returned.
   void disconnect(EventStream& events);
+  /// Ends the source for good, whoever is connected: what the service was made over may go afterwards.
+  void shutDown();
 
   /// Executes a command, or refuses it with a status and a message that says why: an unknown command, an
   /// empty configuration, an incomplete query.
-  [[nodiscard]] Result perform(const vesk::Text& command, const vesk::InterProcessDictionary& message);
+  [[nodiscard]] virtual Result perform(const vesk::Text& command,
+                                       const vesk::InterProcessDictionary& message);
   /// Lets every command end with `refusal`; absent, they are executed again.
   void refuseAll(std::optional<Result> refusal) { refusal_ = std::move(refusal); }
 

@@ -34,8 +34,15 @@ class ClientTest : public testing::Test {
  protected:
   ClientTest() {
     installService(service_);
-    manager_ = CreateManager("test", queue_);
+    manager_ = CreateManager("test", *queue_);
     installService(nullptr);
+  }
+
+  /// The main queue is the process's: no task may stay behind.
+  void TearDown() override {
+    manager_.reset();
+    queue_.reset();
+    loop_.runDue();
   }
 
   Result perform(const vesk::Text& command, const InterProcessDictionary& message) {
@@ -62,7 +69,7 @@ class ClientTest : public testing::Test {
 
   vesk::SteadyClock clock_;
   vesk::RunLoop loop_{clock_};
-  vesk::WorkQueue queue_{"test"};
+  std::optional<vesk::WorkQueue> queue_{"test"};
   std::shared_ptr<PlainService> service_ = std::make_shared<PlainService>();
   std::shared_ptr<Manager> manager_;
 };
@@ -98,7 +105,7 @@ TEST_F(ClientTest, RefusesWhatAServiceCannotExecuteAndSaysWhy) {
   EXPECT_EQ(configure().code, 0);
   service_->refuseAll(Result{-5, "modem is off"});
   EXPECT_EQ(configure().code, -5);
-  manager_ = CreateManager("orphan", queue_);
+  manager_ = CreateManager("orphan", *queue_);
   EXPECT_EQ(configure().message, "no service for the client orphan");
 }
 
@@ -109,7 +116,7 @@ TEST_F(ClientTest, DeliversInOrderOnItsQueueToTheHandlerRegisteredLast) {
   note(second);
   std::thread::id handlersThread;
   std::thread::id queuesThread;
-  queue_.async([&] { queuesThread = std::this_thread::get_id(); });
+  queue_->async([&] { queuesThread = std::this_thread::get_id(); });
   RegisterEventHandler(manager_, kEventTrigger, [&](const InterProcessDictionary&, const WorkGroup&) {
     handlersThread = std::this_thread::get_id();
     second.push_back(0);

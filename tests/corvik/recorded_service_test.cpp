@@ -28,6 +28,13 @@ std::string line(double at, int id) {
 /// A client of a recorded service, which notes the ids of the metrics it gets.
 class RecordedServiceTest : public testing::Test {
  protected:
+  /// The main queue is the process's: no task may stay behind.
+  void TearDown() override {
+    manager_.reset();
+    queue_.reset();
+    loop_.runDue();
+  }
+
   void connect(vesk::FileDescriptor recording, Playback playback) {
     service_ = std::make_shared<RecordedService>(RecordingReader(std::move(recording), "r"), clock_, playback);
     service_->setBadLineHandler([this](const std::string& message) { badLines_.push_back(message); });
@@ -37,7 +44,7 @@ class RecordedServiceTest : public testing::Test {
       loop_.stop();
     });
     installService(service_);
-    manager_ = client::CreateManager("test", queue_);
+    manager_ = client::CreateManager("test", *queue_);
     installService(nullptr);
     client::RegisterEventHandler(
         manager_, kEventMetric, [this](const vesk::InterProcessDictionary& event, const client::WorkGroup&) {
@@ -66,7 +73,7 @@ class RecordedServiceTest : public testing::Test {
   vesk::ManualClock clock_;
   vesk::SteadyClock steadyClock_;
   vesk::RunLoop loop_{steadyClock_};
-  vesk::WorkQueue queue_{"test"};
+  std::optional<vesk::WorkQueue> queue_{"test"};
   Ids ids_;
   std::vector<std::string> badLines_;
   std::optional<std::string> failure_;
