@@ -1,6 +1,7 @@
 #include "app/json_form.h"
 
 #include <algorithm>
+#include <cmath>
 
 #include "platform/text_form.h"
 #include "platform/utf8.h"
@@ -51,7 +52,14 @@ struct JsonForm {
   void operator()(bool value) const { out += value ? "true" : "false"; }
   void operator()(std::int64_t number) const { appendDecimal(out, number); }
   void operator()(std::uint64_t number) const { appendDecimal(out, number); }
-  void operator()(float number) const { appendDecimal(out, number); }
+  void operator()(float number) const {
+    // JSON has no other numbers.
+    if (std::isfinite(number)) {
+      appendDecimal(out, number);
+    } else {
+      out += "null";
+    }
+  }
   void operator()(const Text& text) const { appendJson(out, text.view()); }
   void operator()(const Data& data) const {
     out += "\"0x";
