@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 
 #include "platform/text_form.h"
 #include "platform/utf8.h"
@@ -63,7 +64,14 @@ struct JsonForm {
   void operator()(bool value) const { out += value ? "true" : "false"; }
   void operator()(std::int64_t number) const { appendDecimal(out, number); }
   void operator()(std::uint64_t number) const { appendDecimal(out, number); }
-  void operator()(float number) const { appendDecimal(out, number); }
+  void operator()(float number) const {
+    // JSON has no other numbers.
+    if (std::isfinite(number)) {
+      appendDecimal(out, number);
+    } else {
+      out += "null";
+    }
+  }
   void operator()(const Text& text) const { appendJson(out, text.view()); }
   void operator()(const Data& data) const {
     out += "\"0x";

@@ -21,8 +21,8 @@ std::vector<Enumeration> allEnumerations(const ProtoFile& file) {
 
 std::string emitIncludes(const ProtoFile& file) {
   std::vector<std::string> paths{"messages/codec/message.h"};
-  for (const std::string& import : file.imports)
-    paths.push_back(headerPath(import));
+  for (const Import& import : file.imports)
+    paths.push_back(headerPath(import.path));
   std::sort(paths.begin(), paths.end());
   std::string out;
   for (const std::string& path : paths)

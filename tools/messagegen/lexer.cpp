@@ -74,14 +74,20 @@ void Lexer::skipBlockComment() {
 std::vector<std::string> Lexer::skipToToken() {
   std::vector<std::string> comment;
   std::size_t lineFeeds = 0;
+  // What stands behind a token on its line says nothing of the next one.
+  bool isBehindToken = offset_ > 0;
   while (offset_ < source_.size()) {
     if (peek() == '/' && peek(1) == '/') {
-      comment.push_back(takeLineComment());
+      std::string line = takeLineComment();
+      if (!isBehindToken) comment.push_back(std::move(line));
       lineFeeds = 0;
     } else if (peek() == '/' && peek(1) == '*') {
       skipBlockComment();
     } else if (std::isspace(static_cast<unsigned char>(peek())) != 0) {
-      if (peek() == '\n' && ++lineFeeds > 1) comment.clear();
+      if (peek() == '\n') {
+        isBehindToken = false;
+        if (++lineFeeds > 1) comment.clear();
+      }
       advance();
     } else {
       break;

@@ -4,6 +4,7 @@
 #include <charconv>
 #include <limits>
 #include <optional>
+#include <set>
 
 #include "lexer.h"
 
@@ -61,6 +62,14 @@ class Parser {
     return std::string(token.text);
   }
 
+  /// The name of a type that its owner, a message or the file itself, has not declared yet.
+  std::string takeTypeName(const std::string& owner, const std::string& expected) {
+    const Position position = token_.position;
+    std::string name = takeName(expected);
+    if (!typeNames_.insert(owner + '.' + name).second) lexer_.fail(position, "'" + name + "' is declared already");
+    return name;
+  }
+
   std::int64_t takeInteger(const std::string& expected, std::int64_t least, std::int64_t largest) {
     const Position position = token_.position;
     const bool negative = isNext("-");
@@ -95,7 +104,8 @@ class Parser {
       expect(";");
     } else if (isNext("import")) {
       take();
-      file_.imports.emplace_back(takeKind(TokenKind::string, "the path of a .proto file").text);
+      const Token path = takeKind(TokenKind::string, "the path of a .proto file");
+      file_.imports.push_back({std::string(path.text), path.position});
       expect(";");
     } else if (isNext("enum")) {
       file_.enumerations.push_back(parseEnumeration(""));
@@ -110,7 +120,7 @@ class Parser {
     Enumeration enumeration;
     enumeration.comment = take().comment;
     enumeration.owner = owner;
-    enumeration.name = takeName("the enumeration's name");
+    enumeration.name = takeTypeName(owner, "the enumeration's name");
     expect("{");
     while (!isNext("}")) {
       const Position position = token_.position;
@@ -135,7 +145,7 @@ class Parser {
   MessageType parseMessage() {
     MessageType message;
     message.comment = take().comment;
-    message.name = takeName("the message's name");
+    message.name = takeTypeName("", "the message's name");
     expect("{");
     while (!isNext("}")) {
       if (isNext("enum")) {
@@ -187,6 +197,7 @@ class Parser {
   Lexer lexer_;
   Token token_;
   ProtoFile file_;
+  std::set<std::string> typeNames_;
 };
 
 }  // namespace

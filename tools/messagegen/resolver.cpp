@@ -19,33 +19,57 @@ const std::map<std::string_view, FieldType> kScalars{
     {"bytes", FieldType::bytes},
 };
 
-/// Words that no accessor can be named: the language's own, and the operations of every message.
-const std::set<std::string_view> kTakenNames{
-    "auto",           "bool",         "break",
-    "case",           "catch",        "char",
-    "class",          "const",        "continue",
-    "default",        "delete",       "do",
-    "double",         "else",         "enum",
-    "explicit",       "export",       "extern",
-    "false",          "float",        "for",
-    "friend",         "goto",         "if",
-    "inline",         "int",          "long",
-    "mutable",        "namespace",    "new",
-    "operator",       "private",      "protected",
-    "public",         "register",     "requires",
-    "return",         "short",        "signed",
-    "sizeof",         "static",       "struct",
-    "switch",         "template",     "this",
-    "throw",          "true",         "try",
-    "typedef",        "typeid",       "typename",
-    "union",          "unsigned",     "using",
-    "virtual",        "void",         "volatile",
-    "while",          "hash",         "isEqual",
-    "className",      "readFrom",     "writeTo",
-    "copyTo",         "mergeFrom",    "description",
-    "initWithData",   "copyWithZone", "dictionaryRepresentation",
-    "hasEqualFields",
+/// The language's own words, as far as an accessor could have their form.
+const std::set<std::string_view> kKeywords{
+    "alignas",   "alignof",  "and",      "asm",       "auto",      "bitand",   "bitor",    "bool",      "break",
+    "case",      "catch",    "char",     "class",     "compl",     "concept",  "const",    "consteval", "constexpr",
+    "constinit", "continue", "decltype", "default",   "delete",    "do",       "double",   "else",      "enum",
+    "explicit",  "export",   "extern",   "false",     "float",     "for",      "friend",   "goto",      "if",
+    "inline",    "int",      "long",     "mutable",   "namespace", "new",      "noexcept", "not",       "nullptr",
+    "operator",  "or",       "private",  "protected", "public",    "register", "requires", "return",    "short",
+    "signed",    "sizeof",   "static",   "struct",    "switch",    "template", "this",     "throw",     "true",
+    "try",       "typedef",  "typeid",   "typename",  "union",     "unsigned", "using",    "virtual",   "void",
+    "volatile",  "while",    "xor",
 };
+
+/// What every message has from its base.
+const std::set<std::string_view> kOperations{
+    "assign",
+    "className",
+    "copyScalar",
+    "copyTo",
+    "copyWithZone",
+    "description",
+    "dictionaryRepresentation",
+    "has",
+    "hasEqualFields",
+    "hash",
+    "initWithData",
+    "isEqual",
+    "isSameScalar",
+    "mergeFrom",
+    "presentScalars",
+    "readFields",
+    "readFrom",
+    "scalarHash",
+    "setPresence",
+    "writeTo",
+};
+
+/// The names of all accessors of a field.
+std::vector<std::string> accessorsOf(const Field& field) {
+  const std::string property = propertyOf(field);
+  std::vector<std::string> names{property, "set" + capitalized(property)};
+  if (field.repeated) {
+    const std::string element = elementOf(field);
+    names.insert(names.end(), {"clear" + capitalized(property), "add" + capitalized(element), property + "Count",
+                               element + "AtIndex"});
+  } else {
+    names.push_back("has" + capitalized(property));
+    if (field.isOptionalScalar()) names.push_back("setHas" + capitalized(property));
+  }
+  return names;
+}
 
 constexpr std::size_t kMostPresenceBits = 64;
 
@@ -57,9 +81,9 @@ class Resolver {
     source_ = std::move(*source);
     file_ = parseProto(path, source_);
     addTypes(file_);
-    for (const std::string& import : file_.imports) {
+    for (const auto& [import, position] : file_.imports) {
       const std::optional<std::string> imported = readSource(import);
-      if (!imported) fail({}, "import \"" + import + "\" cannot be read");
+      if (!imported) fail(position, "import \"" + import + "\" cannot be read");
       addTypes(parseProto(import, *imported));
     }
   }
@@ -112,12 +136,13 @@ class Resolver {
   }
 
   void checkAccessors(const MessageType& message) const {
-    std::set<std::string> properties;
+    std::set<std::string> taken;
     std::size_t presenceBits = 0;
     for (const Field& field : message.fields) {
-      const std::string property = propertyOf(field);
-      if (kTakenNames.contains(property) || !properties.insert(property).second) {
-        fail(field.position, "the accessor '" + property + "' has its name from something else already");
+      for (const std::string& accessor : accessorsOf(field)) {
+        if (kKeywords.contains(accessor) || kOperations.contains(accessor) || !taken.insert(accessor).second) {
+          fail(field.position, "the accessor '" + accessor + "' has its name from something else already");
+        }
       }
       if (field.isOptionalScalar() && ++presenceBits > kMostPresenceBits) {
         fail(field.position, "more than 64 optional scalars in one message");

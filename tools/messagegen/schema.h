@@ -56,11 +56,17 @@ struct MessageType {
   std::vector<Field> fields;
 };
 
+struct Import {
+  /// Relative to the schema's root.
+  std::string path;
+  Position position;
+};
+
 struct ProtoFile {
   /// Relative to the schema's root, as imports name it.
   std::string path;
   std::string package;
-  std::vector<std::string> imports;
+  std::vector<Import> imports;
   std::vector<Enumeration> enumerations;
   /// Each after the messages that it contains.
   std::vector<MessageType> messages;
