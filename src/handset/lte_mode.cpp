@@ -19,7 +19,7 @@ constexpr double kReselectionMargin = 4;
 constexpr double kOtherFrequencyMargin = 2;
 constexpr double kOutOfSyncSinr = -7;
 
-constexpr double kHandoverFailure = 0.03;
+constexpr double kHandoverFailure = 0.05;
 constexpr double kAccessFailure = 0.02;
 
 std::int64_t milliseconds(double low, double high, Random& random) {

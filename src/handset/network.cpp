@@ -9,13 +9,13 @@ namespace {
 constexpr std::size_t kLteSites = 20;
 constexpr std::size_t kUmtsSites = 10;
 constexpr std::size_t kGsmSites = 6;
-/// Every so-manieth LTE site has no carrier of the first layer, so that handovers cross frequencies.
+/// One LTE site in so many has no carrier of the first layer, so that handovers cross frequencies.
 constexpr std::size_t kSecondLayerOnly = 4;
 
 constexpr double kLtePower = 12;
 constexpr double kUmtsPower = 26;
 constexpr double kGsmPower = 36;
-constexpr double kTunnelPower = 8;
+constexpr double kTunnelPower = -4;
 /// Metres: the middle of the tunnel.
 constexpr double kTunnelSite = 540;
 
@@ -23,7 +23,6 @@ constexpr std::uint32_t kTunnelArfcn = 88;
 constexpr double kGsmFrequency = 950;
 constexpr double kUmtsFrequency = 942.4;
 
-/// The two halves of the town are areas of their own.
 std::uint32_t areaCode(double place, std::uint32_t first) {
   return place < kRingLength / 2 ? first : first + 1;
 }
@@ -53,7 +52,7 @@ void addLteSite(std::vector<LteCell>& cells, std::size_t index, std::uint32_t fi
       // Each layer has a third of the 504 codes; 5 is prime to the 56 groups of three in it, so that none recurs.
       cell.pci = 168 * layer + 3 * ((firstPci + 5 * static_cast<std::uint32_t>(index)) % 56) + sector;
       cell.cellId = (0x1A000 + static_cast<std::uint32_t>(index)) << 8 | (16 * layer + sector + 1);
-      cell.trackingAreaCode = areaCode(site.place, 10001);
+      cell.trackingAreaCode = areaCode(site.place, kFirstTrackingArea);
       cell.load = random.between(0.25, 0.6);
       cells.push_back(cell);
     }
@@ -70,7 +69,7 @@ void addUmtsSite(std::vector<UmtsCell>& cells, std::size_t index, std::uint32_t 
     cell.antenna.frequencyMhz = kUmtsFrequency;
     cell.scramblingCode = 8 * ((firstCode + 11 * static_cast<std::uint32_t>(index)) % 64) + sector;
     cell.cellId = 0x21U << 16 | (1000 + 10 * static_cast<std::uint32_t>(index) + sector + 1);
-    cell.locationAreaCode = areaCode(site.place, 2001);
+    cell.locationAreaCode = areaCode(site.place, kFirstLocationArea);
     cells.push_back(cell);
   }
 }
@@ -86,7 +85,7 @@ void addGsmSite(std::vector<GsmCell>& cells, std::size_t index, Random& random) 
     cell.arfcn = 60 + 4 * static_cast<std::uint32_t>(index) + 2 * sector;
     cell.bsic = 5 * 8 + static_cast<std::uint32_t>(index);
     cell.cellId = 20000 + 10 * static_cast<std::uint32_t>(index) + sector + 1;
-    cell.locationAreaCode = areaCode(site.place, 2001);
+    cell.locationAreaCode = areaCode(site.place, kFirstLocationArea);
     cells.push_back(cell);
   }
 }
@@ -98,7 +97,7 @@ GsmCell makeTunnelCell() {
   cell.arfcn = kTunnelArfcn;
   cell.bsic = 5 * 8 + 7;
   cell.cellId = 20901;
-  cell.locationAreaCode = areaCode(kTunnelSite, 2001);
+  cell.locationAreaCode = areaCode(kTunnelSite, kFirstLocationArea);
   return cell;
 }
 

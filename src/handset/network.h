@@ -17,6 +17,13 @@ inline constexpr std::uint32_t kMnc = 1;
 inline constexpr std::uint32_t kMncDigits = 2;
 inline constexpr std::uint32_t kRoutingAreaCode = 1;
 
+/// The town's halves are areas of their own: a tracking area of LTE covers what a location area of the others does.
+inline constexpr std::uint32_t kFirstTrackingArea = 10001;
+inline constexpr std::uint32_t kFirstLocationArea = 2001;
+[[nodiscard]] constexpr std::uint32_t locationAreaOf(std::uint32_t trackingAreaCode) {
+  return trackingAreaCode - kFirstTrackingArea + kFirstLocationArea;
+}
+
 /// Where a cell's signal comes from.
 struct Antenna {
   /// Index of the site among those of its technology.

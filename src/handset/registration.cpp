@@ -115,8 +115,8 @@ Registration::Registration(Random& random) {
   identity_.mTmsi = random32(random);
   identity_.tmsi = random32(random);
   identity_.pTmsi = random32(random) | 0xC0000000;
-  identity_.trackingAreaCode = 10001;
-  identity_.locationAreaCode = 2001;
+  identity_.trackingAreaCode = kFirstTrackingArea;
+  identity_.locationAreaCode = kFirstLocationArea;
   interfaceId_ = random.next();
   internetAddress_ = 0x0A000000 | random.below(1 << 24);
 }
@@ -163,6 +163,8 @@ void Registration::complete(const Area& area, Outbox& outbox, Random& random) {
   if (area.isTrackingArea) {
     identity_.mTmsi = random32(random);
     identity_.trackingAreaCode = area.code;
+    // The update is a combined one.
+    identity_.locationAreaCode = locationAreaOf(area.code);
   } else {
     identity_.pTmsi = random32(random) | 0xC0000000;
     identity_.locationAreaCode = area.code;

@@ -44,10 +44,9 @@ Bytes accessClassFile(const Subscriber& subscriber) {
   return content;
 }
 
-/// The services that this card has: short messages, service provider name, MSISDN, operator-controlled and home
-/// network selectors, EPS mobility management.
+/// The services that this card has: service provider name, MSISDN, home network selector, EPS mobility management.
 Bytes serviceTableFile() {
-  constexpr unsigned kServices[] = {10, 12, 19, 20, 21, 42, 43, 85};
+  constexpr unsigned kServices[] = {19, 21, 43, 85};
   Bytes content(11);
   for (const unsigned service : kServices) {
     std::uint8_t& byte = content[(service - 1) / 8];
