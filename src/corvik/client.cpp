@@ -18,8 +18,7 @@ Result PerformCommand(const std::shared_ptr<Manager>& manager, const vesk::Text&
   return manager->perform(command, message);
 }
 
-void RegisterEventHandler(const std::shared_ptr<Manager>& manager, const vesk::Text& event,
-                          EventHandler handler) {
+void RegisterEventHandler(const std::shared_ptr<Manager>& manager, const vesk::Text& event, EventHandler handler) {
   manager->channel().setHandler(event, std::move(handler));
 }
 

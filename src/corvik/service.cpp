@@ -55,9 +55,8 @@ Result Service::perform(const vesk::Text& command, const vesk::InterProcessDicti
 Result Service::query(const vesk::InterProcessDictionary& message) {
   MetricQuery asked{};
   const std::pair<const vesk::Text*, std::int64_t*> arguments[] = {
-      {&kKeyTriggerRef, &asked.triggerRef}, {&kKeyTriggerType, &asked.triggerType},
-      {&kKeyTriggerID, &asked.triggerId},   {&kKeyProfileID, &asked.profileId},
-      {&kKeyMetricID, &asked.metricId},
+      {&kKeyTriggerRef, &asked.triggerRef}, {&kKeyTriggerType, &asked.triggerType}, {&kKeyTriggerID, &asked.triggerId},
+      {&kKeyProfileID, &asked.profileId},   {&kKeyMetricID, &asked.metricId},
   };
   for (const auto& [key, argument] : arguments) {
     const std::optional<std::int64_t> value = message.integer(key->view());

@@ -67,8 +67,7 @@ class Service {
 
   /// Executes a command, or refuses it with a status and a message that says why: an unknown command, an
   /// empty configuration, an incomplete query.
-  [[nodiscard]] virtual Result perform(const vesk::Text& command,
-                                       const vesk::InterProcessDictionary& message);
+  [[nodiscard]] virtual Result perform(const vesk::Text& command, const vesk::InterProcessDictionary& message);
   /// Lets every command end with `refusal`; absent, they are executed again.
   void refuseAll(std::optional<Result> refusal) { refusal_ = std::move(refusal); }
 

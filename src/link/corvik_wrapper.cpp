@@ -59,9 +59,8 @@ bool CorvikWrapper::removeQuodraConfigForAppid(std::string_view appId) {
   return perform(kRemoveOperation, corvik::kCommandClearConfiguration, message);
 }
 
-bool CorvikWrapper::querySpecificMetric(std::string_view appId, std::int32_t triggerRef,
-                                        std::int32_t triggerType, std::int32_t triggerId,
-                                        std::int32_t profileId, std::int32_t metricId) {
+bool CorvikWrapper::querySpecificMetric(std::string_view appId, std::int32_t triggerRef, std::int32_t triggerType,
+                                        std::int32_t triggerId, std::int32_t profileId, std::int32_t metricId) {
   if (appId != kClientName) return false;
   InterProcessDictionary message;
   message.setInteger(corvik::kKeyAppID, kServiceAppId);
@@ -74,8 +73,7 @@ bool CorvikWrapper::querySpecificMetric(std::string_view appId, std::int32_t tri
   return perform(kQueryOperation, corvik::kCommandQueryMetric, message);
 }
 
-bool CorvikWrapper::perform(const char* operation, const Text& command,
-                            const InterProcessDictionary& message) {
+bool CorvikWrapper::perform(const char* operation, const Text& command, const InterProcessDictionary& message) {
   InterProcessDictionary reply;
   const corvik::Result result = client::PerformCommand(corvikManager_, command, message, reply);
   SystemLog::write("%s: error=%d msg=%s", operation, result.code, result.message.c_str());
@@ -92,11 +90,11 @@ void CorvikWrapper::listen() {
 
 void CorvikWrapper::forward(const Text& event, const char* label, Deliver deliver) {
   // The manager holds the handlers and the wrapper the manager: a handler must not hold the wrapper.
-  client::RegisterEventHandler(corvikManager_, event,
-                               [weak = weak_from_this(), label, deliver](const InterProcessDictionary& raised,
-                                                                         const client::WorkGroup&) {
-                                 if (const auto self = weak.lock()) self->forward(raised, label, deliver);
-                               });
+  client::RegisterEventHandler(
+      corvikManager_, event,
+      [weak = weak_from_this(), label, deliver](const InterProcessDictionary& raised, const client::WorkGroup&) {
+        if (const auto self = weak.lock()) self->forward(raised, label, deliver);
+      });
 }
 
 void CorvikWrapper::forward(const InterProcessDictionary& event, const char* label, Deliver deliver) {

@@ -90,20 +90,17 @@ TEST_F(CorvikWrapperTest, SendsCommandsWithTheServicesIdentifierAndLogsTheirOutc
   EXPECT_TRUE(wrapper_->removeQuodraConfigForAppid("vesk"));
   EXPECT_TRUE(wrapper_->addQuodraConfigForAppId("vesk", path));
   service_->result = {-3, "busy"};
-  EXPECT_FALSE(
-      wrapper_->querySpecificMetric("vesk", 9999, 0, 8323091, std::numeric_limits<std::int32_t>::min(), -1));
-  EXPECT_EQ(service_->told,
-            (Lines{"kCommandClearConfiguration {kKeyAppID: 2}",
-                   "kCommandAddConfiguration {kKeyAppID: 2, kKeyPayload: 0x01ab, kKeyPayloadType: 0}",
-                   "kCommandQueryMetric {kKeyAppID: 2, kKeyPayloadType: 0, kKeyTriggerRef: 9999, "
-                   "kKeyTriggerType: 0, kKeyTriggerID: 8323091, kKeyProfileID: -2147483648, "
-                   "kKeyMetricID: -1}"}));
-  EXPECT_EQ(
-      log.lines(),
-      (Lines{"-[CorvikWrapper removeQuodraConfigForAppid:]: error=0 msg=",
-             "-[CorvikWrapper addQuodraConfigForAppId:andProtofFilePath:]: error=0 msg=",
-             "-[CorvikWrapper querySpecificMetric:triggerRef:triggerType:triggerID:profileID:metricID:]: "
-             "error=-3 msg=busy"}));
+  EXPECT_FALSE(wrapper_->querySpecificMetric("vesk", 9999, 0, 8323091, std::numeric_limits<std::int32_t>::min(), -1));
+  EXPECT_EQ(service_->told, (Lines{"kCommandClearConfiguration {kKeyAppID: 2}",
+                                   "kCommandAddConfiguration {kKeyAppID: 2, kKeyPayload: 0x01ab, kKeyPayloadType: 0}",
+                                   "kCommandQueryMetric {kKeyAppID: 2, kKeyPayloadType: 0, kKeyTriggerRef: 9999, "
+                                   "kKeyTriggerType: 0, kKeyTriggerID: 8323091, kKeyProfileID: -2147483648, "
+                                   "kKeyMetricID: -1}"}));
+  EXPECT_EQ(log.lines(),
+            (Lines{"-[CorvikWrapper removeQuodraConfigForAppid:]: error=0 msg=",
+                   "-[CorvikWrapper addQuodraConfigForAppId:andProtofFilePath:]: error=0 msg=",
+                   "-[CorvikWrapper querySpecificMetric:triggerRef:triggerType:triggerID:profileID:metricID:]: "
+                   "error=-3 msg=busy"}));
 }
 
 TEST_F(CorvikWrapperTest, SendsAndLogsNothingForAnotherApplicationOrAFileThatCannotBeRead) {
@@ -129,10 +126,10 @@ TEST_F(CorvikWrapperTest, ForwardsEventsToItsDelegateOnTheMainQueue) {
   EXPECT_TRUE(notes_.empty());
   loop_.runDue();
   EXPECT_EQ(notes_, (Lines{"metric {id: 1}", "trigger {id: 2}"}));
-  EXPECT_EQ(log.lines(), (Lines{"-[CorvikWrapper listen]: listening for events",
-                                "-[CorvikWrapper listen]: listening for events",
-                                "-[CorvikWrapper listen]_block_invoke: MetricsTrigger dict={id: 1}",
-                                "-[CorvikWrapper listen]_block_invoke: EventTrigger dict={id: 2}"}));
+  EXPECT_EQ(log.lines(),
+            (Lines{"-[CorvikWrapper listen]: listening for events", "-[CorvikWrapper listen]: listening for events",
+                   "-[CorvikWrapper listen]_block_invoke: MetricsTrigger dict={id: 1}",
+                   "-[CorvikWrapper listen]_block_invoke: EventTrigger dict={id: 2}"}));
 }
 
 TEST_F(CorvikWrapperTest, DropsAnEventWithoutADelegateWhenItComesOrWhenItsTurnComes) {
