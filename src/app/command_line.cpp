@@ -12,6 +12,7 @@
 #include "app/decode_command.h"
 #include "app/run_command.h"
 #include "app/show_command.h"
+#include "app/simulate_command.h"
 #include "app/stores_command.h"
 #include "platform/system_log.h"
 
@@ -21,6 +22,7 @@ namespace {
 
 constexpr const char* kExamples =
     "Examples:\n"
+    "  vesk                                   walk the screens of a simulated drive\n"
     "  vesk --replay drive.jsonl              walk the screens while a drive is replayed\n"
     "  vesk --replay drive.jsonl --speed 10   the same, ten times as fast\n"
     "  tail -f live.jsonl | vesk --replay -   the screens on a live pipe\n"
@@ -47,6 +49,11 @@ constexpr const char* kShowExamples =
     "Examples:\n"
     "  vesk show LTE \"Serving Cell Meas\" drive.jsonl\n"
     "  vesk show UMTS \"Tx Power\" drive.jsonl --json | jq -r '.sections[].rows[].value'";
+
+constexpr const char* kSimulateExamples =
+    "Examples:\n"
+    "  vesk simulate --seconds 600 > drive.jsonl\n"
+    "  vesk simulate --seed 7 | vesk show LTE \"RRC State\" -";
 
 /// Where the system log goes.
 bool openLog(const std::string& to) {
@@ -90,6 +97,7 @@ class CommandLine {
     addDecode();
     addStores();
     addShow();
+    addSimulate();
   }
 
   Outcome run(int argc, const char* const* argv) {
@@ -104,7 +112,9 @@ class CommandLine {
 
  private:
   void addRunOptions() {
-    program_.add_option("--replay", run_.source.replay, "Feed the program with a recording; - is standard input")
+    program_
+        .add_option("--replay", run_.source.replay,
+                    "Feed the program with a recording instead of the simulated handset; - is standard input")
         ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: the diagnostic lines on standard output");
     program_
@@ -117,6 +127,7 @@ class CommandLine {
             "How many seconds of the recording pass in one: a number, or max")
         ->type_name("N")
         ->default_str("1");
+    program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")->type_name("N");
     program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end");
     program_
         .add_option_function<double>(
@@ -130,16 +141,8 @@ class CommandLine {
         ->check(CLI::Range(0.001, 1e9));
     addLogOption(program_, "syslog");
     program_.callback([this] {
-      if (program_.get_subcommands().empty()) command_ = [this] { return runInteractive(); };
+      if (program_.get_subcommands().empty()) command_ = [this] { return runProgram(run_); };
     });
-  }
-
-  Outcome runInteractive() {
-    if (!run_.source.replay) {
-      tellUser("vesk: no source of events; give one with --replay FILE, or see vesk --help");
-      return Outcome::wrongUsage;
-    }
-    return runProgram(run_);
   }
 
   void addDecode() {
@@ -171,6 +174,18 @@ class CommandLine {
     show->final_callback([this] { command_ = [this] { return runShow(show_); }; });
   }
 
+  void addSimulate() {
+    CLI::App* simulate = program_.add_subcommand("simulate", "Print a drive of the simulated handset, as a recording");
+    simulate->add_option("--seed", simulate_.seed, "Which drive")->type_name("N")->default_str("1");
+    simulate->add_option("--seconds", simulate_.seconds, "How long it is")
+        ->type_name("N")
+        ->default_str("60")
+        ->check(CLI::Range(0.0, 1e9));
+    addLogOption(*simulate, "none");
+    simulate->footer(kSimulateExamples);
+    simulate->final_callback([this] { command_ = [this] { return runSimulate(simulate_); }; });
+  }
+
   static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {
     command.add_option("FILE", path, description)->type_name("");
   }
@@ -189,6 +204,7 @@ class CommandLine {
   CLI::App program_{"Radio metrics of a cellular handset, decoded and shown"};
   RunOptions run_;
   ShowOptions show_;
+  SimulateOptions simulate_;
   std::optional<std::string> recording_;
   std::string logTo_;
   std::function<Outcome()> command_;

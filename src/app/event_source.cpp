@@ -1,7 +1,10 @@
 #include "app/event_source.h"
 
+#include <chrono>
 #include <cmath>
 #include <cstdio>
+
+#include "handset/handset_service.h"
 
 namespace vesk {
 
@@ -38,6 +41,12 @@ std::string shown(const corvik::PlaybackState& state) {
 }  // namespace
 
 EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+  if (!options.replay) {
+    const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
+    const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
+    return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
+            [] { return std::string("simulated"); }};
+  }
   auto service =
       std::make_shared<corvik::RecordedService>(corvik::RecordingReader(*options.replay), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -13,8 +14,10 @@ namespace vesk {
 
 /// Which events the program is fed with.
 struct SourceOptions {
-  /// A recording; "-" is standard input.
+  /// A recording; "-" is standard input. Without one a simulated handset is driven.
   std::optional<std::string> replay;
+  /// Which drive of the handset.
+  std::uint64_t seed = 1;
   corvik::Playback playback;
 };
 
