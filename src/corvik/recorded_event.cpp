@@ -7,7 +7,7 @@
 #include "corvik/hex.h"
 #include "platform/text_form.h"
 
-namespace vesk::corvik {
+namespace corvik {
 
 namespace {
 
@@ -69,10 +69,10 @@ struct RecordedEventParser::Fields {
 
 void appendRecordedEvent(std::string& out, const RecordedEvent& event) {
   out += "{\"at\": ";
-  appendDecimal(out, event.at);
+  vesk::appendDecimal(out, event.at);
   out += ", \"metric\": ";
   if (event.metricId < 0) {
-    appendDecimal(out, event.metricId);
+    vesk::appendDecimal(out, event.metricId);
   } else {
     constexpr std::string_view kDigits = "0123456789ABCDEF";
     std::array<char, 16> digits;
@@ -87,7 +87,7 @@ void appendRecordedEvent(std::string& out, const RecordedEvent& event) {
     out += '"';
   }
   out += ", \"payload\": \"";
-  appendHex(out, event.payload);
+  vesk::appendHex(out, event.payload);
   out += "\"}\n";
 }
 
@@ -116,8 +116,7 @@ bool RecordedEventParser::readFields(std::string_view line, Fields& fields) {
   if (first == std::string_view::npos || line[first] != '{') return fail("no JSON object");
 
   ondemand::parser& parser = json_->parser;
-  if (parser.capacity() < line.size() &&
-      parser.allocate(std::max(kUsualLine, line.size() * 2)) != simdjson::SUCCESS) {
+  if (parser.capacity() < line.size() && parser.allocate(std::max(kUsualLine, line.size() * 2)) != simdjson::SUCCESS) {
     return fail("too long for the memory there is");
   }
   ondemand::document document;
@@ -177,4 +176,4 @@ bool RecordedEventParser::fail(std::string reason) {
   return false;
 }
 
-}  // namespace vesk::corvik
+}  // namespace corvik

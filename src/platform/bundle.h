@@ -20,8 +20,7 @@ class Bundle {
   explicit Bundle(std::vector<std::filesystem::path> directories) : directories_(std::move(directories)) {}
 
   /// The path of the file NAME.TYPE, if there is one.
-  [[nodiscard]] std::optional<std::string> pathForResource(std::string_view name,
-                                                           std::string_view type) const;
+  [[nodiscard]] std::optional<std::string> pathForResource(std::string_view name, std::string_view type) const;
 
  private:
   std::vector<std::filesystem::path> directories_;

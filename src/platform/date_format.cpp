@@ -89,10 +89,8 @@ bool DateFormat::writeMinute(std::time_t instant) {
   if (!local) return false;
   untilSeconds_.clear();
   appendPadded(untilSeconds_, yearOf(*local), 4);
-  for (const auto& [separator, number] : {std::pair{'-', local->tm_mon + 1},
-                                          {'-', local->tm_mday},
-                                          {' ', local->tm_hour},
-                                          {':', local->tm_min}}) {
+  for (const auto& [separator, number] :
+       {std::pair{'-', local->tm_mon + 1}, {'-', local->tm_mday}, {' ', local->tm_hour}, {':', local->tm_min}}) {
     untilSeconds_ += separator;
     appendPadded(untilSeconds_, number, 2);
   }

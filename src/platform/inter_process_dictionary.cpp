@@ -26,8 +26,8 @@ const Data* InterProcessDictionary::data(std::string_view key) const {
 }
 
 const FileDescriptor* InterProcessDictionary::descriptor(std::string_view key) const {
-  const auto found = std::find_if(descriptors_.begin(), descriptors_.end(),
-                                  [&](const Descriptor& each) { return each.key == key; });
+  const auto found =
+      std::find_if(descriptors_.begin(), descriptors_.end(), [&](const Descriptor& each) { return each.key == key; });
   return found == descriptors_.end() ? nullptr : found->descriptor.get();
 }
 

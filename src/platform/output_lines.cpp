@@ -25,8 +25,7 @@ std::size_t chunkOf(int descriptor) {
 }
 
 std::unique_ptr<OutputSink>& sinkInForce() {
-  static std::unique_ptr<OutputSink> theSink =
-      std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
+  static std::unique_ptr<OutputSink> theSink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
   return theSink;
 }
 
@@ -51,7 +50,8 @@ void DescriptorSink::flush() {
   std::string_view rest = buffer_;
   while (!rest.empty() && !hasFailed_) {
     if (waitForRoom() == Room::interrupted) break;
-    const ssize_t written = ::write(descriptor_, rest.data(), std::min(rest.size(), chunk_));
+    const std::size_t most = interrupt_ == nullptr ? rest.size() : chunk_;
+    const ssize_t written = ::write(descriptor_, rest.data(), std::min(rest.size(), most));
     if (written >= 0) {
       rest.remove_prefix(static_cast<std::size_t>(written));
     } else if (errno != EINTR && errno != EAGAIN) {
@@ -62,8 +62,8 @@ void DescriptorSink::flush() {
 }
 
 DescriptorSink::Room DescriptorSink::waitForRoom() const {
-  pollfd polled[] = {{descriptor_, POLLOUT, 0},
-                     {interrupt_ == nullptr ? -1 : interrupt_->descriptor(), POLLIN, 0}};
+  if (interrupt_ == nullptr) return Room::some;
+  pollfd polled[] = {{descriptor_, POLLOUT, 0}, {interrupt_->descriptor(), POLLIN, 0}};
   // What poll fails for, the write that follows tells better.
   while (poll(polled, std::size(polled), -1) < 0 && errno == EINTR) {
   }
@@ -79,6 +79,10 @@ void DescriptorSink::fail(int error) {
 std::unique_ptr<OutputSink> OutputLines::setSink(std::unique_ptr<OutputSink> sink) {
   flush();
   return std::exchange(sinkInForce(), std::move(sink));
+}
+
+bool OutputLines::isOpen() {
+  return sinkInForce() != nullptr;
 }
 
 void OutputLines::print(std::initializer_list<std::string_view> items) {

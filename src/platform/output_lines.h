@@ -52,7 +52,7 @@ class DescriptorSink : public OutputSink {
   int descriptor_;
   std::string name_;
   bool isTerminal_;
-  /// The most that is written at once; a pipe that has room at all has room for this.
+  /// The most that is written at once while an interrupt is watched; a pipe that has room at all has room for this.
   std::size_t chunk_;
   const WakeUp* interrupt_ = nullptr;
   FailureHandler onFailure_;
@@ -65,6 +65,8 @@ class OutputLines {
  public:
   /// Puts `sink` in the place of the one in force and returns that. Null drops all lines.
   static std::unique_ptr<OutputSink> setSink(std::unique_ptr<OutputSink> sink);
+  /// Whether a line would go anywhere: ask before building a costly one.
+  [[nodiscard]] static bool isOpen();
   /// Prints one line: the items, separated by one blank, control characters made visible.
   static void print(std::initializer_list<std::string_view> items);
   static void flush();

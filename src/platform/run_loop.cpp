@@ -109,8 +109,8 @@ bool RunLoop::serveInputs(int timeout) {
   bool isAnyReadable = false;
   for (const pollfd& ready : std::span(polled).subspan(1)) {
     if (ready.revents == 0) continue;
-    const auto input = std::find_if(inputs_.begin(), inputs_.end(),
-                                    [&](const Input& each) { return each.descriptor == ready.fd; });
+    const auto input =
+        std::find_if(inputs_.begin(), inputs_.end(), [&](const Input& each) { return each.descriptor == ready.fd; });
     if (input == inputs_.end()) continue;
     isAnyReadable = true;
     // A copy, for the callback may remove itself.

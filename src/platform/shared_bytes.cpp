@@ -7,7 +7,7 @@
 namespace vesk {
 
 SharedBytes SharedBytes::copy(std::string_view bytes) {
-  if (bytes.empty()) return SharedBytes();
+  if (bytes.empty()) return {};
   if (bytes.size() > UINT32_MAX) throw std::length_error("text or data beyond 4 GiB");
   void* storage = ::operator new(sizeof(Block) + bytes.size());
   char* content = static_cast<char*>(storage) + sizeof(Block);

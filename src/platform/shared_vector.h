@@ -85,9 +85,7 @@ class SharedVector {
     std::size_t capacity;
 
     explicit Block(std::size_t room) : capacity(room) {}
-    static constexpr std::size_t itemsOffset() {
-      return (sizeof(Block) + alignof(T) - 1) / alignof(T) * alignof(T);
-    }
+    static constexpr std::size_t itemsOffset() { return (sizeof(Block) + alignof(T) - 1) / alignof(T) * alignof(T); }
     T* items() { return reinterpret_cast<T*>(reinterpret_cast<std::byte*>(this) + itemsOffset()); }
   };
 

@@ -18,9 +18,7 @@ class SyslogSink : public LogSink {
   SyslogSink(const SyslogSink&) = delete;
   SyslogSink& operator=(const SyslogSink&) = delete;
 
-  void write(std::string_view line) override {
-    syslog(LOG_NOTICE, "%.*s", static_cast<int>(line.size()), line.data());
-  }
+  void write(std::string_view line) override { syslog(LOG_NOTICE, "%.*s", static_cast<int>(line.size()), line.data()); }
 };
 
 class StreamSink : public LogSink {

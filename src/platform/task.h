@@ -70,8 +70,7 @@ class Task {
   }
 
   template <class Held>
-  static constexpr Operations kInside{[](void* held) { (*static_cast<Held*>(held))(); }, &move<Held>,
-                                      &destroy<Held>};
+  static constexpr Operations kInside{[](void* held) { (*static_cast<Held*>(held))(); }, &move<Held>, &destroy<Held>};
   template <class Held>
   static constexpr Operations kOutside{[](void* held) { (**static_cast<std::unique_ptr<Held>*>(held))(); },
                                        &move<std::unique_ptr<Held>>, &destroy<std::unique_ptr<Held>>};

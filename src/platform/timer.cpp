@@ -7,8 +7,7 @@
 namespace vesk {
 
 Timer::Timer(RunLoop& loop, Clock::Duration interval, RunLoopMode mode, Action action)
-    : state_(std::make_shared<State>(
-          State{interval, mode, std::move(action), loop.clock().now() + interval, true})) {
+    : state_(std::make_shared<State>(State{interval, mode, std::move(action), loop.clock().now() + interval, true})) {
   loop.schedule(state_);
 }
 

@@ -52,8 +52,7 @@ void appendCharacter(std::string& out, std::string_view character) {
   const auto lead = static_cast<std::uint8_t>(character[0]);
   if (lead < kSpace || lead == kDelete) {
     appendNumber(out, lead);
-  } else if (lead == kLeadOfC1 && character.size() == 2 &&
-             static_cast<std::uint8_t>(character[1]) <= kLastC1) {
+  } else if (lead == kLeadOfC1 && character.size() == 2 && static_cast<std::uint8_t>(character[1]) <= kLastC1) {
     appendNumber(out, static_cast<std::uint8_t>(character[1]));
   } else {
     appendUtf8(out, character);

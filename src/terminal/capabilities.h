@@ -15,8 +15,7 @@ struct Capabilities {
   /// What makes text look as a role, starting from `plain`.
   std::array<std::string, kRoleCount> looks;
   std::string clear;
-  std::string
-      enterScreen;  ///< takes the terminal over: its other screen, no cursor, no wrapping, mouse reports
+  std::string enterScreen;  ///< takes the terminal over: its other screen, no cursor, no wrapping, mouse reports
   std::string leaveScreen;  ///< gives it back as it was
   bool showsUtf8 = true;
 
@@ -26,7 +25,6 @@ struct Capabilities {
 
 /// Reads the terminfo entry of TERM for the terminal at `descriptor`. Absent when the terminal is unknown or
 /// too simple for screens; `reason` then says why in one line.
-[[nodiscard]] std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8,
-                                                           std::string& reason);
+[[nodiscard]] std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, std::string& reason);
 
 }  // namespace vesk

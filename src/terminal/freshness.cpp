@@ -27,8 +27,8 @@ constexpr std::array kUnits{
 
 Freshness freshnessOf(const Arrivals& arrivals, Clock::Instant now) {
   if (!arrivals.last || arrivals.count == 0) return {"never"};
-  const auto age = std::max(std::chrono::duration_cast<std::chrono::seconds>(now - *arrivals.last),
-                            std::chrono::seconds(0));
+  const auto age =
+      std::max(std::chrono::duration_cast<std::chrono::seconds>(now - *arrivals.last), std::chrono::seconds(0));
   const Unit& unit =
       *std::find_if(kUnits.begin(), kUnits.end() - 1, [&](const Unit& each) { return each.length <= age; });
   const auto amount = age / unit.length;

@@ -4,8 +4,7 @@
 
 namespace vesk {
 
-Grid::Grid(Size size)
-    : size_{std::max(size.columns, 0), std::max(size.lines, 0)}, cells_(indexOf(0, size_.lines)) {}
+Grid::Grid(Size size) : size_{std::max(size.columns, 0), std::max(size.lines, 0)}, cells_(indexOf(0, size_.lines)) {}
 
 int Grid::write(int column, int line, std::string_view text, Role role, int end) {
   end = std::min(end, size_.columns);
@@ -32,8 +31,7 @@ void Grid::fill(int column, int line, Role role, int end) {
 void Grid::put(int column, int line, std::string_view glyph, int width, Role role) {
   Cell* cell = &cells_[indexOf(column, line)];
   if (cell->isRightHalf()) cell[-1] = Cell{.role = cell[-1].role};
-  if (column + width < size_.columns && cell[width].isRightHalf())
-    cell[width] = Cell{.role = cell[width].role};
+  if (column + width < size_.columns && cell[width].isRightHalf()) cell[width] = Cell{.role = cell[width].role};
   cell->bytes = {};
   std::copy(glyph.begin(), glyph.end(), cell->bytes.begin());
   cell->size = static_cast<std::uint8_t>(glyph.size());

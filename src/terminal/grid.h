@@ -74,8 +74,7 @@ class Grid {
 
  private:
   [[nodiscard]] std::size_t indexOf(int column, int line) const {
-    return static_cast<std::size_t>(line) * static_cast<std::size_t>(size_.columns) +
-           static_cast<std::size_t>(column);
+    return static_cast<std::size_t>(line) * static_cast<std::size_t>(size_.columns) + static_cast<std::size_t>(column);
   }
   void put(int column, int line, std::string_view glyph, int width, Role role);
 

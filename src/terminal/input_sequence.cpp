@@ -65,9 +65,8 @@ std::optional<InputEvent> letterEvent(char letter, int modifierParameter) {
 }
 
 std::optional<InputEvent> numberEvent(const Parameters& parameters) {
-  const auto* found = std::find_if(kNumberKeys.begin(), kNumberKeys.end(), [&](const NumberKey& each) {
-    return each.number == parameters.numbers[0];
-  });
+  const auto* found = std::find_if(kNumberKeys.begin(), kNumberKeys.end(),
+                                   [&](const NumberKey& each) { return each.number == parameters.numbers[0]; });
   if (found == kNumberKeys.end()) return std::nullopt;
   return KeyEvent{.key = found->key, .modifiers = modifiersOf(parameters.numbers[1])};
 }

@@ -13,10 +13,7 @@ constexpr BoundKey letter(char32_t character) {
 const KeyBinding kBindings[] = {
     {Action::Help, {letter(U'?')}, "help", "show or leave this help"},
     {Action::Open, {{Key::Enter}, {Key::Right}, letter(U'l')}, "open", "open the selected row"},
-    {Action::Back,
-     {{Key::Escape}, {Key::Left}, letter(U'h'), {Key::Backspace}},
-     "back",
-     "clear the filter, go back"},
+    {Action::Back, {{Key::Escape}, {Key::Left}, letter(U'h'), {Key::Backspace}}, "back", "clear the filter, go back"},
     {Action::Filter, {letter(U'/')}, "filter", "show only rows with what is typed"},
     {Action::Freeze, {letter(U'f')}, "freeze", "hold the screen; intake goes on"},
     {Action::Diagnostics, {letter(U'd')}, "lines", "show or hide the diagnostic lines"},

@@ -41,8 +41,7 @@ void Presenter::followStack() {
   const auto isSame = [](const Screen& screen, const std::shared_ptr<ViewController>& controller) {
     return screen.controller == controller;
   };
-  const auto differs =
-      std::mismatch(screens_.begin(), screens_.end(), stack.begin(), stack.end(), isSame).first;
+  const auto differs = std::mismatch(screens_.begin(), screens_.end(), stack.begin(), stack.end(), isSame).first;
   if (differs != screens_.end() || screens_.size() < stack.size()) {
     isTypingFilter_ = false;
     screens_.erase(differs, screens_.end());

@@ -158,8 +158,7 @@ class Renderer {
     const int start = std::clamp((travel * extent.before + hidden / 2) / hidden, 0, travel);
     for (int line = 0; line < height; ++line) {
       const bool isThumb = start <= line && line < start + thumb;
-      grid_.write(regions_.listColumns, regions_.list.start + line, isThumb ? "█" : "│", Role::Faint,
-                  width());
+      grid_.write(regions_.listColumns, regions_.list.start + line, isThumb ? "█" : "│", Role::Faint, width());
     }
   }
 
@@ -168,8 +167,8 @@ class Renderer {
     for (const HelpLine& each : help())
       keysWidth = std::max(keysWidth, textWidth(each.keys));
     int line = regions_.list.start;
-    for (auto index = static_cast<std::size_t>(*picture_.helpStart);
-         index < help().size() && line < regions_.list.end; ++index, ++line) {
+    for (auto index = static_cast<std::size_t>(*picture_.helpStart); index < help().size() && line < regions_.list.end;
+         ++index, ++line) {
       grid_.write(kRowGutter, line, help()[index].keys, Role::Key, width());
       writeCut(kRowGutter + keysWidth + 2, line, help()[index].meaning, Role::Plain, width());
     }

@@ -47,8 +47,7 @@ void TableBrowser::setFilter(std::string filter) {
 }
 
 void TableBrowser::rebuild() {
-  const std::optional<Entry> top =
-      top_.entry < entries_.size() ? std::optional(entries_[top_.entry]) : std::nullopt;
+  const std::optional<Entry> top = top_.entry < entries_.size() ? std::optional(entries_[top_.entry]) : std::nullopt;
   entries_.clear();
   for (std::size_t section = 0; section < content_.sectionCount(); ++section) {
     const std::size_t start = entries_.size();
@@ -148,8 +147,7 @@ void TableBrowser::keepSelectionInView() {
   if (selected == entries_.size()) return;
   const Position end = moved(top_, size_.lines);
   if (moved({selected, height(selected)}, 0) <= top_) {
-    const std::optional<std::size_t> first =
-        entries_[top_.entry].isRow ? top_.entry : nextRow(top_.entry, +1);
+    const std::optional<std::size_t> first = entries_[top_.entry].isRow ? top_.entry : nextRow(top_.entry, +1);
     if (first && Position{*first, 0} < end) select(*first);
   } else if (Position{selected, 0} >= end) {
     const std::optional<std::size_t> last = nextRow(end.line > 0 ? end.entry + 1 : end.entry, -1);

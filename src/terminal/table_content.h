@@ -25,9 +25,7 @@ class TableContent {
 
   [[nodiscard]] std::size_t sectionCount() const { return sections_.size(); }
   [[nodiscard]] std::size_t rowCount(std::size_t section) const { return sections_[section].rows.size(); }
-  [[nodiscard]] const std::optional<Text>& header(std::size_t section) const {
-    return sections_[section].header;
-  }
+  [[nodiscard]] const std::optional<Text>& header(std::size_t section) const { return sections_[section].header; }
   /// The row must be within the counts.
   const RowContent& row(IndexPath at);
   /// The row's height in lines in a list `columns` wide.

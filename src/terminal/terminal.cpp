@@ -10,22 +10,21 @@
 
 namespace vesk {
 
-std::unique_ptr<Terminal> Terminal::open(NavigationController& stack, const Clock& clock,
-                                         Surroundings surroundings, std::string& reason) {
+std::unique_ptr<Terminal> Terminal::open(NavigationController& stack, const Clock& clock, Surroundings surroundings,
+                                         std::string& reason) {
   std::optional<FileDescriptor> terminal = TerminalDevice::openControllingTerminal();
   if (!terminal) {
     reason = "there is no terminal to show screens on";
     return nullptr;
   }
-  std::optional<Capabilities> capabilities =
-      readCapabilities(terminal->get(), setUpCharacterLocale(), reason);
+  std::optional<Capabilities> capabilities = readCapabilities(terminal->get(), setUpCharacterLocale(), reason);
   if (!capabilities) return nullptr;
   return std::make_unique<Terminal>(stack, clock, std::move(surroundings), std::move(*terminal),
                                     std::move(*capabilities));
 }
 
-Terminal::Terminal(NavigationController& stack, const Clock& clock, Surroundings surroundings,
-                   FileDescriptor terminal, Capabilities capabilities)
+Terminal::Terminal(NavigationController& stack, const Clock& clock, Surroundings surroundings, FileDescriptor terminal,
+                   Capabilities capabilities)
     : stack_(stack),
       clock_(clock),
       surroundings_(std::move(surroundings)),

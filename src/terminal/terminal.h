@@ -34,8 +34,8 @@ class Terminal {
   [[nodiscard]] static std::unique_ptr<Terminal> open(NavigationController& stack, const Clock& clock,
                                                       Surroundings surroundings, std::string& reason);
   /// The same on a terminal that is open already.
-  Terminal(NavigationController& stack, const Clock& clock, Surroundings surroundings,
-           FileDescriptor terminal, Capabilities capabilities);
+  Terminal(NavigationController& stack, const Clock& clock, Surroundings surroundings, FileDescriptor terminal,
+           Capabilities capabilities);
   /// Gives the terminal back.
   ~Terminal();
   Terminal(const Terminal&) = delete;

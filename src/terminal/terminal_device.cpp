@@ -88,8 +88,7 @@ TerminalDevice::Arrived TerminalDevice::receive() {
   [[maybe_unused]] const ssize_t ticks = read(timer_.get(), &expirations, sizeof expirations);
   signalled_.clear();
   const auto [isResized, isStopWanted, isContinued] = terminal_signals::take();
-  Arrived arrived{
-      .bytes = {}, .isResized = isResized, .isStopWanted = isStopWanted, .isContinued = isContinued};
+  Arrived arrived{.bytes = {}, .isResized = isResized, .isStopWanted = isStopWanted, .isContinued = isContinued};
 
   // One read a call: a flood of input leaves time for everything else.
   std::array<char, 4096> buffer;
@@ -118,8 +117,7 @@ void TerminalDevice::wakeAfter(std::optional<Clock::Duration> delay) {
 
 Size TerminalDevice::size() const {
   winsize window{};
-  const bool isKnown =
-      ioctl(terminal_.get(), TIOCGWINSZ, &window) == 0 && window.ws_col > 0 && window.ws_row > 0;
+  const bool isKnown = ioctl(terminal_.get(), TIOCGWINSZ, &window) == 0 && window.ws_col > 0 && window.ws_row > 0;
   if (!isKnown) return {80, 24};
   return {window.ws_col, window.ws_row};
 }

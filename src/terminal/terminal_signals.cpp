@@ -31,8 +31,7 @@ std::atomic<bool> isContinued = false;
 
 void giveTerminalBack() {
   if (!restoration.isArmed.exchange(false)) return;
-  [[maybe_unused]] const ssize_t written =
-      write(restoration.descriptor, restoration.bytes.data(), restoration.size);
+  [[maybe_unused]] const ssize_t written = write(restoration.descriptor, restoration.bytes.data(), restoration.size);
   tcsetattr(restoration.descriptor, TCSANOW, &restoration.modes);
 }
 
@@ -57,12 +56,10 @@ struct Watched {
 };
 
 std::array watchedSignals{
-    Watched{SIGWINCH, noteSignal, false}, Watched{SIGTSTP, noteSignal, false},
-    Watched{SIGCONT, noteSignal, false},  Watched{SIGINT, endProgram, true},
-    Watched{SIGTERM, endProgram, true},   Watched{SIGHUP, endProgram, true},
-    Watched{SIGQUIT, endProgram, true},   Watched{SIGSEGV, endProgram, false},
-    Watched{SIGBUS, endProgram, false},   Watched{SIGILL, endProgram, false},
-    Watched{SIGFPE, endProgram, false},   Watched{SIGABRT, endProgram, false},
+    Watched{SIGWINCH, noteSignal, false}, Watched{SIGTSTP, noteSignal, false}, Watched{SIGCONT, noteSignal, false},
+    Watched{SIGINT, endProgram, true},    Watched{SIGTERM, endProgram, true},  Watched{SIGHUP, endProgram, true},
+    Watched{SIGQUIT, endProgram, true},   Watched{SIGSEGV, endProgram, false}, Watched{SIGBUS, endProgram, false},
+    Watched{SIGILL, endProgram, false},   Watched{SIGFPE, endProgram, false},  Watched{SIGABRT, endProgram, false},
 };
 
 /// Gives the terminal back and lets the signal do what it would have done.
@@ -93,8 +90,7 @@ void install(const WakeUp& wakeUp) {
   static_cast<void>(isRegistered);
   for (Watched& watched : watchedSignals) {
     sigaction(watched.signal, nullptr, &watched.before);
-    const bool isDefault =
-        (watched.before.sa_flags & SA_SIGINFO) == 0 && watched.before.sa_handler == SIG_DFL;
+    const bool isDefault = (watched.before.sa_flags & SA_SIGINFO) == 0 && watched.before.sa_handler == SIG_DFL;
     const bool isIgnoredStop = watched.signal == SIGTSTP && watched.before.sa_handler == SIG_IGN;
     if ((watched.isLeftToTheProgram && !isDefault) || isIgnoredStop) continue;
     const struct sigaction action = actionOf(watched.handler);

@@ -43,8 +43,7 @@ class ApplicationDelegate : public Responder {
 class Application {
  public:
   /// Both must outlive the application.
-  Application(const InterfaceLayout& layout, ApplicationDelegate& delegate)
-      : layout_(layout), delegate_(delegate) {}
+  Application(const InterfaceLayout& layout, ApplicationDelegate& delegate) : layout_(layout), delegate_(delegate) {}
 
   /// Launches, then runs `mainLoop`, which is handed the root stack and returns when the program shall end.
   /// The exit status: 0, or 1 when the delegate refused the launch.

@@ -21,8 +21,7 @@ std::shared_ptr<NavigationController> InterfaceLayout::makeRootStack() const {
 }
 
 std::shared_ptr<ViewController> InterfaceLayout::makeScreen(std::string_view name) const {
-  const auto* declared =
-      findRow(tables_.screens, [&](const ScreenDeclaration& each) { return each.name == name; });
+  const auto* declared = findRow(tables_.screens, [&](const ScreenDeclaration& each) { return each.name == name; });
   if (declared == nullptr) return nullptr;
   std::shared_ptr<ViewController> screen = declared->make();
   screen->wasMade(*this, declared->name);
@@ -30,11 +29,9 @@ std::shared_ptr<ViewController> InterfaceLayout::makeScreen(std::string_view nam
   return screen;
 }
 
-const TransitionDeclaration* InterfaceLayout::transition(std::string_view from,
-                                                         std::string_view identifier) const {
-  return findRow(tables_.transitions, [&](const TransitionDeclaration& each) {
-    return each.from == from && each.identifier == identifier;
-  });
+const TransitionDeclaration* InterfaceLayout::transition(std::string_view from, std::string_view identifier) const {
+  return findRow(tables_.transitions,
+                 [&](const TransitionDeclaration& each) { return each.from == from && each.identifier == identifier; });
 }
 
 const TransitionDeclaration* InterfaceLayout::firstTransition(std::string_view from) const {

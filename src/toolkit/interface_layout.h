@@ -67,8 +67,7 @@ class InterfaceLayout {
 
   [[nodiscard]] std::span<const CellDeclaration> cells() const { return tables_.cells; }
   /// The transition of that name from a screen, or the first one declared; null where there is none.
-  [[nodiscard]] const TransitionDeclaration* transition(std::string_view from,
-                                                        std::string_view identifier) const;
+  [[nodiscard]] const TransitionDeclaration* transition(std::string_view from, std::string_view identifier) const;
   [[nodiscard]] const TransitionDeclaration* firstTransition(std::string_view from) const;
 
  private:

@@ -66,9 +66,8 @@ void TableView::recycle(std::unique_ptr<TableViewCell> cell) {
 }
 
 CellDeclaration TableView::declarationOf(std::string_view identifier) const {
-  const auto declared =
-      std::find_if(declarations_.begin(), declarations_.end(),
-                   [&](const CellDeclaration& each) { return each.identifier == identifier; });
+  const auto declared = std::find_if(declarations_.begin(), declarations_.end(),
+                                     [&](const CellDeclaration& each) { return each.identifier == identifier; });
   return declared != declarations_.end() ? *declared : CellDeclaration{.identifier = identifier};
 }
 

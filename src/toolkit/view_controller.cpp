@@ -23,8 +23,7 @@ bool ViewController::performTransition(std::string_view identifier, Responder* s
   const std::shared_ptr<ViewController> destination = layout_->makeScreen(declared->to);
   if (destination == nullptr) return false;
   prepareForTransition({declared->identifier, *this, *destination}, sender);
-  if (const auto* cell = dynamic_cast<const TableViewCell*>(sender);
-      cell != nullptr && !destination->title()) {
+  if (const auto* cell = dynamic_cast<const TableViewCell*>(sender); cell != nullptr && !destination->title()) {
     destination->setTitle(cell->mainText());
   }
   navigationController_->push(destination);

@@ -9,8 +9,15 @@
 #include "platform/text_form.h"
 #include "support/input.h"
 
-namespace vesk::corvik {
+namespace corvik {
 namespace {
+
+using vesk::appendDecimal;
+using vesk::appendHex;
+using vesk::FileDescriptor;
+using vesk::fileWith;
+using vesk::Pipe;
+using vesk::writeAll;
 
 /// What next() yields, in one line: "12.5 3952132 0895", the message, or "end".
 std::string textOf(const RecordingReader::Step& step) {
@@ -26,8 +33,7 @@ std::string textOf(const RecordingReader::Step& step) {
   return "end";
 }
 
-std::vector<std::string> readAll(std::string_view content,
-                                 std::size_t longestLine = LineReader::kLongestLine) {
+std::vector<std::string> readAll(std::string_view content, std::size_t longestLine = LineReader::kLongestLine) {
   RecordingReader reader(fileWith(content), "r", longestLine);
   std::vector<std::string> steps;
   do {
@@ -113,8 +119,8 @@ TEST(RecordingReader, PassesOverALineBeyondTheLongest) {
   const std::string read = "1.0 2 " + std::string(800, 'a');
   const std::string tooLong(5000, 'x');
   EXPECT_EQ(readAll(tooLong + '\n' + event + '\n' + event + ' ' + '\n' + tooLong, event.size()),
-            (std::vector<std::string>{"r:1: longer than a line may be", read,
-                                      "r:3: longer than a line may be", "r:4: longer than a line may be"}));
+            (std::vector<std::string>{"r:1: longer than a line may be", read, "r:3: longer than a line may be",
+                                      "r:4: longer than a line may be"}));
 }
 
 TEST(RecordingReader, GrowsForALongLineAndKeepsWhatWasReadBehindIt) {
@@ -126,8 +132,7 @@ TEST(RecordingReader, GrowsForALongLineAndKeepsWhatWasReadBehindIt) {
 TEST(RecordingReader, HandsOnACompleteLineWhileTheNextIsStillBeingWritten) {
   Pipe pipe;
   RecordingReader reader(std::move(pipe.reading), "pipe");
-  std::vector<std::string_view> written = {"1}\n", R"({"at": 2, "metric": 3, "payload": )",
-                                           "\"\"}\n{\"at\": 3"};
+  std::vector<std::string_view> written = {"1}\n", R"({"at": 2, "metric": 3, "payload": )", "\"\"}\n{\"at\": 3"};
   reader.setBeforeRead([&](int) {
     if (written.empty()) {
       pipe.writing = FileDescriptor();
@@ -140,8 +145,7 @@ TEST(RecordingReader, HandsOnACompleteLineWhileTheNextIsStillBeingWritten) {
   EXPECT_EQ(textOf(reader.next()), "pipe:1: no JSON object");
   EXPECT_EQ(written.size(), 2U);
   EXPECT_EQ(textOf(reader.next()), "2.0 3 ");
-  EXPECT_EQ(textOf(reader.next()),
-            "pipe:3: does not end with the object's closing brace: is the line cut off?");
+  EXPECT_EQ(textOf(reader.next()), "pipe:3: does not end with the object's closing brace: is the line cut off?");
   EXPECT_EQ(textOf(reader.next()), "end");
 }
 
@@ -185,9 +189,9 @@ TEST(RecordedEvent, IsWrittenAsItIsRead) {
   appendRecordedEvent(lines, {1e300, -7, {}});
   appendRecordedEvent(lines, {0, 0, {}});
   appendRecordedEvent(lines, {0.1, std::numeric_limits<std::int64_t>::max(), {}});
-  EXPECT_EQ(readAll(lines), (std::vector<std::string>{"12.5 3952132 0895", "1.0e+300 -7 ", "0.0 0 ",
-                                                      "0.1 9223372036854775807 "}));
+  EXPECT_EQ(readAll(lines),
+            (std::vector<std::string>{"12.5 3952132 0895", "1.0e+300 -7 ", "0.0 0 ", "0.1 9223372036854775807 "}));
 }
 
 }  // namespace
-}  // namespace vesk::corvik
+}  // namespace corvik

@@ -24,18 +24,14 @@ TEST(OutputLines, SeparatesItemsByOneBlankAndLetsNothingActOnATerminal) {
   OutputLines::print({"Metric ID in Hex = ", "3C4E04"});
   OutputLines::print({});
   OutputLines::print({"a\x1b[2J\n\x7f", "\xC2\x9B\xC2\xA0\xE2\x82\xAC\xFF"});
-  EXPECT_EQ(output.lines(),
-            (std::vector<std::string>{"Metric ID in Hex =  3C4E04", "",
-                                      "a\\x1B[2J\\x0A\\x7F \\x9B\xC2\xA0\xE2\x82\xAC\xEF\xBF\xBD"}));
+  EXPECT_EQ(output.lines(), (std::vector<std::string>{"Metric ID in Hex =  3C4E04", "",
+                                                      "a\\x1B[2J\\x0A\\x7F \\x9B\xC2\xA0\xE2\x82\xAC\xEF\xBF\xBD"}));
 }
 
 TEST(AppendVisible, FindsAControlCharacterAtEveryPlace) {
   for (std::size_t place = 0; place < 20; ++place) {
-    for (const auto& [character, shown] : {std::pair{'\x1F', "\\x1F"},
-                                           {'\x7F', "\\x7F"},
-                                           {'\0', "\\x00"},
-                                           {'\xFF', "\xEF\xBF\xBD"},
-                                           {'~', "~"}}) {
+    for (const auto& [character, shown] :
+         {std::pair{'\x1F', "\\x1F"}, {'\x7F', "\\x7F"}, {'\0', "\\x00"}, {'\xFF', "\xEF\xBF\xBD"}, {'~', "~"}}) {
       std::string text(20, 'a');
       std::string expected = text;
       text[place] = character;

@@ -16,8 +16,7 @@ TEST(Task, FreesWhatItHoldsOnceWhereverThatLies) {
   const auto held = std::make_shared<int>(0);
   const std::array<std::byte, 2 * Task::kRoom> large{};
   for (const bool isLarge : {false, true}) {
-    Task task = isLarge ? Task([held, large] { *held += static_cast<int>(large.size()); })
-                        : Task([held] { ++*held; });
+    Task task = isLarge ? Task([held, large] { *held += static_cast<int>(large.size()); }) : Task([held] { ++*held; });
     Task moved(std::move(task));
     task = std::move(moved);
     task();

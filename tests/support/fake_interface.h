@@ -12,8 +12,7 @@ class FakeAreas : public FakeTableScreen {
  public:
   FakeAreas() {
     identifier = "LaunchView";
-    content = {
-        {std::nullopt, {{"Device Info"_text, {}}, {"LTE"_text, {}}, {"UMTS"_text, {}}, {"GSM"_text, {}}}}};
+    content = {{std::nullopt, {{"Device Info"_text, {}}, {"LTE"_text, {}}, {"UMTS"_text, {}}, {"GSM"_text, {}}}}};
   }
 };
 
@@ -22,9 +21,8 @@ class FakeCategories : public FakeTableScreen {
   FakeCategories() {
     identifier = "FirstClickView";
     content = {{std::nullopt, {}}};
-    for (const char* name :
-         {"NAS", "RRC State", "Serving Cell Info", "Serving Cell Meas", "Tx Power", "Sel Resel Parameters",
-          "EUTRA Neighbor Info", "C-DRX", "LTE Neighbor Cell Meas"}) {
+    for (const char* name : {"NAS", "RRC State", "Serving Cell Info", "Serving Cell Meas", "Tx Power",
+                             "Sel Resel Parameters", "EUTRA Neighbor Info", "C-DRX", "LTE Neighbor Cell Meas"}) {
       content[0].rows.push_back({Text::copy(name), {}});
     }
   }

@@ -30,9 +30,7 @@ class FakeTableScreen : public TableViewController {
   int loads = 0;
   int departures = 0;
 
-  static Row row(std::string_view main, std::string_view detail) {
-    return {Text::copy(main), Text::copy(detail)};
-  }
+  static Row row(std::string_view main, std::string_view detail) { return {Text::copy(main), Text::copy(detail)}; }
 
   void viewDidLoad() override {
     TableViewController::viewDidLoad();

@@ -40,8 +40,7 @@ class PseudoTerminal {
     return FileDescriptor(open(ptsname(user_.get()), O_RDWR | O_NOCTTY | O_NONBLOCK | O_CLOEXEC));
   }
   void resize(Size size) const {
-    const winsize window{static_cast<unsigned short>(size.lines), static_cast<unsigned short>(size.columns),
-                         0, 0};
+    const winsize window{static_cast<unsigned short>(size.lines), static_cast<unsigned short>(size.columns), 0, 0};
     ioctl(user_.get(), TIOCSWINSZ, &window);
   }
   [[nodiscard]] termios modes() const {

@@ -43,14 +43,12 @@ struct Case {
 const Case kCases[] = {
     {"a?", {character('a'), character('?')}},
     {"\xC3\xA9\xE6\xBC\xA2\xF0\x9F\x93\xB6", {character(U'é'), character(U'漢'), character(U'📶')}},
-    {"\r\n\t\x7F\b",
-     {key(Key::Enter), key(Key::Enter), key(Key::Tab), key(Key::Backspace), key(Key::Backspace)}},
+    {"\r\n\t\x7F\b", {key(Key::Enter), key(Key::Enter), key(Key::Tab), key(Key::Backspace), key(Key::Backspace)}},
     {"\x01\x1A", {character('a', kControl), character('z', kControl)}},
     {"\x1b[A\x1b[B\x1b[C\x1b[D", {key(Key::Up), key(Key::Down), key(Key::Right), key(Key::Left)}},
     {"\x1bOA\x1bOF\x1bOM", {key(Key::Up), key(Key::End), key(Key::Enter)}},
     {"\x1b[H\x1b[1~\x1b[7~\x1b[4~", {key(Key::Home), key(Key::Home), key(Key::Home), key(Key::End)}},
-    {"\x1b[5~\x1b[6~\x1b[2~\x1b[3~",
-     {key(Key::PageUp), key(Key::PageDown), key(Key::Insert), key(Key::Delete)}},
+    {"\x1b[5~\x1b[6~\x1b[2~\x1b[3~", {key(Key::PageUp), key(Key::PageDown), key(Key::Insert), key(Key::Delete)}},
     {"\x1b[1;2A\x1b[1;3B\x1b[5;5~", {key(Key::Up, kShift), key(Key::Down, kAlt), key(Key::PageUp, kControl)}},
     {"\x1bO5C\x1bO1;5D\x1b[Z", {key(Key::Right, kControl), key(Key::Left, kControl), key(Key::Tab, kShift)}},
     {"\x1b"
@@ -93,8 +91,7 @@ TEST(InputMachine, ReadsSequencesWholeHoweverTheyAreCut) {
 TEST(InputMachine, SwallowsASequenceOfAnyLength) {
   InputMachine machine;
   std::vector<InputEvent> events;
-  machine.feed("\x1b[" + std::string(100000, '1') + "A" + "\x1b]" + std::string(100000, 's') + "\ax", {},
-               events);
+  machine.feed("\x1b[" + std::string(100000, '1') + "A" + "\x1b]" + std::string(100000, 's') + "\ax", {}, events);
   EXPECT_EQ(events, std::vector<InputEvent>{character('x')});
 }
 

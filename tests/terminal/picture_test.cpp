@@ -71,8 +71,7 @@ TEST(Picture, KeepsNamesAndValuesTogetherOnAVeryWideTerminal) {
 TEST(Picture, WrapsALongValueBelowItsNameAndCutsItAtAFixedHeight) {
   FakeInterface interface;
   FakeTableScreen& fields = interface.showFields(
-      kTxPower,
-      {{std::nullopt, {row("payload", "0x0102030405060708090a0b0c0d0e0f101112131415161718"), row("b", "")}}});
+      kTxPower, {{std::nullopt, {row("payload", "0x0102030405060708090a0b0c0d0e0f101112131415161718"), row("b", "")}}});
   Desk desk(interface.stack());
   EXPECT_EQ(desk.line(2), "  payload");
   EXPECT_EQ(desk.line(3), "    0x0102030405060708090a0b0c0d0e0f10");

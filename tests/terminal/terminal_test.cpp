@@ -33,8 +33,8 @@ class TerminalTest : public testing::Test {
   }
 
   void open() {
-    terminal_ = std::make_unique<Terminal>(interface_.stack(), clock_, surroundings_, tty_.openForProgram(),
-                                           readable());
+    terminal_ =
+        std::make_unique<Terminal>(interface_.stack(), clock_, surroundings_, tty_.openForProgram(), readable());
   }
   void serveWhenReadable() {
     ASSERT_TRUE(waitUntilReadable(terminal_->descriptor()));
@@ -105,8 +105,7 @@ TEST_F(TerminalTest, TakesALoneEscapeWhenItsTimeHasCome) {
 }
 
 TEST_F(TerminalTest, ShowsAReloadAtMostOnceAFrame) {
-  FakeTableScreen& fields =
-      interface_.showFields(0, {{std::nullopt, {FakeTableScreen::row("power", "one")}}});
+  FakeTableScreen& fields = interface_.showFields(0, {{std::nullopt, {FakeTableScreen::row("power", "one")}}});
   open();
   tty_.readUpTo("filter");
   const auto change = [&](std::string_view value) {
@@ -142,8 +141,7 @@ TEST_F(TerminalTest, QuitsWhenTheTerminalIsGone) {
 
 TEST_F(TerminalTest, GivesTheTerminalBackHoweverTheProgramEnds) {
   const std::function<void()> ends[] = {
-      [] { std::abort(); },  [] { raise(SIGSEGV); }, [] { raise(SIGTERM); },
-      [] { raise(SIGHUP); }, [] { std::exit(7); },
+      [] { std::abort(); }, [] { raise(SIGSEGV); }, [] { raise(SIGTERM); }, [] { raise(SIGHUP); }, [] { std::exit(7); },
   };
   for (const auto& end : ends) {
     const pid_t child = runElsewhere(end);

@@ -52,9 +52,7 @@ const InterfaceLayout& layout() {
                   {"List", makeScreenOf<ListScreen>, ""},
                   {"Other", makeScreenOf<FakeTableScreen>, "Other"}},
       .cells = {{"LaunchView", CellStyle::Basic, CellAccessory::Disclosure}},
-      .transitions = {{"Launch", "showList", "List"},
-                      {"Launch", "showOther", "Other"},
-                      {"List", "up", "Gone"}},
+      .transitions = {{"Launch", "showList", "List"}, {"Launch", "showOther", "Other"}, {"List", "up", "Gone"}},
   });
   return theLayout;
 }
@@ -171,9 +169,9 @@ TEST(Application, LivesFromLaunchToTermination) {
     application.enterForeground();
   }),
             0);
-  EXPECT_EQ(happenings, (std::vector<std::string>{"launched", "root loaded", "launch loaded", "active",
-                                                  "main loop", "inactive", "background", "foreground",
-                                                  "active", "inactive", "terminated"}));
+  EXPECT_EQ(happenings,
+            (std::vector<std::string>{"launched", "root loaded", "launch loaded", "active", "main loop", "inactive",
+                                      "background", "foreground", "active", "inactive", "terminated"}));
 }
 
 TEST(Application, BuildsNothingWhenTheLaunchIsRefused) {

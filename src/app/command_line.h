@@ -1,0 +1,10 @@
+#pragma once
+
+#include "app/outcome.h"
+
+namespace vesk {
+
+/// Reads the program's arguments and runs the command that they name.
+[[nodiscard]] Outcome runCommandLine(int argc, const char* const* argv);
+
+}  // namespace vesk

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <span>
+#include <string_view>
+
+#include "platform/value.h"
+
+namespace vesk {
+
+/// The dictionary form of the message in `payload`; absent when the payload is no encoding of one.
+using DecodePayload = std::optional<Dictionary> (*)(std::span<const std::uint8_t> payload);
+
+template <class MetricMessage>
+std::optional<Dictionary> decodePayload(std::span<const std::uint8_t> payload) {
+  const auto message = MetricMessage::initWithData(payload);
+  if (message == nullptr) return std::nullopt;
+  return message->dictionaryRepresentation();
+}
+
+/// A kind of metric and the class that decodes it.
+struct MetricClass {
+  /// As an event carries it: 0x3C in the high byte, the registry's identifier in the low 16 bits.
+  std::int64_t metricId;
+  std::string_view name;
+  DecodePayload decode;
+};
+
+/// The class of a metric, or null when no class decodes it.
+[[nodiscard]] const MetricClass* findMetricClass(std::int64_t metricId);
+
+}  // namespace vesk

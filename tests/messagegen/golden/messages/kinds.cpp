@@ -1,0 +1,242 @@
+// Generated from kinds.proto; do not edit.
+#include "messages/kinds.h"
+
+namespace vesk::metrics {
+
+Text nameOf(Mode value) {
+  switch (value) {
+    case Mode::MODE_FIRST:
+      return "MODE_FIRST"_text;
+    case Mode::MODE_BEHIND:
+      return "MODE_BEHIND"_text;
+  }
+  return unknownName(static_cast<std::int32_t>(value));
+}
+
+Text nameOf(Kinds::Nested value) {
+  switch (value) {
+    case Kinds::Nested::NONE:
+      return "NONE"_text;
+  }
+  return unknownName(static_cast<std::int32_t>(value));
+}
+
+bool Part::readFrom(ProtoReader& reader) {
+  return readFields(reader, [&](FieldKey key) {
+    switch (key.number) {
+      case 1:
+        assign(kANameSoLongThatStatementsTakeTwo, aNameSoLongThatStatementsTakeTwo_, reader.readUInt32());
+        return true;
+      default:
+        return readUndeclaredField(key, kClassName, reader);
+    }
+  });
+}
+
+void Part::writeTo(ProtoWriter& writer) const {
+  if (has(kANameSoLongThatStatementsTakeTwo)) writer.writeUInt32(aNameSoLongThatStatementsTakeTwo_, 1);
+}
+
+Dictionary Part::dictionaryRepresentation() const {
+  Dictionary dictionary;
+  dictionary.reserve(presentScalars());
+  if (has(kANameSoLongThatStatementsTakeTwo)) {
+    dictionary.append("a_name_so_long_that_statements_take_two"_text, aNameSoLongThatStatementsTakeTwo_);
+  }
+  return dictionary;
+}
+
+void Part::copyTo(Self& other) const {
+  copyScalar(other, kANameSoLongThatStatementsTakeTwo, &Self::aNameSoLongThatStatementsTakeTwo_);
+}
+
+std::shared_ptr<Part> Part::copyWithZone() const {
+  return std::make_shared<Part>(*this);
+}
+
+void Part::mergeFrom(const Self& other) {
+  other.copyScalar(*this, kANameSoLongThatStatementsTakeTwo, &Self::aNameSoLongThatStatementsTakeTwo_);
+}
+
+bool Part::hasEqualFields(const Self& other) const {
+  if (!isSameScalar(other, kANameSoLongThatStatementsTakeTwo, &Self::aNameSoLongThatStatementsTakeTwo_)) return false;
+  return true;
+}
+
+std::uint64_t Part::hash() const {
+  std::uint64_t result = 0;
+  result ^= scalarHash(kANameSoLongThatStatementsTakeTwo, aNameSoLongThatStatementsTakeTwo_);
+  return result;
+}
+
+bool Kinds::readFrom(ProtoReader& reader) {
+  return readFields(reader, [&](FieldKey key) {
+    switch (key.number) {
+      case 1:
+        assign(kTimestamp, timestamp_, reader.readUInt64());
+        return true;
+      case 2:
+        assign(kQRxlevMin, qRxlevMin_, reader.readUInt32());
+        return true;
+      case 3:
+        assign(kPlain, plain_, reader.readInt32());
+        return true;
+      case 4:
+        assign(kZigZag, zigZag_, reader.readSInt32());
+        return true;
+      case 5:
+        assign(kIsSet, isSet_, reader.readBool());
+        return true;
+      case 6:
+        assign(kNested, nested_, reader.readEnumeration<Nested>());
+        return true;
+      case 7:
+        assign(kMode, mode_, reader.readEnumeration<Mode>());
+        return true;
+      case 9:
+        content_ = reader.readBytes();
+        return true;
+      case 10:
+        return readObject(part_, reader);
+      case 11:
+        return readElement(partLists_, reader);
+      case 12:
+        return readElement(instValues_, reader);
+      case 13:
+        return readRepeated<&ProtoReader::readUInt32>(multiBandInfos_, key.wireType, reader);
+      case 14:
+        return readRepeated<&ProtoReader::readSInt32>(csTxPwrs_, key.wireType, reader);
+      case 15:
+        return readRepeated<&ProtoReader::readInt32>(codes_, key.wireType, reader);
+      case 65535:
+        apn_ = reader.readString();
+        return true;
+      default:
+        return readUndeclaredField(key, kClassName, reader);
+    }
+  });
+}
+
+void Kinds::writeTo(ProtoWriter& writer) const {
+  if (has(kTimestamp)) writer.writeUInt64(timestamp_, 1);
+  if (has(kQRxlevMin)) writer.writeUInt32(qRxlevMin_, 2);
+  if (has(kPlain)) writer.writeInt32(plain_, 3);
+  if (has(kZigZag)) writer.writeSInt32(zigZag_, 4);
+  if (has(kIsSet)) writer.writeBool(isSet_, 5);
+  if (has(kNested)) writer.writeEnumeration(nested_, 6);
+  if (has(kMode)) writer.writeEnumeration(mode_, 7);
+  if (content_) writer.writeBytes(*content_, 9);
+  if (part_) writer.writeMessage(*part_, 10);
+  writeElements(partLists_, 11, writer);
+  writeElements(instValues_, 12, writer);
+  writePacked<&ProtoWriter::writeUInt32>(multiBandInfos_, 13, writer);
+  writePacked<&ProtoWriter::writeSInt32>(csTxPwrs_, 14, writer);
+  writePacked<&ProtoWriter::writeInt32>(codes_, 15, writer);
+  if (apn_) writer.writeString(*apn_, 65535);
+}
+
+Dictionary Kinds::dictionaryRepresentation() const {
+  Dictionary dictionary;
+  dictionary.reserve(presentScalars() + 8);
+  if (has(kTimestamp)) dictionary.append("timestamp"_text, timestamp_);
+  if (has(kQRxlevMin)) dictionary.append("Q_rxlev_min"_text, qRxlevMin_);
+  if (has(kPlain)) dictionary.append("plain"_text, plain_);
+  if (has(kZigZag)) dictionary.append("zig_zag"_text, zigZag_);
+  if (has(kIsSet)) dictionary.append("is_set"_text, isSet_);
+  if (has(kNested)) dictionary.append("nested"_text, nameOf(nested_));
+  if (has(kMode)) dictionary.append("mode"_text, nameOf(mode_));
+  if (content_) dictionary.append("content"_text, *content_);
+  if (part_) dictionary.append("part"_text, part_->dictionaryRepresentation());
+  if (countOf(partLists_) != 0) dictionary.append("part_list"_text, arrayOf(partLists_));
+  if (countOf(instValues_) != 0) dictionary.append("inst_values"_text, arrayOf(instValues_));
+  dictionary.append("multi_band_info"_text, multiBandInfos_.toArray());
+  dictionary.append("cs_tx_pwr"_text, csTxPwrs_.toArray());
+  dictionary.append("code"_text, codes_.toArray());
+  if (apn_) dictionary.append("apn"_text, *apn_);
+  return dictionary;
+}
+
+void Kinds::copyTo(Self& other) const {
+  copyScalar(other, kTimestamp, &Self::timestamp_);
+  copyScalar(other, kQRxlevMin, &Self::qRxlevMin_);
+  copyScalar(other, kPlain, &Self::plain_);
+  copyScalar(other, kZigZag, &Self::zigZag_);
+  copyScalar(other, kIsSet, &Self::isSet_);
+  copyScalar(other, kNested, &Self::nested_);
+  copyScalar(other, kMode, &Self::mode_);
+  if (content_) other.content_ = content_;
+  if (part_) other.part_ = part_;
+  copyElements(partLists_, other.partLists_);
+  copyElements(instValues_, other.instValues_);
+  copyValues(multiBandInfos_, other.multiBandInfos_);
+  copyValues(csTxPwrs_, other.csTxPwrs_);
+  copyValues(codes_, other.codes_);
+  if (apn_) other.apn_ = apn_;
+}
+
+std::shared_ptr<Kinds> Kinds::copyWithZone() const {
+  auto copy = std::make_shared<Kinds>(*this);
+  copy->part_ = deepCopy(part_);
+  copy->partLists_ = deepCopy(partLists_);
+  copy->instValues_ = deepCopy(instValues_);
+  return copy;
+}
+
+void Kinds::mergeFrom(const Self& other) {
+  other.copyScalar(*this, kTimestamp, &Self::timestamp_);
+  other.copyScalar(*this, kQRxlevMin, &Self::qRxlevMin_);
+  other.copyScalar(*this, kPlain, &Self::plain_);
+  other.copyScalar(*this, kZigZag, &Self::zigZag_);
+  other.copyScalar(*this, kIsSet, &Self::isSet_);
+  other.copyScalar(*this, kNested, &Self::nested_);
+  other.copyScalar(*this, kMode, &Self::mode_);
+  if (other.content_) content_ = other.content_;
+  mergeObject(other.part_, part_);
+  mergeElements(other.partLists_, partLists_);
+  mergeElements(other.instValues_, instValues_);
+  multiBandInfos_.append(other.multiBandInfos_);
+  csTxPwrs_.append(other.csTxPwrs_);
+  codes_.append(other.codes_);
+  if (other.apn_) apn_ = other.apn_;
+}
+
+bool Kinds::hasEqualFields(const Self& other) const {
+  if (!isSameScalar(other, kTimestamp, &Self::timestamp_)) return false;
+  if (!isSameScalar(other, kQRxlevMin, &Self::qRxlevMin_)) return false;
+  if (!isSameScalar(other, kPlain, &Self::plain_)) return false;
+  if (!isSameScalar(other, kZigZag, &Self::zigZag_)) return false;
+  if (!isSameScalar(other, kIsSet, &Self::isSet_)) return false;
+  if (!isSameScalar(other, kNested, &Self::nested_)) return false;
+  if (!isSameScalar(other, kMode, &Self::mode_)) return false;
+  if (!(content_ == other.content_)) return false;
+  if (!isSameObject(part_, other.part_)) return false;
+  if (!isSameList(partLists_, other.partLists_)) return false;
+  if (!isSameList(instValues_, other.instValues_)) return false;
+  if (!multiBandInfos_.isEqual(other.multiBandInfos_)) return false;
+  if (!csTxPwrs_.isEqual(other.csTxPwrs_)) return false;
+  if (!codes_.isEqual(other.codes_)) return false;
+  if (!(apn_ == other.apn_)) return false;
+  return true;
+}
+
+std::uint64_t Kinds::hash() const {
+  std::uint64_t result = 0;
+  result ^= scalarHash(kTimestamp, timestamp_);
+  result ^= scalarHash(kQRxlevMin, qRxlevMin_);
+  result ^= scalarHash(kPlain, plain_);
+  result ^= scalarHash(kZigZag, zigZag_);
+  result ^= scalarHash(kIsSet, isSet_);
+  result ^= scalarHash(kNested, nested_);
+  result ^= scalarHash(kMode, mode_);
+  result ^= objectHash(content_);
+  result ^= objectHash(part_);
+  result ^= objectHash(partLists_);
+  result ^= objectHash(instValues_);
+  result ^= multiBandInfos_.hash();
+  result ^= csTxPwrs_.hash();
+  result ^= codes_.hash();
+  result ^= objectHash(apn_);
+  return result;
+}
+
+}  // namespace vesk::metrics

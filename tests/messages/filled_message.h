@@ -1,0 +1,29 @@
+#pragma once
+
+#include <map>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "platform/value.h"
+#include "schema.h"
+#include "support/bytes.h"
+
+namespace vesk {
+
+/// The .proto files themselves, by the names of their messages.
+[[nodiscard]] const std::map<std::string, messagegen::MessageType, std::less<>>& schema();
+
+enum class Filling { small, extreme };
+
+/// A message with every field set, made from the schema without the help of its class.
+struct FilledMessage {
+  Bytes payload;
+  /// Where each field of the payload ends, the last one at the payload's end.
+  std::vector<std::size_t> fieldEnds;
+  Dictionary dictionary;
+};
+
+[[nodiscard]] FilledMessage filledMessage(std::string_view className, Filling filling);
+
+}  // namespace vesk

@@ -1,0 +1,95 @@
+#include <algorithm>
+
+#include "emit.h"
+
+namespace messagegen {
+
+namespace {
+
+/// The smallest unsigned type with a bit for each optional scalar.
+std::string presenceWord(const MessageType& message) {
+  const auto bits = std::count_if(message.fields.begin(), message.fields.end(),
+                                  [](const Field& field) { return field.isOptionalScalar(); });
+  for (const int width : {8, 16, 32}) {
+    if (bits <= width) return "std::uint" + std::to_string(width) + "_t";
+  }
+  return "std::uint64_t";
+}
+
+std::string classHead(const MessageType& message) {
+  const std::string name = "class " + message.name + " final";
+  const std::string base = ": public Message<" + message.name + ", " + presenceWord(message) + "> {";
+  const bool fits = name.size() + 1 + base.size() <= kLineWidth;
+  return name + (fits ? " " : "\n    ") + base;
+}
+
+std::string emitPresenceBits(const MessageType& message) {
+  std::string bits;
+  for (const Field& field : fieldsByNumber(message)) {
+    if (field.isOptionalScalar()) bits += expand("$bit$,", fieldVariables(field));
+  }
+  if (bits.empty()) return "";
+  return expand(R"code(
+/// Which bit of the presence word is whose.
+enum PresenceBit : unsigned {
+  $bits$
+};
+)code",
+                {{"bits", bits}}) +
+         "\n";
+}
+
+}  // namespace
+
+std::string emitComment(const Comment& comment) {
+  std::string out;
+  for (const std::string& line : comment)
+    out += line.empty() ? "///\n" : "/// " + line + "\n";
+  return out;
+}
+
+std::string emitClass(const MessageType& message) {
+  std::string enumerations;
+  for (const Enumeration& enumeration : message.enumerations)
+    enumerations += emitEnumeration(enumeration) + "\n";
+  std::string accessors;
+  std::string members;
+  for (const Field& field : message.fields) {
+    accessors += emitAccessors(field) + "\n";
+    members += expand("$held$ $member$$initial$;", fieldVariables(field));
+  }
+  return emitComment(message.comment) + expand(R"code(
+$head$
+ public:
+  $enumerations$
+  static constexpr std::string_view kClassName = "$class$";
+
+  $accessors$
+  [[nodiscard]] bool readFrom(ProtoReader& reader) override;
+  void writeTo(ProtoWriter& writer) const override;
+  [[nodiscard]] Dictionary dictionaryRepresentation() const override;
+
+  /// Sets in `other` what is present here; objects are shared, not copied.
+  void copyTo(Self& other) const;
+  /// A message that shares nothing with this one.
+  [[nodiscard]] std::shared_ptr<$class$> copyWithZone() const;
+  /// Takes over what is present in `other`: lists grow by its elements, single messages merge.
+  void mergeFrom(const Self& other);
+
+  [[nodiscard]] bool hasEqualFields(const Self& other) const;
+  [[nodiscard]] std::uint64_t hash() const override;
+
+ private:
+  $bits$
+  $members$
+};
+)code",
+                                               {{"class", message.name},
+                                                {"head", classHead(message)},
+                                                {"enumerations", enumerations},
+                                                {"accessors", accessors},
+                                                {"bits", emitPresenceBits(message)},
+                                                {"members", members}});
+}
+
+}  // namespace messagegen
