@@ -14,6 +14,7 @@ namespace vesk {
 /// The last lines that the program wrote for diagnosis, kept for showing. Main queue only.
 class DiagnosticLines {
  public:
+  /// `capacity` is at least 1.
   explicit DiagnosticLines(std::size_t capacity = 1000) : capacity_(capacity) {}
 
   /// Adds one line without its line feed; beyond the capacity the oldest goes.

@@ -51,14 +51,14 @@ void Presenter::followStack() {
     }
     for (const Screen& screen : screens_) {
       if (screen.browser == nullptr) continue;
-      screen.browser->setFrozen(false);
-      screen.browser->setFilter({});
+      if (screen.browser->isFrozen()) screen.browser->setFrozen(false);
+      if (!screen.browser->filter().empty()) screen.browser->setFilter({});
     }
   }
   if (TableBrowser* shown = browser()) {
-    shown->follow();
     const Regions regions = this->regions();
     shown->setViewport({regions.listColumns, std::max(regions.list.count(), 1)});
+    shown->follow();
   }
 }
 

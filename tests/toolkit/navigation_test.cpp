@@ -125,6 +125,24 @@ TEST_F(Navigation, TellsScreensThatTheyLeftAndKeepsTheFirst) {
   EXPECT_EQ(launch_.loads, 1);
 }
 
+TEST_F(Navigation, PassesAMemoryWarningToEveryScreen) {
+  class WarnedScreen : public FakeTableScreen {
+   public:
+    int warnings = 0;
+    void didReceiveMemoryWarning() override {
+      FakeTableScreen::didReceiveMemoryWarning();
+      ++warnings;
+    }
+  };
+  const auto covered = std::make_shared<WarnedScreen>();
+  const auto shown = std::make_shared<WarnedScreen>();
+  stack_->push(covered);
+  stack_->push(shown);
+  stack_->didReceiveMemoryWarning();
+  EXPECT_EQ(covered->warnings, 1);
+  EXPECT_EQ(shown->warnings, 1);
+}
+
 class RecordingDelegate : public ApplicationDelegate {
  public:
   bool launches = true;
