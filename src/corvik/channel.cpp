@@ -16,8 +16,11 @@ constexpr std::size_t kMostWaiting = 1024;
 void Channel::setHandler(const vesk::Text& event, EventHandler handler) {
   const std::lock_guard lock(mutex_);
   Handlers handlers = *handlers_;
-  if (event == kEventMetric) handlers.metric = std::move(handler);
-  if (event == kEventTrigger) handlers.trigger = std::move(handler);
+  if (event == kEventMetric) {
+    handlers.metric = std::move(handler);
+  } else if (event == kEventTrigger) {
+    handlers.trigger = std::move(handler);
+  }
   handlers_ = std::make_shared<const Handlers>(std::move(handlers));
 }
 

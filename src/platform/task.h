@@ -17,6 +17,7 @@ class Task {
   Task() = default;
   template <class Callable>
   requires(!std::is_same_v<std::remove_cvref_t<Callable>, Task> && std::is_invocable_v<Callable&>)
+      // NOLINTNEXTLINE(bugprone-forwarding-reference-overload): the constraint leaves Task itself out
       Task(Callable&& callable) {
     using Held = std::remove_cvref_t<Callable>;
     if constexpr (fits<Held>()) {
@@ -55,6 +56,7 @@ class Task {
 
   template <class Held>
   static constexpr bool fits() {
+    // NOLINTNEXTLINE(misc-redundant-expression): true of some types only
     return sizeof(Held) <= kRoom && alignof(Held) <= alignof(std::max_align_t) &&
            std::is_nothrow_move_constructible_v<Held>;
   }

@@ -97,14 +97,19 @@ TEST(RecordingReader, ReadsOrRefusesALine) {
 
 TEST(RecordingReader, SurvivesEveryCutAndEveryChangedByte) {
   const std::string line = R"({"at": 12.5, "metric": "0x3C4E04", "more": [{"a": null}], "payload": "0895"})";
+  std::string content;
+  std::size_t lines = 0;
   for (std::size_t index = 0; index < line.size(); ++index) {
-    EXPECT_LE(readAll(line.substr(0, index)).size(), 1U);
+    content += line.substr(0, index + 1) + '\n';
+    ++lines;
     for (const char byte : {'\0', '"', '{', '}', '[', ',', '\\', '9', '\x80', '\xFF'}) {
       std::string changed = line;
       changed[index] = byte;
-      EXPECT_EQ(readAll(changed).size(), 1U) << changed;
+      content += changed + '\n';
+      ++lines;
     }
   }
+  EXPECT_EQ(readAll(content).size(), lines);
 }
 
 TEST(RecordingReader, NumbersLinesPassesOverBlankOnesAndGoesOnBehindBadOnes) {
