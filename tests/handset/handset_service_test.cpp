@@ -1,11 +1,12 @@
 #include "handset/handset_service.h"
 
+#include <condition_variable>
 #include <gtest/gtest.h>
+#include <mutex>
 #include <vector>
 
 #include "corvik/client.h"
-#include "platform/main_queue.h"
-#include "platform/run_loop.h"
+#include "handset/driven_events.h"
 #include "support/manual_clock.h"
 
 namespace vesk::handset {
@@ -28,10 +29,10 @@ class HandsetServiceTest : public testing::Test {
     ::corvik::installService(std::make_shared<HandsetService>(1, 0, clock_));
     manager_ = client::CreateManager("test", queue_);
     ::corvik::installService(nullptr);
-    client::RegisterEventHandler(
-        manager_, ::corvik::kEventMetric, [this](const InterProcessDictionary& event, const client::WorkGroup&) {
-          MainQueue::shared().async([this, id = event.integer("kKeyMetricID").value_or(-1)] { take(id); });
-        });
+    client::RegisterEventHandler(manager_, ::corvik::kEventMetric,
+                                 [this](const InterProcessDictionary& event, const client::WorkGroup&) {
+                                   take(event.integer("kKeyMetricID").value_or(-1));
+                                 });
     client::EventsOn(manager_);
   }
 
@@ -54,31 +55,32 @@ class HandsetServiceTest : public testing::Test {
     return perform(kCommandQueryMetric, message);
   }
 
+  /// On the client's queue.
   void take(std::int64_t id) {
+    const std::lock_guard lock(mutex_);
     ids_.push_back(id);
-    if (ids_.size() == stopAfter_) loop_.stop();
+    taken_.notify_all();
   }
-  /// Runs until there are `count` metrics in all.
-  const Ids& first(std::size_t count) {
-    stopAfter_ = count;
-    if (ids_.size() < count) loop_.run();
+  /// The metrics so far, once there are at least `count`.
+  Ids atLeast(std::size_t count) {
+    std::unique_lock lock(mutex_);
+    taken_.wait(lock, [&] { return ids_.size() >= count; });
     return ids_;
   }
 
   ManualClock clock_;
-  SteadyClock steadyClock_;
-  RunLoop loop_{steadyClock_};
-  WorkQueue queue_{"test"};
+  std::mutex mutex_;
+  std::condition_variable taken_;
   Ids ids_;
-  std::size_t stopAfter_ = 0;
+  WorkQueue queue_{"test"};
   std::shared_ptr<client::Manager> manager_;
 };
 
 TEST_F(HandsetServiceTest, TellsNothingButTheAnswerToAQueryBeforeItIsConfigured) {
   EXPECT_EQ(query(0x7F0013), 0);
-  EXPECT_EQ(first(1), Ids{kSimFiles});
+  EXPECT_EQ(atLeast(1), Ids{kSimFiles});
   EXPECT_EQ(configure({1}), 0);
-  EXPECT_EQ(first(2), (Ids{kSimFiles, kFirst}));
+  EXPECT_EQ(atLeast(2)[1], kFirst);
 }
 
 TEST_F(HandsetServiceTest, RefusesWhatItCannotDo) {
@@ -90,35 +92,34 @@ TEST_F(HandsetServiceTest, RefusesWhatItCannotDo) {
 
 TEST_F(HandsetServiceTest, KeepsTheHandsetsTime) {
   configure({1});
-  // The events of the first instant, then nothing for the rest of the first step.
-  EXPECT_LE(clock_.waitForSleeper(), 100ms);
-  first(1);
-  EXPECT_LT(ids_.size(), 20U);
-  for (int step = 0; step < 100; ++step)
+  EXPECT_EQ(atLeast(1), Ids{kFirst});
+  const Clock::Instant start = clock_.now();
+  for (int event = 0; event < 200; ++event)
     clock_.advance(clock_.waitForSleeper());
-  first(50);
+  atLeast(190);
+  const std::vector<HandsetEvent> events = drivenEvents(1, 60);
+  EXPECT_EQ(clock_.now() - start, std::chrono::milliseconds(events[200].atMs));
 }
 
 TEST_F(HandsetServiceTest, StandsStillWhileNobodyWantsMetrics) {
   configure({1});
   clock_.advance(clock_.waitForSleeper());
-  first(2);
+  atLeast(2);
   EXPECT_EQ(perform(kCommandClearConfiguration, {}), 0);
   clock_.advance(1h);
   configure({1});
   // The hour is not made up for.
   clock_.advance(clock_.waitForSleeper());
-  EXPECT_LT(first(3).size(), 20U);
+  EXPECT_LT(atLeast(3).size(), 20U);
 }
 
 TEST_F(HandsetServiceTest, TellsNothingWhileEventsAreOffAndEndsAtOnce) {
   client::EventsOff(manager_);
   configure({1});
   EXPECT_EQ(query(0x7F0013), 0);
-  loop_.runDue();
-  EXPECT_EQ(ids_, Ids{});
+  EXPECT_EQ(atLeast(0), Ids{});
   client::EventsOn(manager_);
-  EXPECT_EQ(first(1).front(), kSimFiles);
+  EXPECT_EQ(atLeast(1).front(), kSimFiles);
   // Waiting for a time that never comes, it is interrupted.
   manager_.reset();
 }

@@ -167,7 +167,7 @@ TEST(ReportedValuesTest, QuantitiesThatBelongTogetherAgree) {
   std::int64_t scramblingCode = -1;
   std::int64_t arfcn = -1;
   std::size_t checked = 0;
-  for (const HandsetEvent& event : drivenEvents(5, 3600)) {
+  for (const HandsetEvent& event : drivenEvents(5, 1200)) {
     const auto fields = fieldsOf(event);
     if (!fields) continue;
     expectBandsToFit(*fields);
@@ -221,7 +221,7 @@ TEST(ReportedValuesTest, QuantitiesThatBelongTogetherAgree) {
         break;
     }
   }
-  EXPECT_GT(checked, 1000U);
+  EXPECT_GT(checked, 500U);
 }
 
 }  // namespace
