@@ -1,6 +1,6 @@
 # How a preset is built and tested. Sourced.
 
-source "$(dirname -- "${BASH_SOURCE[0]}")/packages.sh"
+source "${BASH_SOURCE[0]%/*}/packages.sh"
 
 # is_configured PRESET TESTS: whether the build directory was made in this very place, from the presets as they stand,
 # with the tests or (TESTS is OFF) at least without them.
@@ -32,7 +32,7 @@ ninja_in() {
 build() {
   local preset=$1 tests=$2 purposes=(build) lock
   shift 2
-  mkdir -p "$root/build"
+  [[ -d $root/build ]] || mkdir -p "$root/build"
   exec {lock}>"$root/build/$preset.lock"
   if ! flock --nonblock "$lock"; then
     say "waiting for another build of preset $preset"
@@ -51,7 +51,7 @@ run_tests() {
   local preset=$1 log status=0 line
   build "$preset" ON
   log=$root/build/$preset/tests.log
-  (cd "$root" && ctest --preset "$preset" --parallel "$(nproc)" --no-tests=error) >"$log" 2>&1 </dev/null || status=$?
+  (cd "$root" && GTEST_BRIEF=1 ctest --preset "$preset" --parallel "$(nproc)" --no-tests=error) >"$log" 2>&1 </dev/null || status=$?
   ((status == 0)) || grep -vE '^ *Start +[0-9]+:|^ *[0-9]+/[0-9]+ Test .* Passed ' "$log" >&2 || true
   line=$(grep -E 'tests passed' "$log") || line='no test was run'
   printf '%s\n' "$line"

@@ -1,7 +1,7 @@
 # What every script of the project shares. Sourced, after set -euo pipefail.
 
-# The checkout, whatever directory the caller stands in.
-root=$(cd -- "$(dirname -- "${BASH_SOURCE[0]}")/.." && pwd -P)
+# The checkout, whatever directory the caller stands in; the script that is started knows it.
+root=${root:?}
 
 say() {
   printf '%s: %s\n' "${0##*/}" "$*" >&2

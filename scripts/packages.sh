@@ -1,6 +1,6 @@
 # The Debian packages of each purpose, and the one place that installs them. Sourced.
 
-source "$(dirname -- "${BASH_SOURCE[0]}")/common.sh"
+source "${BASH_SOURCE[0]%/*}/common.sh"
 
 # Purpose, package, and what is there once it is installed: a command or a file. A look at those takes no time, where
 # asking dpkg would be felt at every start of the program.

@@ -5,10 +5,10 @@
 #include <unistd.h>
 #include <variant>
 
+#include "app/data_output.h"
 #include "app/json_form.h"
 #include "corvik/recording_reader.h"
 #include "messages/registry/metric_classes.h"
-#include "platform/output_lines.h"
 #include "platform/text_form.h"
 
 namespace vesk {
@@ -54,8 +54,7 @@ void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
 /// What a command does with the steps of a recording; each answers whether to go on.
 class Decoding {
  public:
-  explicit Decoding(const std::string& path) : reader_(path), output_(STDOUT_FILENO, "standard output") {
-    output_.setFailureHandler([this](const std::string& reason) { fail("vesk: " + reason); });
+  explicit Decoding(const std::string& path) : reader_(path) {
     reader_.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();
@@ -65,14 +64,13 @@ class Decoding {
   Outcome run() {
     while (!output_.hasFailed() && std::visit(*this, reader_.next())) {
     }
-    output_.flush();
-    return outcome_;
+    return output_.finish(outcome_);
   }
 
   bool operator()(const corvik::RecordedEvent& event) {
     line_.clear();
     appendDecodedEvent(line_, event);
-    output_.write(line_);
+    output_.writeLine(line_);
     return true;
   }
 
@@ -95,7 +93,7 @@ class Decoding {
   }
 
   corvik::RecordingReader reader_;
-  DescriptorSink output_;
+  DataOutput output_;
   std::string line_;
   Outcome outcome_ = Outcome::done;
 };

@@ -1,6 +1,7 @@
 #include "app/json_form.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 
 #include "platform/text_form.h"
@@ -12,9 +13,20 @@ namespace {
 
 constexpr std::string_view kHexDigits = "0123456789abcdef";
 
-bool isPlain(char c) {
-  const auto byte = static_cast<unsigned char>(c);
-  return byte >= 0x20 && byte < 0x7F && c != '"' && c != '\\';
+/// Which bytes stand in JSON text as they are: printable ASCII without the quote and the backslash. A table, for every
+/// byte of every key and name is asked.
+constexpr std::array<bool, 256> kIsPlain = [] {
+  std::array<bool, 256> table{};
+  for (std::size_t byte = 0x20; byte < 0x7F; ++byte)
+    table[byte] = byte != '"' && byte != '\\';
+  return table;
+}();
+
+std::size_t plainPrefix(std::string_view text) {
+  std::size_t size = 0;
+  while (size < text.size() && kIsPlain[static_cast<unsigned char>(text[size])])
+    ++size;
+  return size;
 }
 
 void appendCodeUnit(std::string& out, unsigned unit) {
@@ -75,7 +87,7 @@ struct JsonForm {
 void appendJson(std::string& out, std::string_view text) {
   out += '"';
   while (!text.empty()) {
-    const auto plain = static_cast<std::size_t>(std::find_if_not(text.begin(), text.end(), isPlain) - text.begin());
+    const std::size_t plain = plainPrefix(text);
     out += text.substr(0, plain);
     text.remove_prefix(plain);
     if (text.empty()) break;

@@ -5,7 +5,7 @@
 #include <cstdint>
 #include <string_view>
 
-namespace vesk::corvik {
+namespace corvik {
 
 namespace detail {
 
@@ -43,4 +43,4 @@ inline constexpr std::array<std::uint8_t, 256> kHexDigits = makeHexDigits();
   return seen < 16;
 }
 
-}  // namespace vesk::corvik
+}  // namespace corvik

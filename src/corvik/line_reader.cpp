@@ -6,7 +6,7 @@
 #include <poll.h>
 #include <unistd.h>
 
-namespace vesk::corvik {
+namespace corvik {
 
 namespace {
 
@@ -26,7 +26,7 @@ ssize_t readSome(int descriptor, char* place, std::size_t room) {
 
 }  // namespace
 
-LineReader::LineReader(FileDescriptor descriptor, std::size_t padding, std::size_t longestLine)
+LineReader::LineReader(vesk::FileDescriptor descriptor, std::size_t padding, std::size_t longestLine)
     : descriptor_(std::move(descriptor)),
       padding_(padding),
       longestLine_(longestLine),
@@ -102,4 +102,4 @@ bool LineReader::rewind() {
   return true;
 }
 
-}  // namespace vesk::corvik
+}  // namespace corvik

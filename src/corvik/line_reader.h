@@ -7,7 +7,7 @@
 
 #include "platform/file_descriptor.h"
 
-namespace vesk::corvik {
+namespace corvik {
 
 /// Splits what a file descriptor yields into lines, each handed on as soon as its line feed has arrived. One
 /// buffer holds what was read; it grows only for a line that does not fit.
@@ -20,7 +20,7 @@ class LineReader {
   static constexpr std::size_t kLongestLine = std::size_t{256} << 20;
 
   /// `padding` bytes behind every line may be read, whatever they hold.
-  LineReader(FileDescriptor descriptor, std::size_t padding, std::size_t longestLine = kLongestLine);
+  LineReader(vesk::FileDescriptor descriptor, std::size_t padding, std::size_t longestLine = kLongestLine);
 
   void setBeforeRead(BeforeRead beforeRead) { beforeRead_ = std::move(beforeRead); }
 
@@ -43,7 +43,7 @@ class LineReader {
   void makeRoom();
   Found take(std::size_t end, std::size_t next);
 
-  FileDescriptor descriptor_;
+  vesk::FileDescriptor descriptor_;
   std::size_t padding_;
   std::size_t longestLine_;
   BeforeRead beforeRead_;
@@ -59,4 +59,4 @@ class LineReader {
   std::size_t lineNumber_ = 0;
 };
 
-}  // namespace vesk::corvik
+}  // namespace corvik

@@ -7,7 +7,7 @@
 #include "corvik/hex.h"
 #include "platform/text_form.h"
 
-namespace vesk::corvik {
+namespace corvik {
 
 namespace {
 
@@ -69,10 +69,10 @@ struct RecordedEventParser::Fields {
 
 void appendRecordedEvent(std::string& out, const RecordedEvent& event) {
   out += "{\"at\": ";
-  appendDecimal(out, event.at);
+  vesk::appendDecimal(out, event.at);
   out += ", \"metric\": ";
   if (event.metricId < 0) {
-    appendDecimal(out, event.metricId);
+    vesk::appendDecimal(out, event.metricId);
   } else {
     constexpr std::string_view kDigits = "0123456789ABCDEF";
     std::array<char, 16> digits;
@@ -87,7 +87,7 @@ void appendRecordedEvent(std::string& out, const RecordedEvent& event) {
     out += '"';
   }
   out += ", \"payload\": \"";
-  appendHex(out, event.payload);
+  vesk::appendHex(out, event.payload);
   out += "\"}\n";
 }
 
@@ -176,4 +176,4 @@ bool RecordedEventParser::fail(std::string reason) {
   return false;
 }
 
-}  // namespace vesk::corvik
+}  // namespace corvik

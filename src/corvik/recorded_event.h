@@ -9,7 +9,7 @@
 #include <string_view>
 #include <vector>
 
-namespace vesk::corvik {
+namespace corvik {
 
 /// One metric event of a recording.
 struct RecordedEvent {
@@ -54,4 +54,4 @@ class RecordedEventParser {
   std::string reason_;
 };
 
-}  // namespace vesk::corvik
+}  // namespace corvik

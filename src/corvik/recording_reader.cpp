@@ -8,7 +8,7 @@
 #include <unistd.h>
 #include <utility>
 
-namespace vesk::corvik {
+namespace corvik {
 
 namespace {
 
@@ -16,9 +16,9 @@ constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 /// How far from the end of a file its last event is looked for.
 constexpr off_t kTail = 65536;
 
-FileDescriptor openForReading(const std::string& path) {
-  if (path == "-") return FileDescriptor::borrowed(STDIN_FILENO);
-  return FileDescriptor(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+vesk::FileDescriptor openForReading(const std::string& path) {
+  if (path == "-") return vesk::FileDescriptor::borrowed(STDIN_FILENO);
+  return vesk::FileDescriptor(open(path.c_str(), O_RDONLY | O_CLOEXEC));
 }
 
 std::string inWords(const std::string& name, int error) {
@@ -26,7 +26,7 @@ std::string inWords(const std::string& name, int error) {
 }
 
 /// A directory can be opened, and fails only when it is read.
-std::optional<std::string> whyUnreadable(const FileDescriptor& descriptor, const std::string& name) {
+std::optional<std::string> whyUnreadable(const vesk::FileDescriptor& descriptor, const std::string& name) {
   struct stat status {};
   if (!descriptor.isOpen() || fstat(descriptor.get(), &status) != 0) return inWords(name, errno);
   if (S_ISDIR(status.st_mode)) return inWords(name, EISDIR);
@@ -42,7 +42,7 @@ bool isBlank(std::string_view line) {
 RecordingReader::RecordingReader(const std::string& path)
     : RecordingReader(openForReading(path), path == "-" ? "standard input" : path) {}
 
-RecordingReader::RecordingReader(FileDescriptor descriptor, std::string name, std::size_t longestLine)
+RecordingReader::RecordingReader(vesk::FileDescriptor descriptor, std::string name, std::size_t longestLine)
     : name_(std::move(name)),
       failure_(whyUnreadable(descriptor, name_)),
       lines_(std::move(descriptor), RecordedEventParser::kPadding, longestLine) {}
@@ -96,4 +96,4 @@ BadLine RecordingReader::badLine(std::string_view reason) const {
   return BadLine{name_ + ':' + std::to_string(lines_.lineNumber()) + ": " + std::string(reason)};
 }
 
-}  // namespace vesk::corvik
+}  // namespace corvik

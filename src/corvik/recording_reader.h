@@ -8,7 +8,7 @@
 #include "corvik/line_reader.h"
 #include "corvik/recorded_event.h"
 
-namespace vesk::corvik {
+namespace corvik {
 
 /// A line that holds no event, as FILE:LINE: reason.
 struct BadLine {
@@ -31,7 +31,8 @@ class RecordingReader {
   /// Over the file at `path`; "-" is standard input. One that cannot be opened shows in failure().
   explicit RecordingReader(const std::string& path);
   /// Over an open descriptor, called `name` in messages.
-  RecordingReader(FileDescriptor descriptor, std::string name, std::size_t longestLine = LineReader::kLongestLine);
+  RecordingReader(vesk::FileDescriptor descriptor, std::string name,
+                  std::size_t longestLine = LineReader::kLongestLine);
 
   /// See LineReader::BeforeRead: the place to write out what is buffered, or to wait with a way out.
   void setBeforeRead(LineReader::BeforeRead beforeRead) { lines_.setBeforeRead(std::move(beforeRead)); }
@@ -61,4 +62,4 @@ class RecordingReader {
   RecordedEventParser parser_;
 };
 
-}  // namespace vesk::corvik
+}  // namespace corvik

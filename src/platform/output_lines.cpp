@@ -81,6 +81,10 @@ std::unique_ptr<OutputSink> OutputLines::setSink(std::unique_ptr<OutputSink> sin
   return std::exchange(sinkInForce(), std::move(sink));
 }
 
+bool OutputLines::isOpen() {
+  return sinkInForce() != nullptr;
+}
+
 void OutputLines::print(std::initializer_list<std::string_view> items) {
   OutputSink* sink = sinkInForce().get();
   if (sink == nullptr) return;

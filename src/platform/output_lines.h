@@ -65,6 +65,8 @@ class OutputLines {
  public:
   /// Puts `sink` in the place of the one in force and returns that. Null drops all lines.
   static std::unique_ptr<OutputSink> setSink(std::unique_ptr<OutputSink> sink);
+  /// Whether a line would go anywhere: ask before building a costly one.
+  [[nodiscard]] static bool isOpen();
   /// Prints one line: the items, separated by one blank, control characters made visible.
   static void print(std::initializer_list<std::string_view> items);
   static void flush();

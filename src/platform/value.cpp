@@ -56,9 +56,14 @@ const Value* Dictionary::find(std::string_view key) const {
   return index ? &entries_[*index].value : nullptr;
 }
 
+Value* Dictionary::findForChange(std::string_view key) {
+  const std::optional<std::size_t> index = indexOf(key);
+  return index ? &entries_.mutableItems()[*index].value : nullptr;
+}
+
 void Dictionary::set(Text key, Value value) {
-  if (const std::optional<std::size_t> index = indexOf(key.view())) {
-    entries_.mutableItems()[*index].value = std::move(value);
+  if (Value* present = findForChange(key.view())) {
+    *present = std::move(value);
   } else {
     append(std::move(key), std::move(value));
   }

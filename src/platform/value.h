@@ -55,6 +55,8 @@ class Dictionary {
 
   /// The value under `key`, or null; valid until the dictionary changes.
   [[nodiscard]] const Value* find(std::string_view key) const;
+  /// The same, for changing it.
+  [[nodiscard]] Value* findForChange(std::string_view key);
   [[nodiscard]] bool contains(std::string_view key) const { return find(key) != nullptr; }
 
   void reserve(std::size_t capacity);

@@ -9,8 +9,15 @@
 #include "platform/text_form.h"
 #include "support/input.h"
 
-namespace vesk::corvik {
+namespace corvik {
 namespace {
+
+using vesk::appendDecimal;
+using vesk::appendHex;
+using vesk::FileDescriptor;
+using vesk::fileWith;
+using vesk::Pipe;
+using vesk::writeAll;
 
 /// What next() yields, in one line: "12.5 3952132 0895", the message, or "end".
 std::string textOf(const RecordingReader::Step& step) {
@@ -187,4 +194,4 @@ TEST(RecordedEvent, IsWrittenAsItIsRead) {
 }
 
 }  // namespace
-}  // namespace vesk::corvik
+}  // namespace corvik

@@ -2,13 +2,14 @@
 
 #include <condition_variable>
 #include <mutex>
+#include <optional>
 #include <poll.h>
 
 #include "platform/clock.h"
 
 namespace vesk {
 
-/// A clock that stands still until it is advanced. Threads that sleep by it wake when their time has come.
+/// A clock that stands still until it is advanced. A thread that sleeps by it wakes when its time has come.
 class ManualClock : public Clock {
  public:
   [[nodiscard]] Instant now() const override {
@@ -17,41 +18,41 @@ class ManualClock : public Clock {
   }
 
   void advance(Duration by) {
-    {
-      const std::lock_guard lock(mutex_);
-      now_ += by;
-    }
+    const std::lock_guard lock(mutex_);
+    now_ += by;
+    if (sleepingUntil_ <= now_) sleepingUntil_.reset();
     advanced_.signal();
   }
 
   /// For one thread at a time.
   void sleepUntil(Instant instant, const WakeUp& interrupt) const override {
-    while (now() < instant) {
-      setSleeping(true);
+    while (goToSleep(instant)) {
       pollfd polled[] = {{interrupt.descriptor(), POLLIN, 0}, {advanced_.descriptor(), POLLIN, 0}};
       poll(polled, 2, -1);
-      setSleeping(false);
       advanced_.clear();
       if (polled[0].revents != 0) return;
     }
   }
 
-  /// Blocks until a thread sleeps by this clock.
-  void waitForSleeper() const {
+  /// Blocks until a thread sleeps by this clock: how long it will.
+  [[nodiscard]] Duration waitForSleeper() const {
     std::unique_lock lock(mutex_);
-    changed_.wait(lock, [this] { return isSleeping_; });
+    asleep_.wait(lock, [this] { return sleepingUntil_.has_value(); });
+    return *sleepingUntil_ - now_;
   }
 
  private:
-  void setSleeping(bool isSleeping) const {
+  [[nodiscard]] bool goToSleep(Instant instant) const {
     const std::lock_guard lock(mutex_);
-    isSleeping_ = isSleeping;
-    changed_.notify_all();
+    if (instant <= now_) return false;
+    sleepingUntil_ = instant;
+    asleep_.notify_all();
+    return true;
   }
 
   mutable std::mutex mutex_;
-  mutable std::condition_variable changed_;
-  mutable bool isSleeping_ = false;
+  mutable std::condition_variable asleep_;
+  mutable std::optional<Instant> sleepingUntil_;
   Instant now_;
   WakeUp advanced_;
 };

@@ -1,0 +1,11 @@
+#include "app/app_id_validator.h"
+
+namespace vesk {
+
+bool AppIDValidator::isForThisApplication(const Dictionary& event) {
+  const Value* found = event.find(appIDKey);
+  appID_ = found == nullptr ? std::nullopt : found->integer();
+  return appID_ == myAppID;
+}
+
+}  // namespace vesk

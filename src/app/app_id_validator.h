@@ -1,0 +1,27 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+#include "platform/value.h"
+
+namespace vesk {
+
+/// Tells whether an event is meant for this application.
+class AppIDValidator {
+ public:
+  /// True when the dictionary has this application's identifier, as an integer, under "kKeyAppID".
+  bool isForThisApplication(const Dictionary& event);
+
+  /// The identifier that was found last; absent when there was none.
+  [[nodiscard]] std::optional<std::int64_t> appID() const { return appID_; }
+
+ private:
+  static constexpr std::int64_t myAppID = 2;
+  static constexpr std::string_view appIDKey = "kKeyAppID";
+
+  std::optional<std::int64_t> appID_;
+};
+
+}  // namespace vesk

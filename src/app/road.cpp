@@ -1,0 +1,62 @@
+#include "app/road.h"
+
+#include <memory>
+
+#include "app/app_delegate.h"
+#include "app/root_navigation_controller.h"
+#include "app/vesk_interface.h"
+#include "corvik/recorded_service.h"
+#include "platform/bundle.h"
+#include "platform/clock.h"
+#include "platform/output_lines.h"
+#include "platform/run_loop.h"
+#include "toolkit/application.h"
+
+namespace vesk {
+
+bool hasMetricConfiguration() {
+  using Root = RootNavigationController;
+  if (Bundle::main().pathForResource(Root::metricFileName, Root::metricFileType)) return true;
+  std::string line = "vesk: the metric configuration ";
+  line += Root::metricFileName;
+  line += '.';
+  line += Root::metricFileType;
+  line += " is missing, and without it no metric arrives; install the program again";
+  tellUser(line);
+  return false;
+}
+
+Outcome playRecording(const std::optional<std::string>& path,
+                      const std::function<void(NavigationController& root)>& use) {
+  OutputLines::setSink(nullptr);
+  if (path && !hasMetricConfiguration()) return Outcome::failed;
+  // What plays lives as long as the connection to it, which ends with the process.
+  static const SteadyClock clock;
+  RunLoop loop(clock);
+  Outcome outcome = Outcome::done;
+  const auto fail = [&outcome](const std::string& reason) {
+    tellUser(reason);
+    outcome = Outcome::failed;
+  };
+  std::shared_ptr<corvik::RecordedService> service;
+  if (path) {
+    service = std::make_shared<corvik::RecordedService>(corvik::RecordingReader(*path), clock,
+                                                        corvik::Playback{.speed = std::nullopt});
+    service->setBadLineHandler(fail);
+    service->setEndHandler([&](const std::optional<std::string>& failure) {
+      if (failure) fail("vesk: " + *failure);
+      loop.stop();
+    });
+  }
+  corvik::installService(service);
+
+  AppDelegate delegate;
+  Application application(veskInterface(), delegate);
+  application.run([&](NavigationController& root) {
+    if (path) loop.run();
+    use(root);
+  });
+  return outcome;
+}
+
+}  // namespace vesk

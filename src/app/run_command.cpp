@@ -1,0 +1,131 @@
+#include "app/run_command.h"
+
+#include <memory>
+#include <string>
+#include <unistd.h>
+
+#include "app/app_delegate.h"
+#include "app/metric_arrivals.h"
+#include "app/road.h"
+#include "app/stop_signals.h"
+#include "app/vesk_interface.h"
+#include "intake/metric_validator.h"
+#include "platform/output_lines.h"
+#include "platform/run_loop.h"
+#include "platform/timer.h"
+#include "terminal/terminal.h"
+#include "toolkit/application.h"
+
+namespace vesk {
+
+namespace {
+
+/// One run of the program, from the source of its events to what shows them.
+class Run {
+ public:
+  explicit Run(const RunOptions& options) : options_(options), isHeadless_(options.isHeadless) {}
+
+  Outcome run() {
+    source_ = makeEventSource(options_.source, clock(),
+                              {[this](const std::string& message) { tell(message); },
+                               [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
+    corvik::installService(source_.service);
+    if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
+    if (!isHeadless_) OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    Application application(veskInterface(), delegate_);
+    application.run([&](NavigationController& root) { mainLoop(application, root); });
+    OutputLines::flush();
+    return outcome_;
+  }
+
+ private:
+  /// What plays lives as long as the connection to it, which ends with the process.
+  static const Clock& clock() {
+    static const SteadyClock theClock;
+    return theClock;
+  }
+
+  void mainLoop(Application& application, NavigationController& root) {
+    stopMainLoopOnSignals();
+    std::optional<Timer> end;
+    if (options_.duration) {
+      end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
+    }
+    if (!isHeadless_) openTerminal(application, root);
+    loop_.run();
+    terminal_.reset();
+  }
+
+  void openTerminal(Application& application, NavigationController& root) {
+    std::string reason;
+    terminal_ = Terminal::open(root, clock(), surroundings(application), reason);
+    if (terminal_ == nullptr) {
+      tellUser("vesk: " + reason + "; running without screens");
+      isHeadless_ = true;
+      OutputLines::setSink(std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output"));
+      return;
+    }
+    MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
+      arrivals_.note(metricId);
+      terminal_->setNeedsDisplay();
+    });
+    loop_.addInput(terminal_->descriptor(), [this] { terminal_->serve(); });
+  }
+
+  Surroundings surroundings(Application& application) {
+    return {
+        .sourceState =
+            [this] {
+              return SourceState{source_.state(), clock().now() + std::chrono::seconds(1)};
+            },
+        .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
+        .diagnostics = &diagnostics_,
+        .setTracking =
+            [this](bool isTracking) { loop_.setMode(isTracking ? RunLoopMode::tracking : RunLoopMode::defaultMode); },
+        .quit = [this] { loop_.stop(); },
+        .setInBackground =
+            [&application](bool isInBackground) {
+              if (isInBackground) {
+                application.enterBackground();
+              } else {
+                application.enterForeground();
+              }
+            },
+    };
+  }
+
+  /// To the user where there are no screens, and to the diagnostic lines where there are.
+  void tell(const std::string& line) {
+    outcome_ = Outcome::failed;
+    if (isHeadless_) {
+      tellUser(line);
+    } else {
+      diagnostics_.append(line);
+    }
+  }
+
+  void sourceEnded(const std::optional<std::string>& failure) {
+    if (failure) tell("vesk: " + *failure);
+    if (isHeadless_) loop_.stop();
+    if (terminal_ != nullptr) terminal_->setNeedsDisplay();
+  }
+
+  const RunOptions& options_;
+  bool isHeadless_;
+  Outcome outcome_ = Outcome::done;
+  RunLoop loop_{clock()};
+  DiagnosticLines diagnostics_;
+  MetricArrivals arrivals_{clock()};
+  EventSource source_;
+  AppDelegate delegate_;
+  std::unique_ptr<Terminal> terminal_;
+};
+
+}  // namespace
+
+Outcome runProgram(const RunOptions& options) {
+  if (!hasMetricConfiguration()) return Outcome::failed;
+  return Run(options).run();
+}
+
+}  // namespace vesk

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <chrono>
+#include <optional>
+
+#include "app/event_source.h"
+#include "app/outcome.h"
+
+namespace vesk {
+
+struct RunOptions {
+  SourceOptions source;
+  /// No screens: the program's lines on standard output. So it also runs where there is no terminal for screens.
+  bool isHeadless = false;
+  /// How long; absent until the user quits, or without screens until the recording has ended.
+  std::optional<std::chrono::nanoseconds> duration;
+};
+
+/// Runs the program: its screens, or headless. SIGINT and SIGTERM end it in good order.
+[[nodiscard]] Outcome runProgram(const RunOptions& options);
+
+}  // namespace vesk

@@ -1,0 +1,94 @@
+#include "corvik/channel.h"
+
+#include <utility>
+
+#include "platform/main_queue.h"
+
+namespace corvik::client {
+
+namespace {
+
+/// How far a source may get ahead, on each of the two queues that an event passes.
+constexpr std::size_t kMostWaiting = 1024;
+
+}  // namespace
+
+void Channel::setHandler(const vesk::Text& event, EventHandler handler) {
+  const std::lock_guard lock(mutex_);
+  Handlers handlers = *handlers_;
+  if (event == kEventMetric) handlers.metric = std::move(handler);
+  if (event == kEventTrigger) handlers.trigger = std::move(handler);
+  handlers_ = std::make_shared<const Handlers>(std::move(handlers));
+}
+
+void Channel::setConfigured(bool isConfigured) {
+  const std::lock_guard lock(mutex_);
+  isConfigured_ = isConfigured;
+  wanted_.notify_all();
+}
+
+void Channel::setEventsOn(bool isOn) {
+  {
+    const std::lock_guard lock(mutex_);
+    areEventsOn_ = isOn;
+    wanted_.notify_all();
+  }
+  if (isOn) scheduleDeliveries();
+}
+
+bool Channel::waitUntilWanted(const std::stop_token& stop) {
+  if (!isWanted()) {
+    std::unique_lock lock(mutex_);
+    if (!wanted_.wait(lock, stop, [this] { return isWanted(); })) return false;
+  }
+  return backlog_.waitUntilFewerThan(kMostWaiting, stop) &&
+         vesk::MainQueue::shared().waitUntilFewerThan(kMostWaiting, stop);
+}
+
+void Channel::raise(const vesk::Text& event, vesk::InterProcessDictionary message) {
+  add(Event{event, std::move(message)});
+}
+
+void Channel::afterDelivery(vesk::Task task) {
+  add(std::move(task));
+}
+
+void Channel::add(Delivery delivery) {
+  if (backlog_.add(std::move(delivery))) scheduleDeliveries();
+}
+
+void Channel::scheduleDeliveries() {
+  queue_.async([weak = weak_from_this()] {
+    if (const std::shared_ptr<Channel> self = weak.lock()) self->deliver();
+  });
+}
+
+void Channel::deliver() {
+  while (areEventsOn_ && hasBatch())
+    deliver(batch_[delivered_++], *handlers());
+}
+
+bool Channel::hasBatch() {
+  if (delivered_ < batch_.size()) return true;
+  batch_.clear();
+  delivered_ = 0;
+  backlog_.take(batch_);
+  return !batch_.empty();
+}
+
+std::shared_ptr<const Channel::Handlers> Channel::handlers() {
+  const std::lock_guard lock(mutex_);
+  return handlers_;
+}
+
+void Channel::deliver(Delivery& delivery, const Handlers& handlers) {
+  if (auto* task = std::get_if<vesk::Task>(&delivery)) {
+    vesk::MainQueue::shared().async(std::move(*task));
+    return;
+  }
+  const auto& event = std::get<Event>(delivery);
+  const EventHandler& handler = event.name == kEventMetric ? handlers.metric : handlers.trigger;
+  if (handler) handler(event.message, WorkGroup{});
+}
+
+}  // namespace corvik::client

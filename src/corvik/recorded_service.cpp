@@ -1,0 +1,130 @@
+#include "corvik/recorded_service.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <poll.h>
+#include <utility>
+
+namespace corvik {
+
+namespace {
+
+using vesk::Clock;
+
+/// Longer waits are never meant; beyond this a time would not fit the clock.
+constexpr double kLongestWait = 1e9;
+
+}  // namespace
+
+RecordedService::RecordedService(RecordingReader recording, const vesk::Clock& clock, Playback playback)
+    : recording_(std::move(recording)), clock_(clock), playback_(playback) {
+  state_.duration = recording_.duration();
+  state_.speed = playback.speed;
+  recording_.setBeforeRead([this](int descriptor) { return waitForInput(descriptor); });
+}
+
+PlaybackState RecordedService::state() const {
+  const std::lock_guard lock(mutex_);
+  return state_;
+}
+
+void RecordedService::setPhase(PlaybackState::Phase phase) {
+  const std::lock_guard lock(mutex_);
+  state_.phase = phase;
+}
+
+void RecordedService::start(EventStream& events) {
+  thread_ = std::jthread([this, &events](const std::stop_token& stop) { play(stop, events); });
+}
+
+void RecordedService::endThread() {
+  if (!thread_.joinable()) return;
+  thread_.request_stop();
+  interrupt_.signal();
+  thread_.join();
+  interrupt_.clear();
+}
+
+Result RecordedService::answer(const MetricQuery&, EventStream&) {
+  return {};
+}
+
+void RecordedService::play(const std::stop_token& stop, EventStream& events) {
+  if (state().phase == PlaybackState::Phase::ended || !events.waitUntilWanted(stop)) return;
+  if (!due_) due_ = clock_.now();
+  setPhase(PlaybackState::Phase::playing);
+  do {
+    RecordingReader::Step step = recording_.next();
+    if (stop.stop_requested()) return;
+    if (const auto* event = std::get_if<RecordedEvent>(&step)) {
+      if (!waitUntil(event->at, stop)) return;
+      playEvent(*event, events);
+    } else if (auto* bad = std::get_if<BadLine>(&step)) {
+      tellBadLine(std::move(bad->message), events);
+    } else if (!startAgain()) {
+      end(events);
+      return;
+    }
+  } while (events.waitUntilWanted(stop));
+}
+
+bool RecordedService::waitForInput(int descriptor) {
+  pollfd polled[] = {{descriptor, POLLIN, 0}, {interrupt_.descriptor(), POLLIN, 0}};
+  if (poll(polled, std::size(polled), 0) == 0) {
+    setPhase(PlaybackState::Phase::waitingForInput);
+    // What poll fails for, the read that follows tells better.
+    while (poll(polled, std::size(polled), -1) < 0 && errno == EINTR) {
+    }
+    setPhase(PlaybackState::Phase::playing);
+  }
+  return polled[1].revents == 0;
+}
+
+bool RecordedService::waitUntil(double at, const std::stop_token& stop) {
+  if (!playback_.speed) return true;
+  const double wait = std::clamp((at - at_) / *playback_.speed, 0.0, kLongestWait);
+  *due_ += std::chrono::duration_cast<Clock::Duration>(std::chrono::duration<double>(wait));
+  at_ = at;
+  clock_.sleepUntil(*due_, interrupt_);
+  return !stop.stop_requested();
+}
+
+void RecordedService::playEvent(const RecordedEvent& event, EventStream& events) {
+  ++eventsOfLap_;
+  {
+    const std::lock_guard lock(mutex_);
+    state_.position = event.at;
+    ++state_.events;
+  }
+  events.raise(kEventMetric, makeMetricEvent(event.metricId, event.payload));
+}
+
+void RecordedService::tellBadLine(std::string message, EventStream& events) {
+  if (lap_ > 0) return;
+  {
+    const std::lock_guard lock(mutex_);
+    ++state_.badLines;
+  }
+  if (onBadLine_) {
+    events.afterDelivery([tell = onBadLine_, message = std::move(message)] { tell(message); });
+  }
+}
+
+bool RecordedService::startAgain() {
+  // Without a single event to play, going round would never wait.
+  const bool canGoOn = playback_.loops && eventsOfLap_ > 0 && !recording_.failure();
+  if (!canGoOn || !recording_.rewind()) return false;
+  ++lap_;
+  eventsOfLap_ = 0;
+  at_ = 0;
+  return true;
+}
+
+void RecordedService::end(EventStream& events) {
+  setPhase(PlaybackState::Phase::ended);
+  if (onEnd_) {
+    events.afterDelivery([tell = onEnd_, failure = recording_.failure()] { tell(failure); });
+  }
+}
+
+}  // namespace corvik

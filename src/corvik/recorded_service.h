@@ -1,0 +1,105 @@
+#pragma once
+
+#include <atomic>
+#include <cstddef>
+#include <functional>
+#include <mutex>
+#include <optional>
+#include <stop_token>
+#include <string>
+#include <thread>
+
+#include "corvik/recording_reader.h"
+#include "corvik/service.h"
+#include "platform/clock.h"
+
+namespace corvik {
+
+struct Playback {
+  /// How many seconds of the recording pass in one, positive; absent for no waiting at all.
+  std::optional<double> speed = 1.0;
+  /// From the start again at the end, where the recording has a way back.
+  bool loops = false;
+};
+
+/// What a status bar shows of a recorded service.
+struct PlaybackState {
+  enum class Phase {
+    /// Until the client wants metrics.
+    notStarted,
+    playing,
+    /// For more of a pipe.
+    waitingForInput,
+    ended,
+  };
+
+  Phase phase = Phase::notStarted;
+  /// Seconds: "at" of the last event played.
+  double position = 0;
+  /// Seconds: "at" of the last event of all, where it can be known.
+  std::optional<double> duration;
+  std::optional<double> speed;
+  std::size_t events = 0;
+  std::size_t badLines = 0;
+};
+
+/// Plays a recording: raises each event when its time has come, on a thread of its own, as soon as the client
+/// wants metrics and no faster than it takes them. Queries are accepted; what answers them is in the
+/// recording. A disconnection interrupts it at once, whatever it waits for.
+class RecordedService final : public Service {
+ public:
+  /// Both are called on the main queue.
+  using BadLineHandler = std::function<void(const std::string& message)>;
+  /// `failure` tells why the recording could not be read to its end.
+  using EndHandler = std::function<void(const std::optional<std::string>& failure)>;
+
+  /// `clock` must outlive the service.
+  RecordedService(RecordingReader recording, const vesk::Clock& clock, Playback playback);
+  ~RecordedService() override { endThread(); }
+  RecordedService(const RecordedService&) = delete;
+  RecordedService& operator=(const RecordedService&) = delete;
+
+  /// To be set before the service is connected. A looping recording's bad lines are told once.
+  void setBadLineHandler(BadLineHandler handler) { onBadLine_ = std::move(handler); }
+  /// Called once everything has been delivered, behind the last event and the last bad line.
+  void setEndHandler(EndHandler handler) { onEnd_ = std::move(handler); }
+
+  /// From any thread.
+  [[nodiscard]] PlaybackState state() const;
+
+ private:
+  void start(EventStream& events) override;
+  void stop() override { endThread(); }
+  [[nodiscard]] Result answer(const MetricQuery& query, EventStream& events) override;
+
+  void endThread();
+  void setPhase(PlaybackState::Phase phase);
+  /// These run on the service's thread.
+  void play(const std::stop_token& stop, EventStream& events);
+  [[nodiscard]] bool waitForInput(int descriptor);
+  /// Blocks until `at` has come; false when a stop was requested.
+  [[nodiscard]] bool waitUntil(double at, const std::stop_token& stop);
+  void playEvent(const RecordedEvent& event, EventStream& events);
+  void tellBadLine(std::string message, EventStream& events);
+  [[nodiscard]] bool startAgain();
+  void end(EventStream& events);
+
+  RecordingReader recording_;
+  const vesk::Clock& clock_;
+  Playback playback_;
+  BadLineHandler onBadLine_;
+  EndHandler onEnd_;
+
+  /// When the last event was due, and its "at"; the start of the playback before the first.
+  std::optional<vesk::Clock::Instant> due_;
+  double at_ = 0;
+  std::size_t lap_ = 0;
+  std::size_t eventsOfLap_ = 0;
+
+  mutable std::mutex mutex_;
+  PlaybackState state_;
+  vesk::WakeUp interrupt_;
+  std::jthread thread_;
+};
+
+}  // namespace corvik

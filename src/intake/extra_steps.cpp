@@ -1,0 +1,217 @@
+#include "intake/extra_steps.h"
+
+#include <algorithm>
+#include <array>
+
+#include "intake/metric_validator.h"
+#include "intake/value_conversions.h"
+#include "platform/output_lines.h"
+#include "platform/text_form.h"
+
+namespace vesk {
+
+namespace {
+
+constexpr std::array kUtraConversions{
+    FieldConversion{"rscp", convertRscp},
+    FieldConversion{"ecno", convertEcNo},
+};
+constexpr std::array kGeranConversions{
+    FieldConversion{"rxlev", convertRxLev},
+};
+constexpr std::array kEutraConversions{
+    FieldConversion{"rsrp", convertRsrp},
+    FieldConversion{"rsrq", convertRsrq},
+};
+constexpr std::array kCpichConversions{
+    FieldConversion{"cpich_rscp", convertRscp},
+    FieldConversion{"cpich_ecn0", convertEcNo},
+};
+constexpr std::array kLteNeighborConversions{
+    FieldConversion{"nbr_rsrp", convertRsrp},
+    FieldConversion{"nbr_rsrq", convertRsrq},
+};
+constexpr std::array kSinrConversions{
+    FieldConversion{"sinr0", convertSinr},
+    FieldConversion{"sinr1", convertSinr},
+};
+constexpr std::array kCarrierConversions{
+    FieldConversion{"rsrp", convertCentiInteger},
+    FieldConversion{"rsrq", convertCentiFloat},
+    FieldConversion{"rssi", convertCentiInteger},
+    FieldConversion{"dl_bandwidth", convertBandwidthCode},
+};
+constexpr std::array kBroadcastNeighborConversions{
+    FieldConversion{"dl_bw", convertBandwidthCode},
+};
+constexpr std::array kServingCellConversions{
+    FieldConversion{"dl_bw", convertHalf},
+    FieldConversion{"ul_bw", convertHalf},
+};
+
+/// A field that every element of a list takes over from elsewhere.
+struct Stamp {
+  Text key;
+  /// Null takes the field away from the element.
+  const Value* value;
+};
+
+Stamp timestampOf(const Record& parent) {
+  return {"timestamp"_text, parent.find("timestamp")};
+}
+
+bool isRecordList(const Value* value) {
+  const Array* array = value == nullptr ? nullptr : value->array();
+  return array != nullptr &&
+         std::all_of(array->begin(), array->end(), [](const Value& each) { return each.dictionary() != nullptr; });
+}
+
+/// Fills `field` with the records of the list under `listKey`, stamped and converted. What is no list of records
+/// leaves the field as it was.
+void liftList(const Record& source, std::string_view listKey, RecordList& field, std::initializer_list<Stamp> stamps,
+              std::span<const FieldConversion> conversions = {}) {
+  const Value* list = source.find(listKey);
+  if (!isRecordList(list)) return;
+  field.clear();
+  field.reserve(list->array()->size());
+  for (const Value& element : *list->array()) {
+    Record& record = field.append(*element.dictionary());
+    for (const auto& [key, value] : stamps) {
+      if (value != nullptr) {
+        record.set(key, *value);
+      } else {
+        record.erase(key.view());
+      }
+    }
+    convertFields(record, conversions);
+  }
+}
+
+/// Replaces the value under `key` by its text when it is what `isMeant` asks for; the text, or null.
+template <class IsMeant>
+const Text* replaceByText(Record& record, std::string_view key, IsMeant isMeant) {
+  const Value* present = record.find(key);
+  if (present == nullptr || !isMeant(*present)) return nullptr;
+  Value text = Text::copy(textOf(*present));
+  Value& replaced = *record.findForChange(key);
+  replaced = std::move(text);
+  return replaced.text();
+}
+
+bool isIntegerList(const Value& value) {
+  const Array* array = value.array();
+  return array != nullptr &&
+         std::all_of(array->begin(), array->end(), [](const Value& each) { return each.integer().has_value(); });
+}
+
+void replaceMultiBandInfo(Record& record) {
+  if (const Text* text = replaceByText(record, "multi_band_info", isIntegerList)) OutputLines::print({text->view()});
+}
+
+/// Refreshes every key of the store's record; what the source does not have becomes the empty text.
+void fillTemplate(Record& store, const Record& source) {
+  Record filled;
+  filled.reserve(store.size());
+  for (const auto& [key, value] : store) {
+    const Value* found = source.find(key.view());
+    filled.append(key, found == nullptr ? Value(""_text) : *found);
+  }
+  store = std::move(filled);
+}
+
+}  // namespace
+
+void takeLteServingCell(MetricValidator& intake) {
+  convertFields(*intake.myLTESCellInfoDict, kServingCellConversions);
+}
+
+void takeLteSelectionParameters(MetricValidator& intake) {
+  Record& source = *intake.myLTESelReselDict;
+  Record& parameters = intake.myLTE.SelReselCellInfo;
+  replaceMultiBandInfo(source);
+  fillTemplate(parameters, source);
+  intake.formatTimestampOf(parameters);
+  liftList(source, "nbr_eutra", intake.myLTE.EutraNbrs, {timestampOf(parameters)}, kBroadcastNeighborConversions);
+}
+
+void takeLteTxPower(MetricValidator& intake) {
+  const Record& source = *intake.myLTETxPowerDict;
+  liftList(source, "tx_power_info", intake.myLTE.TxPower, {timestampOf(source)});
+}
+
+void takeLteRsrpRsrqSinr(MetricValidator& intake) {
+  const Record& source = *intake.myLTERsrpRsrqSinrDict;
+  Record parent;
+  if (const Value* timestamp = source.find("timestamp")) parent.set("timestamp"_text, *timestamp);
+  intake.formatTimestampOf(parent);
+  liftList(source, "inst_values", intake.myLTE.RsrpRsrqSinr, {timestampOf(parent)}, kSinrConversions);
+}
+
+void takeLteCarrierAggregation(MetricValidator& intake) {
+  const Record& source = *intake.myLTECAStatusDict;
+  liftList(source, "scc_list", intake.myLTE.CAStatusList, {timestampOf(source)}, kCarrierConversions);
+}
+
+void takeLteInterRatNeighbors(MetricValidator& intake) {
+  const Record& source = *intake.myLTEInterRatMeasDict;
+  liftList(source, "meas_nbr_utra", intake.myLTE.UtraNbrsMeas, {timestampOf(source)}, kUtraConversions);
+  liftList(source, "meas_nbr_geran", intake.myLTE.GeraNbrsMeas, {timestampOf(source)}, kGeranConversions);
+}
+
+void takeLteNeighbors(MetricValidator& intake) {
+  const Record& source = *intake.myLTEIntraRatMeasDict;
+  liftList(source, "meas_nbr_eutra", intake.myLTE.EutraNbrsMeas, {timestampOf(source)}, kLteNeighborConversions);
+}
+
+void takeActiveBearers(MetricValidator& intake) {
+  const Record& source = *intake.myCellularActiveBearerDict;
+  liftList(source, "bearer_contexts", intake.myCommon.activeBearer, {timestampOf(source)});
+}
+
+void takeEmmContext(MetricValidator& intake) {
+  Record& source = *intake.myLTEEMMContextDict;
+  replaceByText(source, "guti", [](const Value& value) { return value.dictionary() != nullptr; });
+  replaceByText(source, "tai_list", [](const Value& value) { return isRecordList(&value); });
+}
+
+void takeUmtsServingCellMeasurement(MetricValidator& intake) {
+  const Record& source = *intake.myUMTSCellMeasDict;
+  liftList(source, "rx_info", intake.myUMTS.rXInfo,
+           {timestampOf(source), {"connected_mode"_text, source.find("connected_mode")}});
+}
+
+void takeUmtsTxPower(MetricValidator& intake) {
+  const Record& source = *intake.myUMTSTxPowerDict;
+  liftList(source, "tx_power_info", intake.myUMTS.TxPower, {timestampOf(source)});
+}
+
+void takeUmtsSelectionParameters(MetricValidator& intake) {
+  Record& source = *intake.myUMTSSelReselDict;
+  Record& parameters = intake.myUMTS.SelReselCellInfo;
+  replaceMultiBandInfo(source);
+  fillTemplate(parameters, source);
+  liftList(source, "eutra_prio_info", intake.myUMTS.eUtraNbrs, {timestampOf(parameters)});
+  liftList(source, "utra_prio_info", intake.myUMTS.utraNbrs, {timestampOf(parameters)});
+  liftList(source, "gsm_prio_info", intake.myUMTS.geraNbrs, {timestampOf(parameters)});
+}
+
+void takeUmtsNeighbors(MetricValidator& intake) {
+  const Record& source = *intake.myUMTSNbrMeasDict;
+  liftList(source, "meas_utra_result", intake.myUMTS.utraNbrMeas, {timestampOf(source)}, kUtraConversions);
+  liftList(source, "meas_gsm_result", intake.myUMTS.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
+  liftList(source, "meas_lte_result", intake.myUMTS.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
+}
+
+void takeGsmNeighbors(MetricValidator& intake) {
+  const Record& source = *intake.myGSMNbrMeasDict;
+  liftList(source, "gsm_ncell_meas", intake.myGSM.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
+  liftList(source, "umts_ncell_meas", intake.myGSM.utraNbrMeas, {timestampOf(source)}, kCpichConversions);
+  liftList(source, "lte_ncell_meas", intake.myGSM.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
+}
+
+void takeSimFiles(MetricValidator& intake) {
+  const Record& source = *intake.mySIMFileInfoDict;
+  liftList(source, "ef_list", intake.myCommon.simContents, {timestampOf(source)});
+}
+
+}  // namespace vesk

@@ -1,0 +1,42 @@
+#pragma once
+
+#include <span>
+
+#include "platform/value.h"
+
+/// From a value as the handset reports it to the one that an engineer reads.
+namespace vesk {
+
+/// Converts the value under `key`, which is of `record`. One of a type that the conversion is not for stays as it is.
+using ConvertValue = void (*)(Dictionary& record, std::string_view key);
+
+/// Which field of a record is converted how.
+struct FieldConversion {
+  std::string_view key;
+  ConvertValue convert;
+};
+
+void convertFields(Dictionary& record, std::span<const FieldConversion> conversions);
+
+/// Reported RSCP to dBm: an integer, less 116.
+void convertRscp(Dictionary& record, std::string_view key);
+/// Reported Ec/N0 to dB: half of a float, less 24.5.
+void convertEcNo(Dictionary& record, std::string_view key);
+/// Reported RXLEV to dBm: an integer, less 110.
+void convertRxLev(Dictionary& record, std::string_view key);
+/// Reported RSRP to dBm: an integer, less 140.
+void convertRsrp(Dictionary& record, std::string_view key);
+/// Reported RSRQ to dB: half of a float, less 19.5.
+void convertRsrq(Dictionary& record, std::string_view key);
+/// Reported SINR to dB: half of a float.
+void convertSinr(Dictionary& record, std::string_view key);
+/// Hundredths to whole units: an integer, truncated toward zero.
+void convertCentiInteger(Dictionary& record, std::string_view key);
+/// Hundredths to units: a float.
+void convertCentiFloat(Dictionary& record, std::string_view key);
+/// An LTE bandwidth code to MHz: a 32-bit integer to a float. A code that is not in dlbwlookup takes the key away.
+void convertBandwidthCode(Dictionary& record, std::string_view key);
+/// Halves a 32-bit integer, truncated toward zero.
+void convertHalf(Dictionary& record, std::string_view key);
+
+}  // namespace vesk

@@ -1,0 +1,43 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+#include "intake/metric_validator.h"
+
+namespace vesk {
+
+/// How a category's source becomes rows.
+enum class SourceKind {
+  /// The latest record of a kind of metric, if there was one.
+  metricRecord,
+  /// A record of a store.
+  storeRecord,
+  /// A list of a store, one section an element.
+  storeList,
+  /// Only the first element of a list.
+  firstElement,
+  /// Nothing to show.
+  placeholder,
+};
+
+/// Where the values of one category come from.
+struct CategorySource {
+  std::string_view area;
+  std::string_view category;
+  SourceKind kind;
+  /// What the kind reads, from the intake as it is at the time of the call; null for the other kinds.
+  MetricValidator::LatestRecord (*latestRecord)(const MetricValidator& intake);
+  Record (*storeRecord)(const MetricValidator& intake);
+  RecordList (*list)(const MetricValidator& intake);
+  /// What stands before the number of an element in the header of its section.
+  std::string_view headerPrefix;
+  /// The metric that changes the source; absent for a placeholder.
+  std::optional<std::int64_t> metric;
+};
+
+/// The source of a pair of labels. A pair that no menu has is a placeholder.
+[[nodiscard]] const CategorySource& sourceOf(std::string_view area, std::string_view category);
+
+}  // namespace vesk

@@ -1,0 +1,73 @@
+#pragma once
+
+#include <chrono>
+#include <memory>
+#include <string>
+
+#include "platform/clock.h"
+#include "terminal/capabilities.h"
+#include "terminal/grid.h"
+#include "terminal/input_machine.h"
+#include "terminal/presenter.h"
+#include "terminal/surroundings.h"
+#include "terminal/terminal_device.h"
+#include "toolkit/navigation_controller.h"
+
+namespace vesk {
+
+/// Shows a navigation stack on the terminal that the program was started from, and lets its keys and mouse
+/// work it. It runs no loop of its own: the program's loop watches one descriptor and calls `serve` when it
+/// is readable. Main queue only. Start here.
+///
+///     std::string reason;
+///     std::unique_ptr<Terminal> terminal = Terminal::open(stack, clock, surroundings, reason);
+///     if (terminal == nullptr) { /* say `reason`, run without screens */ }
+///     loop.addInput(terminal->descriptor(), [&] { terminal->serve(); });
+class Terminal {
+ public:
+  /// However much happens, what nobody typed shows at most this often.
+  static constexpr std::chrono::milliseconds kFrame{50};
+
+  /// Takes the terminal over and draws the stack. Null when there is no terminal or it is too simple for
+  /// screens; `reason` then says why in one line. `stack` and `clock` must outlive the terminal, and what
+  /// `surroundings` calls too. Takes the locale of the environment for characters.
+  [[nodiscard]] static std::unique_ptr<Terminal> open(NavigationController& stack, const Clock& clock,
+                                                      Surroundings surroundings, std::string& reason);
+  /// The same on a terminal that is open already.
+  Terminal(NavigationController& stack, const Clock& clock, Surroundings surroundings, FileDescriptor terminal,
+           Capabilities capabilities);
+  /// Gives the terminal back.
+  ~Terminal();
+  Terminal(const Terminal&) = delete;
+  Terminal& operator=(const Terminal&) = delete;
+
+  /// Readable whenever `serve` has something to do.
+  [[nodiscard]] int descriptor() const { return device_.descriptor(); }
+  /// Takes the input, follows the terminal's size and the stopping of the program, draws what is to be drawn.
+  void serve();
+
+  /// Something that shows may have changed: the stack, the source's state, the arrivals. Cheap, so call it as
+  /// often as it is true. The stack and the diagnostic lines tell it by themselves.
+  void setNeedsDisplay();
+
+ private:
+  void suspend();
+  void startAfresh();
+  void draw(Clock::Instant now);
+  void scheduleWakeUp(Clock::Instant now);
+
+  NavigationController& stack_;
+  const Clock& clock_;
+  Surroundings surroundings_;
+  Capabilities capabilities_;
+  TerminalDevice device_;
+  InputMachine input_;
+  Presenter presenter_;
+  /// What stands on the terminal.
+  Grid shown_;
+  bool needsDisplay_ = false;
+  bool isServing_ = false;
+  Clock::Instant lastDrawn_;
+};
+
+}  // namespace vesk

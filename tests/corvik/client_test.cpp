@@ -1,0 +1,204 @@
+#include "corvik/client.h"
+
+#include <gtest/gtest.h>
+#include <string>
+#include <thread>
+#include <vector>
+
+#include "platform/main_queue.h"
+#include "platform/run_loop.h"
+
+namespace corvik::client {
+namespace {
+
+using vesk::InterProcessDictionary;
+using vesk::MainQueue;
+
+const std::uint8_t kBytes[] = {0x08, 0x01};
+
+/// Hands its stream to the test, and answers a query with the metric of the trigger's number.
+class PlainService : public Service {
+ public:
+  EventStream* events = nullptr;
+
+ private:
+  void start(EventStream& stream) override { events = &stream; }
+  void stop() override { events = nullptr; }
+  Result answer(const MetricQuery& query, EventStream& stream) override {
+    stream.raise(kEventMetric, makeMetricEvent(query.triggerId, kBytes));
+    return {};
+  }
+};
+
+class ClientTest : public testing::Test {
+ protected:
+  ClientTest() {
+    installService(service_);
+    manager_ = CreateManager("test", *queue_);
+    installService(nullptr);
+  }
+
+  /// The main queue is the process's: no task may stay behind.
+  void TearDown() override {
+    manager_.reset();
+    queue_.reset();
+    loop_.runDue();
+  }
+
+  Result perform(const vesk::Text& command, const InterProcessDictionary& message) {
+    InterProcessDictionary reply;
+    return PerformCommand(manager_, command, message, reply);
+  }
+  Result configure() {
+    InterProcessDictionary message;
+    message.setData(kKeyPayload, vesk::Data::copy(kBytes));
+    return perform(kCommandAddConfiguration, message);
+  }
+  /// Registers a handler for metrics that notes their ids.
+  void note(std::vector<std::int64_t>& ids) {
+    RegisterEventHandler(manager_, kEventMetric, [&ids](const InterProcessDictionary& event, const WorkGroup&) {
+      ids.push_back(event.integer("kKeyMetricID").value_or(-1));
+    });
+  }
+  void raise(std::int64_t id) { service_->events->raise(kEventMetric, makeMetricEvent(id, kBytes)); }
+  /// Runs until everything raised before has been delivered.
+  void deliverAll() {
+    service_->events->afterDelivery([this] { loop_.stop(); });
+    loop_.run();
+  }
+
+  vesk::SteadyClock clock_;
+  vesk::RunLoop loop_{clock_};
+  std::optional<vesk::WorkQueue> queue_{"test"};
+  std::shared_ptr<PlainService> service_ = std::make_shared<PlainService>();
+  std::shared_ptr<Manager> manager_;
+};
+
+TEST_F(ClientTest, RefusesWhatAServiceCannotExecuteAndSaysWhy) {
+  InterProcessDictionary empty;
+  empty.setData(kKeyPayload, vesk::Data());
+  InterProcessDictionary incomplete;
+  for (const vesk::Text& key : {kKeyTriggerRef, kKeyTriggerType, kKeyTriggerID, kKeyProfileID})
+    incomplete.setInteger(key, 0);
+  InterProcessDictionary complete = incomplete;
+  complete.setInteger(kKeyMetricID, 0);
+  const vesk::Text unknown = vesk::Text::copy("kCommandDance");
+  struct Case {
+    const vesk::Text& command;
+    const InterProcessDictionary& message;
+    std::int32_t code;
+    const char* text;
+  };
+  const Case cases[] = {
+      {kCommandAddConfiguration, empty, kStatusInvalidArgument, "empty configuration"},
+      {kCommandAddConfiguration, complete, kStatusInvalidArgument, "configuration without a payload"},
+      {kCommandQueryMetric, incomplete, kStatusInvalidArgument, "query without kKeyMetricID"},
+      {kCommandQueryMetric, complete, 0, ""},
+      {kCommandClearConfiguration, InterProcessDictionary(), 0, ""},
+      {unknown, complete, kStatusUnknownCommand, "unknown command kCommandDance"},
+  };
+  for (const Case& row : cases) {
+    const Result result = perform(row.command, row.message);
+    EXPECT_EQ(result.code, row.code) << row.text;
+    EXPECT_EQ(result.message, row.text);
+  }
+  EXPECT_EQ(configure().code, 0);
+  service_->refuseAll(Result{-5, "modem is off"});
+  EXPECT_EQ(configure().code, -5);
+  manager_ = CreateManager("orphan", *queue_);
+  EXPECT_EQ(configure().message, "no service for the client orphan");
+}
+
+TEST_F(ClientTest, DeliversInOrderOnItsQueueToTheHandlerRegisteredLast) {
+  std::vector<std::int64_t> first;
+  std::vector<std::int64_t> second;
+  note(first);
+  note(second);
+  std::thread::id handlersThread;
+  std::thread::id queuesThread;
+  queue_->async([&] { queuesThread = std::this_thread::get_id(); });
+  RegisterEventHandler(manager_, kEventTrigger, [&](const InterProcessDictionary&, const WorkGroup&) {
+    handlersThread = std::this_thread::get_id();
+    second.push_back(0);
+  });
+  EventsOn(manager_);
+  raise(1);
+  service_->events->raise(kEventTrigger, InterProcessDictionary());
+  raise(2);
+  deliverAll();
+  EXPECT_TRUE(first.empty());
+  EXPECT_EQ(second, (std::vector<std::int64_t>{1, 0, 2}));
+  EXPECT_EQ(handlersThread, queuesThread);
+}
+
+TEST_F(ClientTest, KeepsEventsWhileTheyAreOff) {
+  std::vector<std::int64_t> ids;
+  note(ids);
+  for (std::int64_t id = 0; id < 3; ++id)
+    raise(id);
+  EventsOn(manager_);
+  deliverAll();
+  EXPECT_EQ(ids, (std::vector<std::int64_t>{0, 1, 2}));
+
+  // Switched off by its first event: the second stays where it is.
+  ids.clear();
+  RegisterEventHandler(manager_, kEventMetric, [&](const InterProcessDictionary&, const WorkGroup&) {
+    ids.push_back(0);
+    EventsOff(manager_);
+    MainQueue::shared().async([&] { loop_.stop(); });
+  });
+  raise(3);
+  raise(4);
+  loop_.run();
+  EXPECT_EQ(ids.size(), 1U);
+  note(ids);
+  EventsOn(manager_);
+  deliverAll();
+  EXPECT_EQ(ids.back(), 4);
+}
+
+TEST_F(ClientTest, AnswersAQueryWithoutAConfiguration) {
+  std::vector<std::int64_t> ids;
+  note(ids);
+  EventsOn(manager_);
+  InterProcessDictionary query;
+  for (const vesk::Text& key : {kKeyTriggerRef, kKeyTriggerType, kKeyTriggerID, kKeyProfileID, kKeyMetricID})
+    query.setInteger(key, 77);
+  EXPECT_EQ(perform(kCommandQueryMetric, query).code, 0);
+  deliverAll();
+  EXPECT_EQ(ids, std::vector<std::int64_t>{77});
+}
+
+TEST_F(ClientTest, WantsMetricsOnceConfiguredAndOnAndHoldsASourceBackThatIsAhead) {
+  constexpr int kEvents = 20000;
+  std::atomic<int> raised = 0;
+  std::atomic<bool> isWanted = false;
+  std::atomic<bool> cameTooEarly = false;
+  int received = 0;
+  std::ptrdiff_t mostAhead = 0;
+  RegisterEventHandler(manager_, kEventMetric, [&](const InterProcessDictionary&, const WorkGroup&) {
+    MainQueue::shared().async([&] { mostAhead = std::max<std::ptrdiff_t>(mostAhead, raised - ++received); });
+  });
+  std::jthread source([&](const std::stop_token& stop) {
+    while (raised < kEvents && service_->events->waitUntilWanted(stop)) {
+      if (!isWanted) cameTooEarly = true;
+      raise(++raised);
+    }
+  });
+  EventsOn(manager_);
+  EventsOff(manager_);
+  EXPECT_EQ(configure().code, 0);
+  isWanted = true;
+  EventsOn(manager_);
+  while (received < kEvents)
+    loop_.runDue();
+  EXPECT_FALSE(cameTooEarly);
+  EXPECT_LT(mostAhead, kEvents / 2);
+}
+
+TEST_F(ClientTest, LetsASourceGoThatShallStop) {
+  std::jthread source([&](const std::stop_token& stop) { EXPECT_FALSE(service_->events->waitUntilWanted(stop)); });
+}
+
+}  // namespace
+}  // namespace corvik::client

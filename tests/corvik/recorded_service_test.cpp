@@ -1,0 +1,170 @@
+#include "corvik/recorded_service.h"
+
+#include <fcntl.h>
+#include <gtest/gtest.h>
+#include <string>
+#include <vector>
+
+#include "corvik/client.h"
+#include "platform/main_queue.h"
+#include "platform/run_loop.h"
+#include "support/input.h"
+#include "support/manual_clock.h"
+
+namespace corvik {
+namespace {
+
+using namespace std::chrono_literals;
+using Phase = PlaybackState::Phase;
+
+using Ids = std::vector<std::int64_t>;
+
+std::string line(double at, int id) {
+  std::string text;
+  appendRecordedEvent(text, {at, id, {}});
+  return text;
+}
+
+/// A client of a recorded service, which notes the ids of the metrics it gets.
+class RecordedServiceTest : public testing::Test {
+ protected:
+  /// The main queue is the process's: no task may stay behind.
+  void TearDown() override {
+    manager_.reset();
+    queue_.reset();
+    loop_.runDue();
+  }
+
+  void connect(vesk::FileDescriptor recording, Playback playback) {
+    service_ = std::make_shared<RecordedService>(RecordingReader(std::move(recording), "r"), clock_, playback);
+    service_->setBadLineHandler([this](const std::string& message) { badLines_.push_back(message); });
+    service_->setEndHandler([this](const std::optional<std::string>& failure) {
+      failure_ = failure;
+      isEnded_ = true;
+      loop_.stop();
+    });
+    installService(service_);
+    manager_ = client::CreateManager("test", *queue_);
+    installService(nullptr);
+    client::RegisterEventHandler(
+        manager_, kEventMetric, [this](const vesk::InterProcessDictionary& event, const client::WorkGroup&) {
+          vesk::MainQueue::shared().async([this, id = event.integer("kKeyMetricID")] { take(id.value()); });
+        });
+    client::EventsOn(manager_);
+    vesk::InterProcessDictionary configuration;
+    configuration.setData(kKeyPayload, vesk::Data::copy(std::vector<std::uint8_t>{1}));
+    vesk::InterProcessDictionary reply;
+    EXPECT_EQ(client::PerformCommand(manager_, kCommandAddConfiguration, configuration, reply).code, 0);
+  }
+
+  void take(std::int64_t id) {
+    ids_.push_back(id);
+    if (ids_.size() == stopAfter_) loop_.stop();
+  }
+  /// What comes when the next `count` events may come that the service now waits for.
+  Ids next(std::size_t count) {
+    ids_.clear();
+    stopAfter_ = count;
+    clock_.advance(clock_.waitForSleeper());
+    loop_.run();
+    return ids_;
+  }
+
+  vesk::ManualClock clock_;
+  vesk::SteadyClock steadyClock_;
+  vesk::RunLoop loop_{steadyClock_};
+  std::optional<vesk::WorkQueue> queue_{"test"};
+  Ids ids_;
+  std::vector<std::string> badLines_;
+  std::optional<std::string> failure_;
+  bool isEnded_ = false;
+  std::size_t stopAfter_ = 0;
+  std::shared_ptr<RecordedService> service_;
+  std::shared_ptr<client::Manager> manager_;
+};
+
+TEST_F(RecordedServiceTest, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) {
+  std::string recording;
+  Ids expected;
+  for (int id = 0; id < 5000; ++id) {
+    recording += line(id * 10.0, id);
+    expected.push_back(id);
+    if (id == 2) recording += "bad\n";
+  }
+  connect(vesk::fileWith(recording), {std::nullopt, false});
+  loop_.run();
+  EXPECT_TRUE(isEnded_);
+  EXPECT_EQ(ids_, expected);
+  EXPECT_EQ(badLines_, std::vector<std::string>{"r:4: no JSON object"});
+  EXPECT_EQ(failure_, std::nullopt);
+  const PlaybackState state = service_->state();
+  EXPECT_EQ(state.phase, Phase::ended);
+  EXPECT_EQ(state.position, 49990.0);
+  EXPECT_EQ(state.duration, 49990.0);
+  EXPECT_EQ(state.events, 5000U);
+  EXPECT_EQ(state.badLines, 1U);
+}
+
+TEST_F(RecordedServiceTest, KeepsTheRecordingsPaceAndDoesNotWaitForAStepBack) {
+  connect(vesk::fileWith(line(1, 1) + line(3, 3) + line(0.5, 4) + line(1.5, 5)), {2.0, false});
+  EXPECT_EQ(clock_.waitForSleeper(), 500ms);
+  EXPECT_EQ(next(1), Ids{1});
+  EXPECT_EQ(clock_.waitForSleeper(), 1s);
+  EXPECT_EQ(next(2), (Ids{3, 4}));
+  EXPECT_EQ(service_->state().phase, Phase::playing);
+  EXPECT_EQ(service_->state().position, 0.5);
+  clock_.advance(400ms);
+  EXPECT_EQ(clock_.waitForSleeper(), 100ms);
+  EXPECT_EQ(next(1), Ids{5});
+  // The end may have come together with the last event.
+  while (!isEnded_)
+    loop_.run();
+}
+
+TEST_F(RecordedServiceTest, GoesRoundAndTellsBadLinesOnce) {
+  connect(vesk::fileWith(line(0, 1) + "bad\n" + line(2, 2)), {1.0, true});
+  stopAfter_ = 1;
+  loop_.run();
+  for (int lap = 0; lap < 2; ++lap) {
+    EXPECT_EQ(clock_.waitForSleeper(), 2s);
+    EXPECT_EQ(next(2), (Ids{2, 1}));
+  }
+  EXPECT_EQ(badLines_.size(), 1U);
+}
+
+TEST_F(RecordedServiceTest, EndsRatherThanGoingRoundWithoutAnEvent) {
+  connect(vesk::fileWith("bad\n"), {std::nullopt, true});
+  loop_.run();
+  EXPECT_TRUE(isEnded_);
+  EXPECT_EQ(badLines_.size(), 1U);
+}
+
+TEST_F(RecordedServiceTest, PlaysAPipeAsItIsWrittenAndIsInterruptedWhileItWaitsForMore) {
+  vesk::Pipe pipe;
+  connect(std::move(pipe.reading), {std::nullopt, false});
+  for (int id = 1; id <= 2; ++id) {
+    vesk::writeAll(pipe.writing, line(id, id));
+    stopAfter_ = static_cast<std::size_t>(id);
+    loop_.run();
+  }
+  EXPECT_EQ(ids_, (Ids{1, 2}));
+  EXPECT_EQ(service_->state().duration, std::nullopt);
+  manager_.reset();
+  EXPECT_FALSE(isEnded_);
+}
+
+TEST_F(RecordedServiceTest, IsInterruptedWhileItWaitsForAnEventsTime) {
+  connect(vesk::fileWith(line(1e300, 1)), {1.0, false});
+  EXPECT_GT(clock_.waitForSleeper(), 1h);
+  manager_.reset();
+  EXPECT_TRUE(ids_.empty());
+}
+
+TEST_F(RecordedServiceTest, TellsWhyTheRecordingCouldNotBeRead) {
+  connect(vesk::FileDescriptor(open("/", O_RDONLY)), {1.0, true});
+  loop_.run();
+  EXPECT_EQ(failure_, "r: Is a directory");
+}
+
+}  // namespace
+}  // namespace corvik

@@ -1,0 +1,79 @@
+#pragma once
+
+#include <array>
+#include <cerrno>
+#include <cstdlib>
+#include <fcntl.h>
+#include <poll.h>
+#include <string>
+#include <sys/ioctl.h>
+#include <termios.h>
+#include <unistd.h>
+
+#include "platform/file_descriptor.h"
+#include "terminal/grid.h"
+
+namespace vesk {
+
+/// Waits until there is something to read; false after ten seconds, which is never.
+inline bool waitUntilReadable(int descriptor) {
+  pollfd polled{descriptor, POLLIN, 0};
+  int count = 0;
+  do
+    count = poll(&polled, 1, 10000);
+  while (count < 0 && errno == EINTR);
+  return count == 1;
+}
+
+/// A terminal whose user is the test.
+class PseudoTerminal {
+ public:
+  explicit PseudoTerminal(Size size) : user_(posix_openpt(O_RDWR | O_NOCTTY | O_NONBLOCK | O_CLOEXEC)) {
+    grantpt(user_.get());
+    unlockpt(user_.get());
+    program_ = openForProgram();
+    resize(size);
+  }
+
+  /// Another descriptor of the program's side.
+  [[nodiscard]] FileDescriptor openForProgram() const {
+    return FileDescriptor(open(ptsname(user_.get()), O_RDWR | O_NOCTTY | O_NONBLOCK | O_CLOEXEC));
+  }
+  void resize(Size size) const {
+    const winsize window{static_cast<unsigned short>(size.lines), static_cast<unsigned short>(size.columns), 0, 0};
+    ioctl(user_.get(), TIOCSWINSZ, &window);
+  }
+  [[nodiscard]] termios modes() const {
+    termios modes{};
+    tcgetattr(program_.get(), &modes);
+    return modes;
+  }
+  [[nodiscard]] bool isLineByLine() const { return (modes().c_lflag & (ICANON | ECHO)) == (ICANON | ECHO); }
+
+  void type(std::string_view bytes) const {
+    [[maybe_unused]] auto count = write(user_.get(), bytes.data(), bytes.size());
+  }
+  /// Everything that was written to the terminal up to and including `end`; what there was, if that never
+  /// came.
+  std::string readUpTo(std::string_view end) {
+    while (true) {
+      if (const std::size_t place = unread_.find(end); place != std::string::npos) {
+        const std::string taken = unread_.substr(0, place + end.size());
+        unread_.erase(0, taken.size());
+        return taken;
+      }
+      std::array<char, 4096> buffer;
+      if (!waitUntilReadable(user_.get())) return unread_;
+      const ssize_t count = read(user_.get(), buffer.data(), buffer.size());
+      if (count <= 0) return unread_;
+      unread_.append(buffer.data(), static_cast<std::size_t>(count));
+    }
+  }
+
+ private:
+  FileDescriptor user_;
+  FileDescriptor program_;
+  std::string unread_;
+};
+
+}  // namespace vesk

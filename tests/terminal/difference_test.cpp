@@ -1,0 +1,115 @@
+#include "terminal/difference.h"
+
+#include <cstdlib>
+#include <gtest/gtest.h>
+
+#include "support/pictures.h"
+#include "terminal/palette.h"
+
+namespace vesk {
+namespace {
+
+/// A terminal whose control strings can be read: <c> clear, <0> plain, <2> the look of role 2.
+Capabilities readable() {
+  Capabilities terminal;
+  terminal.moveTo = "<%p2%d,%p1%d>";
+  terminal.plain = "<0>";
+  terminal.clear = "<c>";
+  for (std::size_t role = 1; role < terminal.looks.size(); ++role)
+    terminal.looks[role] = "<" + std::to_string(role) + ">";
+  return terminal;
+}
+
+Grid gridOf(std::string_view text, Role role = Role::Plain) {
+  Grid grid({8, 2});
+  grid.write(0, 1, text, role, 8);
+  return grid;
+}
+
+TEST(Difference, WritesWhatChangedAndNothingElse) {
+  const std::string bar = std::to_string(static_cast<int>(Role::Bar));
+  struct {
+    Grid shown;
+    Grid wanted;
+    std::string bytes;
+  } const cases[] = {
+      {gridOf("abc"), gridOf("abc"), ""},
+      {gridOf("abcd"), gridOf("aXYd"), "<1,1><0>XY<0>"},
+      {gridOf("abcd"), gridOf("XbcY"), "<0,1><0>X<3,1>Y<0>"},
+      {gridOf("ab"), gridOf("ab", Role::Bar), "<0,1><0><" + bar + ">ab<0>"},
+      {gridOf("漢b"), gridOf("abc"), "<0,1><0>abc<0>"},
+      {gridOf("ab"), gridOf("漢"), "<0,1><0>漢<0>"},
+      {gridOf("a漢b"), gridOf("漢字"), "<0,1><0>漢字<0>"},
+      {gridOf("漢字"), gridOf("字字"), "<0,1><0>字<0>"},
+      {Grid(), gridOf("a"), "<0><c><0,1><0>a<0>"},
+      {Grid({3, 3}), Grid({8, 2}), "<0><c>"},
+  };
+  for (const auto& each : cases) {
+    std::string bytes;
+    appendDifference(bytes, each.shown, each.wanted, readable());
+    EXPECT_EQ(bytes, each.bytes);
+  }
+}
+
+TEST(Difference, PlacesTheCursorAnewAfterTheLastColumn) {
+  Grid wanted({2, 2});
+  for (int line = 0; line < 2; ++line)
+    wanted.write(0, line, "ab", Role::Plain, 2);
+  std::string bytes;
+  appendDifference(bytes, Grid({2, 2}), wanted, readable());
+  EXPECT_EQ(bytes, "<0,0><0>ab<0,1>ab<0>");
+}
+
+TEST(Difference, ShowsSignsThatAsciiHasWhereThatIsAllThereIs) {
+  Capabilities ascii = readable();
+  ascii.showsUtf8 = false;
+  std::string bytes;
+  appendDifference(bytes, Grid({8, 2}), gridOf("›•é漢x"), ascii);
+  EXPECT_EQ(bytes, "<0,1><0>>*???x<0>");
+}
+
+TEST(Palette, TakesColoursAsTheTerminalHasThem) {
+  EXPECT_EQ(colorDepthOf(256, ""), ColorDepth::TwoHundredFiftySix);
+  EXPECT_EQ(colorDepthOf(16777216, ""), ColorDepth::TwoHundredFiftySix);
+  EXPECT_EQ(colorDepthOf(16, ""), ColorDepth::Sixteen);
+  EXPECT_EQ(colorDepthOf(8, ""), ColorDepth::Sixteen);
+  EXPECT_EQ(colorDepthOf(-1, ""), ColorDepth::None);
+  EXPECT_EQ(colorDepthOf(256, "1"), ColorDepth::None);
+
+  EXPECT_EQ(backgroundOf("15;0"), Background::Dark);
+  EXPECT_EQ(backgroundOf("0;default;15"), Background::Light);
+  EXPECT_EQ(backgroundOf("12;8"), Background::Dark);
+  EXPECT_EQ(backgroundOf("15;default"), Background::Unknown);
+  EXPECT_EQ(backgroundOf(""), Background::Unknown);
+}
+
+TEST(Palette, NoMeaningHangsOnColourAlone) {
+  const auto look = [](const Palette& palette, Role role) { return palette[static_cast<std::size_t>(role)]; };
+  const Palette none = makePalette(ColorDepth::None, Background::Dark);
+  for (const Look& each : none) {
+    EXPECT_FALSE(each.foreground || each.background);
+  }
+  EXPECT_NE(look(none, Role::Selected), look(none, Role::Plain));
+  EXPECT_NE(look(none, Role::Changed), look(none, Role::Value));
+  EXPECT_NE(look(none, Role::SelectedChanged), look(none, Role::Selected));
+  EXPECT_NE(look(none, Role::Bar), look(none, Role::Plain));
+  EXPECT_NE(look(none, Role::SectionHeader), look(none, Role::Plain));
+}
+
+TEST(Palette, EachDepthKeepsToItsColoursAndEachBackgroundHasItsOwn) {
+  for (const Look& each : makePalette(ColorDepth::Sixteen, Background::Light)) {
+    EXPECT_LT(each.foreground.value_or(0), 8);
+    EXPECT_LT(each.background.value_or(0), 8);
+  }
+  for (const Background background : {Background::Light, Background::Dark, Background::Unknown}) {
+    for (const Look& each : makePalette(ColorDepth::TwoHundredFiftySix, background)) {
+      EXPECT_GE(each.foreground.value_or(16), 16);
+      EXPECT_GE(each.background.value_or(16), 16);
+    }
+  }
+  EXPECT_NE(makePalette(ColorDepth::TwoHundredFiftySix, Background::Light),
+            makePalette(ColorDepth::TwoHundredFiftySix, Background::Dark));
+}
+
+}  // namespace
+}  // namespace vesk

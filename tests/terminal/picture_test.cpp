@@ -1,0 +1,263 @@
+#include <gtest/gtest.h>
+
+#include "support/fake_interface.h"
+#include "support/pictures.h"
+
+namespace vesk {
+namespace {
+
+constexpr std::size_t kTxPower = 4;
+
+FakeTableScreen::Row row(std::string_view name, std::string_view value) {
+  return FakeTableScreen::row(name, value);
+}
+
+std::vector<FakeTableScreen::Section> power(std::string_view power) {
+  return {{"TxPowerInfo 0"_text, {row("tx_power", power), row("chan", "3"), row("漢字", "名")}},
+          {"TxPowerInfo 1"_text, {row("bearers", "{id: 5,\n qci: 9}"), {}}}};
+}
+
+Surroundings replaying() {
+  Surroundings surroundings;
+  surroundings.sourceState = [] { return SourceState{"replaying 3:12 of 9:40"}; };
+  return surroundings;
+}
+
+TEST(Picture, ShowsTheFirstScreen) {
+  FakeInterface interface;
+  Desk desk(interface.stack(), {40, 10}, replaying());
+  EXPECT_EQ(desk.picture(), R"(
+| Vesk            replaying 3:12 of 9:40
+|  Vesk
+|  Device Info                        ›
+|  LTE                                ›
+|  UMTS                               ›
+|  GSM                                ›
+|
+|
+|
+| ? help  Enter open  Esc back  / filter
+)");
+}
+
+TEST(Picture, ShowsSectionsNamesAndValuesWrappedWhereTheyNeedIt) {
+  FakeInterface interface;
+  interface.showFields(kTxPower, power("-19.5"));
+  Desk desk(interface.stack(), {40, 12}, replaying());
+  EXPECT_EQ(desk.picture(), R"(
+| … › Tx Power    replaying 3:12 of 9:40
+|  Tx Power
+| TxPowerInfo 0
+|  tx_power                       -19.5
+|  chan                               3
+|  漢字                              名
+| TxPowerInfo 1
+|  bearers
+|    {id: 5,
+|     qci: 9}
+|
+| ? help  Enter open  Esc back  / filter
+)");
+}
+
+TEST(Picture, KeepsNamesAndValuesTogetherOnAVeryWideTerminal) {
+  FakeInterface interface;
+  interface.showFields(kTxPower, power("-19.5"));
+  Desk desk(interface.stack(), {200, 24}, replaying());
+  EXPECT_EQ(desk.line(0), " Vesk › LTE › Tx Power" + std::string(155, ' ') + "replaying 3:12 of 9:40");
+  EXPECT_EQ(desk.line(3), "  tx_power" + std::string(84, ' ') + "-19.5");
+}
+
+TEST(Picture, WrapsALongValueBelowItsNameAndCutsItAtAFixedHeight) {
+  FakeInterface interface;
+  FakeTableScreen& fields = interface.showFields(
+      kTxPower, {{std::nullopt, {row("payload", "0x0102030405060708090a0b0c0d0e0f101112131415161718"), row("b", "")}}});
+  Desk desk(interface.stack());
+  EXPECT_EQ(desk.line(2), "  payload");
+  EXPECT_EQ(desk.line(3), "    0x0102030405060708090a0b0c0d0e0f10");
+  EXPECT_EQ(desk.line(4), "    1112131415161718");
+  EXPECT_EQ(desk.line(5), "  b");
+
+  fields.height = RowHeight::standard();
+  fields.tableView().reloadData();
+  EXPECT_EQ(desk.line(2), "  payload  0x0102030405060708090a0b0c…");
+  EXPECT_EQ(desk.line(3), "  b");
+
+  fields.height = RowHeight::ofLines(2);
+  fields.tableView().reloadData();
+  EXPECT_EQ(desk.line(3), "    0x0102030405060708090a0b0c0d0e0f1…");
+  EXPECT_EQ(desk.line(4), "  b");
+  EXPECT_EQ(desk.line(5), "");
+}
+
+TEST(Picture, MarksValuesThatChangedAtTheLastReloadForThatReload) {
+  FakeInterface interface;
+  FakeTableScreen& fields = interface.showFields(kTxPower, power("1"));
+  Desk desk(interface.stack(), {40, 14});
+  EXPECT_EQ(desk.line(3), "  tx_power                           1");
+
+  fields.content = power("2");
+  fields.content[0].rows.insert(fields.content[0].rows.begin(), row("new", "7"));
+  fields.tableView().reloadData();
+  EXPECT_EQ(desk.line(3), "• new                                7");
+  EXPECT_EQ(desk.line(4), "• tx_power                           2");
+  EXPECT_EQ(desk.line(5), "  chan                               3");
+  const Grid marked = desk.grid();
+  EXPECT_EQ(marked.at(37, 4).role, Role::Changed);
+  EXPECT_EQ(marked.at(37, 5).role, Role::Value);
+
+  fields.tableView().reloadData();
+  EXPECT_EQ(desk.line(4), "  tx_power                           2");
+}
+
+TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
+  FakeInterface interface;
+  interface.showFields(kTxPower, power("1"));
+  std::optional<Arrivals> arrivals = Arrivals{};
+  std::string asked;
+  Surroundings surroundings;
+  surroundings.arrivals = [&](std::string_view area, std::string_view category) {
+    asked = std::string(area) + "/" + std::string(category);
+    return arrivals;
+  };
+  Desk desk(interface.stack(), {40, 10}, surroundings);
+  EXPECT_EQ(desk.line(1), "  Tx Power  never");
+  EXPECT_EQ(asked, "LTE/Tx Power");
+  EXPECT_EQ(desk.presenter().nextChange(), std::nullopt);
+
+  using namespace std::chrono_literals;
+  struct {
+    Clock::Duration age;
+    std::uint64_t count;
+    std::string text;
+    Clock::Duration next;
+  } const cases[] = {
+      {0s, 1, "0 s ago, once", 1s},           {2900ms, 14, "2 s ago, 14 times", 3s},
+      {59999ms, 2, "59 s ago, 2 times", 60s}, {125s, 2, "2 min ago, 2 times", 180s},
+      {3h + 1s, 2, "3 h ago, 2 times", 4h},   {49h, 2, "2 d ago, 2 times", 72h},
+  };
+  for (const auto& each : cases) {
+    arrivals = Arrivals{desk.now() - each.age, each.count};
+    EXPECT_EQ(desk.line(1), "  Tx Power  " + each.text);
+    EXPECT_EQ(desk.presenter().nextChange(), desk.now() - each.age + each.next);
+  }
+  arrivals = std::nullopt;
+  EXPECT_EQ(desk.line(1), "  Tx Power");
+  asked.clear();
+  interface.stack().pop();
+  EXPECT_EQ(desk.line(1), "  LTE");
+  EXPECT_EQ(asked, "");
+}
+
+TEST(Picture, ShowsTheDiagnosticLinesInAPane) {
+  FakeInterface interface;
+  DiagnosticLines lines(2);
+  for (const char* line : {"gone", "pushing metric file", "Metric ID in Hex =  3C4E04 and a tail"})
+    lines.append(line);
+  Surroundings surroundings;
+  surroundings.diagnostics = &lines;
+  Desk desk(interface.stack(), {40, 12}, surroundings);
+  desk.type(U"d");
+  EXPECT_EQ(desk.picture(), R"(
+| Vesk
+|  Vesk
+|  Device Info                        ›
+|  LTE                                ›
+|  UMTS                               ›
+|  GSM                                ›
+|
+| Diagnostics                    3 lines
+| pushing metric file
+| Metric ID in Hex =  3C4E04 and a tail
+|
+| ? help  Enter open  Esc back  / filter
+)");
+  desk.type(U"d");
+  EXPECT_EQ(desk.line(7), "");
+}
+
+TEST(Picture, KeepsThePlaceInThePaneWhileLinesCome) {
+  FakeInterface interface;
+  DiagnosticLines lines(10);
+  const auto append = [&](int first, int last) {
+    for (int number = first; number <= last; ++number)
+      lines.append("line " + std::to_string(number));
+  };
+  Surroundings surroundings;
+  surroundings.diagnostics = &lines;
+  Desk desk(interface.stack(), {40, 12}, surroundings);
+  desk.type(U"d");
+  append(1, 8);
+  EXPECT_EQ(desk.line(10), " line 8");
+  desk.mouse(MouseAction::WheelUp, 5, 9);
+  append(9, 10);
+  EXPECT_EQ(desk.line(7), " Diagnostics              5 of 10 lines");
+  EXPECT_EQ(desk.line(10), " line 5");
+  append(11, 14);
+  EXPECT_EQ(desk.line(8), " line 5");
+  desk.type(U"[[");
+  EXPECT_EQ(desk.line(8), " line 5");
+  desk.type(U"]");
+  EXPECT_EQ(desk.line(10), " line 9");
+  desk.type(U"]]]");
+  append(15, 15);
+  EXPECT_EQ(desk.line(10), " line 15");
+}
+
+TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
+  FakeInterface interface;
+  Desk desk(interface.stack(), {80, 24});
+  desk.type(U"?");
+  EXPECT_EQ(desk.picture(), R"(
+| Vesk
+|  Keys
+|  ?                  show or leave this help
+|  Enter → l          open the selected row
+|  Esc ← h Backspace  clear the filter, go back
+|  /                  show only rows with what is typed
+|  f                  hold the screen; intake goes on
+|  d                  show or hide the diagnostic lines
+|  [                  older diagnostic lines
+|  ]                  newer diagnostic lines
+|  q                  end the program
+|  ↑ k                one row up
+|  ↓ j                one row down
+|  PgUp               one page up
+|  PgDn               one page down
+|  Home               the first row
+|  End                the last row
+|  click              select and open a row; on the path: go back
+|  wheel, drag        scroll
+|
+|
+|
+|
+| ? help  Enter open  Esc back  / filter  f freeze  d lines  q quit
+)");
+  desk.resize({40, 10});
+  desk.press(Key::End);
+  EXPECT_EQ(desk.line(8), "  wheel, drag        scroll");
+  desk.press(Key::Escape);
+  EXPECT_EQ(desk.line(2), "  Device Info                        ›");
+}
+
+TEST(Picture, SaysThatATerminalIsTooSmallAtEverySizeBelow) {
+  FakeInterface interface;
+  interface.showFields(kTxPower, power("1"));
+  Desk desk(interface.stack());
+  for (int columns = 0; columns <= 41; ++columns) {
+    for (int lines = 0; lines <= 11; ++lines) {
+      desk.resize({columns, lines});
+      desk.press(Key::Down);
+      desk.press(Key::PageUp);
+      const Grid grid = desk.grid();
+      const bool isTooSmall = columns < 40 || lines < 10;
+      if (columns >= 9 && lines > 0) {
+        EXPECT_EQ(grid.textOfLine(0) == "too small", isTooSmall);
+      }
+    }
+  }
+}
+
+}  // namespace
+}  // namespace vesk

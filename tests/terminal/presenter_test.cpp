@@ -1,0 +1,264 @@
+#include "terminal/presenter.h"
+
+#include <gtest/gtest.h>
+
+#include "support/fake_interface.h"
+#include "support/pictures.h"
+
+namespace vesk {
+namespace {
+
+std::vector<FakeTableScreen::Section> numbered(int rows, std::string_view value = "") {
+  FakeTableScreen::Section section{std::nullopt, {}};
+  for (int index = 0; index < rows; ++index)
+    section.rows.push_back(FakeTableScreen::row("row " + std::to_string(index), value));
+  return {section};
+}
+
+/// At 40 by 10 the list has 7 lines, 2 to 8.
+class PresenterTest : public testing::Test {
+ protected:
+  PresenterTest() {
+    surroundings_.setTracking = [this](bool isTracking) { tracking_.push_back(isTracking); };
+    surroundings_.quit = [this] { ++quits_; };
+    desk_.emplace(interface_.stack(), Size{40, 10}, surroundings_);
+  }
+
+  FakeTableScreen& showFields(std::vector<FakeTableScreen::Section> content) {
+    return interface_.showFields(0, std::move(content));
+  }
+  /// The name in the row that is selected, and the line it is in.
+  std::string selected() {
+    const int line = desk_->lineOf(Role::Selected);
+    if (line < 0) return "none";
+    const std::string text = desk_->line(line).substr(2);
+    return text.substr(0, text.find("  ")) + " in " + std::to_string(line);
+  }
+  [[nodiscard]] std::size_t depth() { return interface_.stack().stack().size(); }
+
+  FakeInterface interface_;
+  std::vector<bool> tracking_;
+  int quits_ = 0;
+  Surroundings surroundings_;
+  std::optional<Desk> desk_;
+};
+
+TEST_F(PresenterTest, WalksInAndOutWithTheSelectionKept) {
+  desk_->type(U"jj");
+  EXPECT_EQ(selected(), "UMTS in 4");
+  desk_->press(Key::Up);
+  desk_->press(Key::Enter);
+  EXPECT_EQ(desk_->line(0), " Vesk › LTE");
+  desk_->press(Key::Down);
+  desk_->press(Key::Right);
+  EXPECT_EQ(desk_->line(0), " Vesk › LTE › RRC State");
+  EXPECT_EQ(selected(), "none");
+  desk_->type(U"l");
+  EXPECT_EQ(depth(), 3U);
+
+  desk_->type(U"h");
+  EXPECT_EQ(selected(), "RRC State in 3");
+  desk_->press(Key::Backspace);
+  EXPECT_EQ(selected(), "LTE in 3");
+  desk_->press(Key::Escape);
+  desk_->press(Key::Left);
+  EXPECT_EQ(depth(), 1U);
+  EXPECT_EQ(quits_, 0);
+  desk_->type(U"q");
+  EXPECT_EQ(quits_, 1);
+}
+
+TEST_F(PresenterTest, ScrollsByKeys) {
+  showFields(numbered(30));
+  struct {
+    Key key;
+    std::string selected;
+    std::string firstLine;
+  } const steps[] = {
+      {Key::Up, "row 0 in 2", "  row 0"},         {Key::PageDown, "row 6 in 2", "  row 6"},
+      {Key::PageDown, "row 12 in 2", "  row 12"}, {Key::Up, "row 11 in 2", "  row 11"},
+      {Key::End, "row 29 in 8", "  row 23"},      {Key::Down, "row 29 in 8", "  row 23"},
+      {Key::PageUp, "row 23 in 8", "  row 17"},   {Key::Down, "row 24 in 8", "  row 18"},
+      {Key::Home, "row 0 in 2", "  row 0"},       {Key::PageUp, "row 0 in 2", "  row 0"},
+  };
+  for (const auto& step : steps) {
+    desk_->press(step.key);
+    EXPECT_EQ(selected(), step.selected);
+    EXPECT_EQ(desk_->line(2).substr(0, step.firstLine.size()), step.firstLine);
+  }
+}
+
+TEST_F(PresenterTest, WalksThroughARowTallerThanTheScreen) {
+  std::string tall = "0";
+  for (int line = 1; line < 12; ++line)
+    tall += "\n" + std::to_string(line);
+  showFields({{std::nullopt, {FakeTableScreen::row("tall", tall), FakeTableScreen::row("next", "")}}});
+  EXPECT_EQ(desk_->line(8).substr(0, 5), "    5");
+  for (int step = 0; step < 6; ++step)
+    desk_->press(Key::Down);
+  EXPECT_EQ(desk_->line(8).substr(0, 6), "    11");
+  EXPECT_EQ(desk_->lineOf(Role::Selected), 2);
+  desk_->press(Key::Down);
+  EXPECT_EQ(selected(), "next in 8");
+  desk_->press(Key::Home);
+  EXPECT_EQ(selected(), "tall in 2");
+}
+
+TEST_F(PresenterTest, AsksOnlyForRowsThatComeIntoView) {
+  FakeTableScreen& fields = showFields(numbered(1000));
+  desk_->picture();
+  EXPECT_EQ(fields.cellRequests, 7);
+  desk_->press(Key::Down);
+  desk_->picture();
+  EXPECT_EQ(fields.cellRequests, 7);
+  desk_->press(Key::PageDown);
+  desk_->picture();
+  EXPECT_LE(fields.cellRequests, 7 + 6 + 1);
+}
+
+TEST_F(PresenterTest, CopesWithAContentThatShrinksBeforeAndAtAReload) {
+  FakeTableScreen& fields = showFields(numbered(30));
+  fields.content = numbered(2);
+  desk_->press(Key::End);
+  EXPECT_EQ(desk_->line(8), std::string(39, ' ') + "█");
+  desk_->press(Key::Enter);
+  fields.tableView().reloadData();
+  EXPECT_EQ(selected(), "row 1 in 3");
+  fields.content.clear();
+  fields.tableView().reloadData();
+  EXPECT_EQ(selected(), "none");
+  for (const Key key : {Key::Down, Key::Up, Key::PageDown, Key::PageUp, Key::End, Key::Home, Key::Enter})
+    desk_->press(key);
+  desk_->click(5, 4);
+  EXPECT_EQ(desk_->line(2), "");
+}
+
+TEST_F(PresenterTest, FiltersWhileOneTypes) {
+  FakeTableScreen& fields =
+      showFields({{"PDP 0"_text, {FakeTableScreen::row("apn", "Internet"), FakeTableScreen::row("qci", "9")}},
+                  {"PDP 1"_text, {FakeTableScreen::row("apn", "ims"), FakeTableScreen::row("interval", "5")}},
+                  {"PDP 2"_text, {FakeTableScreen::row("qci", "5")}}});
+  desk_->type(U"/InTQ");
+  desk_->press(Key::Backspace);
+  EXPECT_EQ(desk_->picture(), R"(
+| Vesk › LTE › NAS
+|  NAS
+| PDP 0
+|  apn                         Internet
+| PDP 1
+|  interval                           5
+|
+|
+|
+| /InT▏ Enter keep  Esc clear
+)");
+  desk_->press(Key::Down);
+  EXPECT_EQ(selected(), "interval in 5");
+  desk_->press(Key::Enter);
+  EXPECT_EQ(desk_->line(9), " /InT  ? help  Enter open  Esc back");
+  fields.content[0].rows[0] = FakeTableScreen::row("apn", "other");
+  fields.tableView().reloadData();
+  EXPECT_EQ(desk_->line(2), " PDP 1");
+
+  desk_->press(Key::Escape);
+  EXPECT_EQ(selected(), "interval in 6");
+  EXPECT_EQ(depth(), 3U);
+  desk_->type(U"/zz");
+  EXPECT_EQ(desk_->line(2), "  no row has this");
+  desk_->press(Key::Escape);
+  desk_->press(Key::Escape);
+  EXPECT_EQ(depth(), 2U);
+}
+
+TEST_F(PresenterTest, TakesEveryLetterForTheFilterWhileItIsTyped) {
+  desk_->type(U"/qfdé");
+  EXPECT_EQ(quits_, 0);
+  EXPECT_EQ(desk_->line(9), " /qfdé▏ Enter keep  Esc clear");
+  for (int step = 0; step < 5; ++step)
+    desk_->press(Key::Backspace);
+  EXPECT_EQ(desk_->line(9), " ? help  Enter open  Esc back  / filter");
+  EXPECT_EQ(depth(), 1U);
+}
+
+TEST_F(PresenterTest, HoldsTheWholeScreenWhileFrozen) {
+  FakeTableScreen& fields = showFields(numbered(30, "old"));
+  desk_->type(U"f");
+  fields.content = numbered(10, "new");
+  fields.tableView().reloadData();
+  desk_->press(Key::End);
+  EXPECT_EQ(desk_->line(8), "  row 29                           old █");
+  EXPECT_EQ(desk_->line(1), "  NAS                           FROZEN");
+
+  desk_->type(U"f");
+  EXPECT_EQ(desk_->line(8), "• row 9                            new █");
+  EXPECT_EQ(desk_->line(1), "  NAS");
+
+  desk_->type(U"f");
+  desk_->press(Key::Escape);
+  EXPECT_EQ(desk_->line(1), "  LTE");
+}
+
+TEST_F(PresenterTest, TheMouseSelectsOpensScrollsAndGoesBack) {
+  desk_->click(5, 3);
+  EXPECT_EQ(desk_->line(0), " Vesk › LTE");
+  desk_->mouse(MouseAction::WheelDown, 5, 5);
+  EXPECT_EQ(selected(), "Serving Cell Info in 2");
+  desk_->mouse(MouseAction::WheelUp, 5, 5);
+  EXPECT_EQ(selected(), "Serving Cell Info in 4");
+  desk_->click(5, 6);
+  EXPECT_EQ(desk_->line(0), " Vesk › LTE › Tx Power");
+  desk_->click(9, 0);
+  EXPECT_EQ(desk_->line(0), " Vesk › LTE");
+  desk_->click(6, 0);
+  EXPECT_EQ(depth(), 2U);
+  desk_->click(1, 0);
+  EXPECT_EQ(depth(), 1U);
+  EXPECT_TRUE(tracking_.empty());
+}
+
+TEST_F(PresenterTest, TracksWhileTheListIsDragged) {
+  showFields(numbered(30));
+  desk_->mouse(MouseAction::Press, 5, 7);
+  EXPECT_TRUE(tracking_.empty());
+  desk_->mouse(MouseAction::Drag, 5, 4);
+  EXPECT_EQ(tracking_, std::vector<bool>{true});
+  EXPECT_EQ(selected(), "row 3 in 2");
+  desk_->mouse(MouseAction::Drag, 5, 5);
+  EXPECT_EQ(selected(), "row 3 in 3");
+  desk_->mouse(MouseAction::Release, 5, 5);
+  EXPECT_EQ(tracking_, (std::vector<bool>{true, false}));
+  EXPECT_EQ(depth(), 3U);
+}
+
+TEST_F(PresenterTest, StopsTrackingWhenTheReleaseIsLost) {
+  showFields(numbered(30));
+  const std::function<void()> interruptions[] = {
+      [&] { desk_->press(Key::Down); },
+      [&] {
+        desk_->resize({50, 12});
+      },
+      [&] { desk_->mouse(MouseAction::Press, 1, 1); },
+      [&] { desk_->presenter().forgetMouse(); },
+  };
+  for (const auto& interruption : interruptions) {
+    tracking_.clear();
+    desk_->mouse(MouseAction::Press, 5, 7);
+    desk_->mouse(MouseAction::Drag, 5, 4);
+    interruption();
+    EXPECT_EQ(tracking_, (std::vector<bool>{true, false}));
+  }
+}
+
+TEST_F(PresenterTest, StaysWithItsRowWhenTheTerminalIsResized) {
+  showFields(numbered(30));
+  desk_->press(Key::End);
+  desk_->resize({60, 15});
+  EXPECT_EQ(selected(), "row 29 in 13");
+  desk_->resize({20, 5});
+  desk_->picture();
+  desk_->resize({40, 10});
+  EXPECT_EQ(selected(), "row 29 in 8");
+}
+
+}  // namespace
+}  // namespace vesk

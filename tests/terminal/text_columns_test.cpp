@@ -1,0 +1,121 @@
+#include <clocale>
+#include <gtest/gtest.h>
+
+#include "support/pictures.h"
+#include "terminal/column_width.h"
+#include "terminal/grid.h"
+#include "terminal/path_bar.h"
+#include "terminal/wrapping.h"
+
+namespace vesk {
+namespace {
+
+std::string shown(std::string_view text) {
+  Grid grid({40, 1});
+  grid.write(0, 0, text, Role::Plain, 40);
+  return grid.textOfLine(0);
+}
+
+TEST(TextColumns, NothingThatActsOnATerminalReachesIt) {
+  ASSERT_TRUE(kHasUtf8Locale);
+  struct {
+    std::string_view text;
+    std::string_view shown;
+  } const cases[] = {
+      {"\x1b[31mred", "␛[31mred"},
+      {std::string_view("a\0b\tc\x7F", 6), "a␀b␉c␡"},
+      {"\xC2\x9B"
+       "31m",
+       "\uFFFD31m"},                         // the one-character CSI
+      {"\xFF\xC3", "\uFFFD\uFFFD"},          // no UTF-8
+      {"\u202Eab\u200D", "\uFFFDab\uFFFD"},  // turns the line's direction; joins what follows
+      {"\u0301x", "\uFFFDx"},                // a mark without a base
+      {"e\u0301", "e\u0301"},
+      {"漢字ｶ", "漢字ｶ"},
+  };
+  for (const auto& each : cases) {
+    EXPECT_EQ(shown(each.text), each.shown);
+  }
+}
+
+TEST(TextColumns, WidthsAreThoseOfTheTerminalWithAndWithoutAUtf8Locale) {
+  for (const char* locale : {"C.UTF-8", "C"}) {
+    std::setlocale(LC_CTYPE, locale);
+    EXPECT_EQ(textWidth("ab"), 2) << locale;
+    EXPECT_EQ(textWidth("漢字"), 4) << locale;
+    EXPECT_EQ(textWidth("e\u0301\u0302x"), 2) << locale;
+    EXPECT_EQ(textWidth("é›…"), 3) << locale;
+    EXPECT_EQ(columnWidth(0x1B), -1) << locale;
+    EXPECT_EQ(columnWidth(0x9B), -1) << locale;
+  }
+  setUpCharacterLocale();
+}
+
+TEST(TextColumns, MarksBeyondACellAreLeftOut) {
+  std::string marks = "e";
+  for (int mark = 0; mark < 1000; ++mark)
+    marks += "\u0301";
+  std::string_view rest = marks;
+  const Glyph glyph = takeGlyph(rest);
+  EXPECT_LE(glyph.bytes.size(), kLongestGlyph);
+  EXPECT_TRUE(rest.empty());
+}
+
+TEST(TextColumns, AGridNeverHoldsHalfAWideGlyph) {
+  Grid grid({4, 1});
+  EXPECT_EQ(grid.write(0, 0, "a漢字", Role::Plain, 4), 4);
+  EXPECT_EQ(grid.textOfLine(0), "a漢");
+  grid.write(2, 0, "x", Role::Plain, 4);
+  EXPECT_EQ(grid.textOfLine(0), "a x");
+  grid.write(0, 0, "漢字", Role::Plain, 4);
+  grid.write(1, 0, "字", Role::Plain, 4);
+  EXPECT_EQ(grid.textOfLine(0), " 字");
+  EXPECT_FALSE(grid.at(3, 0).isRightHalf());
+}
+
+TEST(TextColumns, TextIsWrappedAtLineFeedsThenBlanksThenAnywhere) {
+  struct {
+    std::string_view text;
+    int width;
+    std::vector<std::string_view> lines;
+  } const cases[] = {
+      {"", 10, {""}},
+      {"one two", 7, {"one two"}},
+      {"one two", 6, {"one", "two"}},
+      {"one  two", 4, {"one", "two"}},
+      {"abcdefgh", 3, {"abc", "def", "gh"}},
+      {"ab cdefgh", 4, {"ab", "cdef", "gh"}},
+      {"a\n\n  b\n", 5, {"a", "", "  b", ""}},
+      {"漢字漢", 5, {"漢字", "漢"}},
+      {"漢字", 1, {"漢", "字"}},
+      {"abc ", 3, {"abc"}},
+  };
+  for (const auto& each : cases) {
+    EXPECT_EQ(wrapText(each.text, each.width), each.lines) << each.text;
+  }
+}
+
+TEST(TextColumns, APathThatDoesNotFitLosesItsStart) {
+  const std::vector<std::string> names{"Vesk", "LTE", "Tx Power"};
+  struct {
+    int width;
+    std::string_view text;
+    std::size_t firstDepth;
+    int firstColumn;
+  } const cases[] = {
+      {21, "Vesk › LTE › Tx Power", 1, 0},
+      {20, "… › LTE › Tx Power", 2, 4},
+      {17, "… › Tx Power", 3, 4},
+      {3, "… › Tx Power", 3, 4},
+  };
+  for (const auto& each : cases) {
+    const PathBar bar = layOutPath(names, each.width);
+    EXPECT_EQ(bar.text, each.text);
+    EXPECT_EQ(bar.segments.front().depth, each.firstDepth);
+    EXPECT_EQ(bar.segments.front().column, each.firstColumn);
+    EXPECT_EQ(bar.segments.back().end, textWidth(bar.text));
+  }
+}
+
+}  // namespace
+}  // namespace vesk
