@@ -55,6 +55,10 @@ constexpr const char* kSimulateExamples =
     "  vesk simulate --seconds 600 > drive.jsonl\n"
     "  vesk simulate --seed 7 | vesk show LTE \"RRC State\" -";
 
+/// Where the system log usually goes: that of the program with its screens, and that of a command that prints data.
+constexpr const char* kProgramLog = "syslog";
+constexpr const char* kDataLog = "none";
+
 /// Where the system log goes.
 bool openLog(const std::string& to) {
   if (to == "none") return true;
@@ -106,7 +110,8 @@ class CommandLine {
     } catch (const CLI::ParseError& error) {
       return program_.exit(error) == 0 ? Outcome::done : Outcome::wrongUsage;
     }
-    if (!openLog(logTo_)) return Outcome::failed;
+    const char* usualLog = program_.get_subcommands().empty() ? kProgramLog : kDataLog;
+    if (!openLog(logTo_.value_or(usualLog))) return Outcome::failed;
     return command_();
   }
 
@@ -139,7 +144,7 @@ class CommandLine {
             "End after that many seconds")
         ->type_name("N")
         ->check(CLI::Range(0.001, 1e9));
-    addLogOption(program_, "syslog");
+    addLogOption(program_, kProgramLog);
     program_.callback([this] {
       if (program_.get_subcommands().empty()) command_ = [this] { return runProgram(run_); };
     });
@@ -148,7 +153,7 @@ class CommandLine {
   void addDecode() {
     CLI::App* decode = program_.add_subcommand("decode", "Print the events of a recording, one JSON line each");
     addRecording(*decode, recording_, "The recording; - or nothing for standard input");
-    addLogOption(*decode, "none");
+    addLogOption(*decode, kDataLog);
     decode->footer(kDecodeExamples);
     decode->final_callback([this] { command_ = [this] { return runDecode(recording_.value_or("-")); }; });
   }
@@ -156,7 +161,7 @@ class CommandLine {
   void addStores() {
     CLI::App* stores = program_.add_subcommand("stores", "Print what the stores hold at the end of a recording");
     addRecording(*stores, recording_, "The recording; - or nothing for standard input");
-    addLogOption(*stores, "none");
+    addLogOption(*stores, kDataLog);
     stores->footer(kStoresExamples);
     stores->final_callback([this] { command_ = [this] { return runStores(recording_.value_or("-")); }; });
   }
@@ -169,7 +174,7 @@ class CommandLine {
         ->type_name("");
     addRecording(*show, show_.path, "The recording; - for standard input, nothing for before any event");
     show->add_flag("--json", show_.asJson, "Print JSON");
-    addLogOption(*show, "none");
+    addLogOption(*show, kDataLog);
     show->footer(kShowExamples);
     show->final_callback([this] { command_ = [this] { return runShow(show_); }; });
   }
@@ -181,7 +186,7 @@ class CommandLine {
         ->type_name("N")
         ->default_str("60")
         ->check(CLI::Range(0.0, 1e9));
-    addLogOption(*simulate, "none");
+    addLogOption(*simulate, kDataLog);
     simulate->footer(kSimulateExamples);
     simulate->final_callback([this] { command_ = [this] { return runSimulate(simulate_); }; });
   }
@@ -190,15 +195,10 @@ class CommandLine {
     command.add_option("FILE", path, description)->type_name("");
   }
 
-  /// The usual sink of the command that is run is taken when no other was asked for.
   void addLogOption(CLI::App& command, const std::string& usual) {
-    CLI::Option* option =
-        command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
-            ->type_name("TO")
-            ->default_str(usual);
-    command.parse_complete_callback([this, option, usual] {
-      if (option->empty()) logTo_ = usual;
-    });
+    command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
+        ->type_name("TO")
+        ->default_str(usual);
   }
 
   CLI::App program_{"Radio metrics of a cellular handset, decoded and shown"};
@@ -206,7 +206,7 @@ class CommandLine {
   ShowOptions show_;
   SimulateOptions simulate_;
   std::optional<std::string> recording_;
-  std::string logTo_;
+  std::optional<std::string> logTo_;
   std::function<Outcome()> command_;
 };
 

@@ -123,10 +123,10 @@ class Filler {
         writer.writeBool(true, number);
         return true;
       case FieldType::enumeration: {
-        const auto& last = theSchema().enumerations.at(field.typeName).values.back();
-        const std::int32_t value = isExtreme_ ? -static_cast<std::int32_t>(next) : last.number;
-        writer.writeInt32(value, number);
-        return Text::copy(isExtreme_ ? "(unknown: " + std::to_string(value) + ")" : last.name);
+        const auto& values = theSchema().enumerations.at(field.typeName).values;
+        const auto& value = isExtreme_ ? values.back() : values[1];
+        writer.writeInt32(value.number, number);
+        return Text::copy(value.name);
       }
       default:
         writer.writeUInt32(isExtreme_ ? ~next : next, number);
