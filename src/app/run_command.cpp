@@ -26,7 +26,7 @@ class Run {
   explicit Run(const RunOptions& options) : options_(options), isHeadless_(options.isHeadless) {}
 
   Outcome run() {
-    source_ = makeEventSource(options_.source, clock(),
+    source_ = makeEventSource(options_.source, clock_,
                               {[this](const std::string& message) { tell(message); },
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
     corvik::installService(source_.service);
@@ -34,17 +34,13 @@ class Run {
     if (!isHeadless_) OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
     Application application(veskInterface(), delegate_);
     application.run([&](NavigationController& root) { mainLoop(application, root); });
+    // The connection outlives all that the service was made of here.
+    source_.service->shutDown();
     OutputLines::flush();
     return outcome_;
   }
 
  private:
-  /// What plays lives as long as the connection to it, which ends with the process.
-  static const Clock& clock() {
-    static const SteadyClock theClock;
-    return theClock;
-  }
-
   void mainLoop(Application& application, NavigationController& root) {
     stopMainLoopOnSignals();
     std::optional<Timer> end;
@@ -58,7 +54,7 @@ class Run {
 
   void openTerminal(Application& application, NavigationController& root) {
     std::string reason;
-    terminal_ = Terminal::open(root, clock(), surroundings(application), reason);
+    terminal_ = Terminal::open(root, clock_, surroundings(application), reason);
     if (terminal_ == nullptr) {
       tellUser("vesk: " + reason + "; running without screens");
       isHeadless_ = true;
@@ -76,7 +72,7 @@ class Run {
     return {
         .sourceState =
             [this] {
-              return SourceState{source_.state(), clock().now() + std::chrono::seconds(1)};
+              return SourceState{source_.state(), clock_.now() + std::chrono::seconds(1)};
             },
         .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
         .diagnostics = &diagnostics_,
@@ -111,11 +107,12 @@ class Run {
   }
 
   const RunOptions& options_;
+  const SteadyClock clock_;
   bool isHeadless_;
   Outcome outcome_ = Outcome::done;
-  RunLoop loop_{clock()};
+  RunLoop loop_{clock_};
   DiagnosticLines diagnostics_;
-  MetricArrivals arrivals_{clock()};
+  MetricArrivals arrivals_{clock_};
   EventSource source_;
   AppDelegate delegate_;
   std::unique_ptr<Terminal> terminal_;
