@@ -31,12 +31,16 @@ class Run {
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
     corvik::installService(source_.service);
     if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
-    if (!isHeadless_) OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    if (isHeadless_) {
+      printLines();
+    } else {
+      OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    }
     Application application(veskInterface(), delegate_);
     application.run([&](NavigationController& root) { mainLoop(application, root); });
     // The connection outlives all that the service was made of here.
     source_.service->shutDown();
-    OutputLines::flush();
+    OutputLines::setSink(nullptr);
     return outcome_;
   }
 
@@ -58,7 +62,7 @@ class Run {
     if (terminal_ == nullptr) {
       tellUser("vesk: " + reason + "; running without screens");
       isHeadless_ = true;
-      OutputLines::setSink(std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output"));
+      printLines();
       return;
     }
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
@@ -70,10 +74,7 @@ class Run {
 
   Surroundings surroundings(Application& application) {
     return {
-        .sourceState =
-            [this] {
-              return SourceState{source_.state(), clock_.now() + std::chrono::seconds(1)};
-            },
+        .sourceState = [this] { return sourceState(); },
         .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
         .diagnostics = &diagnostics_,
         .setTracking =
@@ -88,6 +89,23 @@ class Run {
               }
             },
     };
+  }
+
+  SourceState sourceState() {
+    const ShownState shown = source_.state();
+    if (!shown.isMoving) return {shown.text};
+    return {shown.text, clock_.now() + std::chrono::seconds(1)};
+  }
+
+  /// The lines go to standard output. When nobody reads them any more, there is nothing left to run for.
+  void printLines() {
+    auto sink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
+    sink->setInterrupt(&loop_.stopSignal());
+    sink->setFailureHandler([this](const std::string& reason) {
+      tell("vesk: " + reason);
+      loop_.stop();
+    });
+    OutputLines::setSink(std::move(sink));
   }
 
   /// To the user where there are no screens, and to the diagnostic lines where there are.

@@ -8,7 +8,7 @@
 #include <string_view>
 #include <utility>
 
-#include "intake/metric_identifiers.h"
+#include "messages/registry/metric_identifiers.h"
 #include "intake/technology_stores.h"
 #include "link/corvik_wrapper.h"
 #include "platform/date_format.h"
