@@ -4,8 +4,8 @@
 #include <deque>
 #include <span>
 
-#include "messages/registry/metric_of_message.h"
 #include "messages/codec/proto_writer.h"
+#include "messages/registry/metric_of_message.h"
 #include "platform/data.h"
 
 namespace vesk::handset {
