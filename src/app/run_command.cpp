@@ -31,18 +31,32 @@ class Run {
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
     corvik::installService(source_.service);
     if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
-    if (!isHeadless_) OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    if (isHeadless_) {
+      printLines();
+    } else {
+      OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    }
     Application application(veskInterface(), delegate_);
     application.run([&](NavigationController& root) { mainLoop(application, root); });
     // The connection outlives all that the service was made of here.
     source_.service->shutDown();
-    OutputLines::flush();
+    OutputLines::setSink(nullptr);
     return outcome_;
   }
 
  private:
+  /// The diagnostic lines on standard output. When they can no longer be written nothing is left to be done.
+  void printLines() {
+    auto sink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
+    sink->setFailureHandler([this](const std::string& reason) {
+      tell("vesk: " + reason);
+      loop_.stop();
+    });
+    sink->setInterrupt(&stopSignal_);
+    OutputLines::setSink(std::move(sink));
+  }
+
   void mainLoop(Application& application, NavigationController& root) {
-    stopMainLoopOnSignals();
     std::optional<Timer> end;
     if (options_.duration) {
       end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
@@ -58,7 +72,7 @@ class Run {
     if (terminal_ == nullptr) {
       tellUser("vesk: " + reason + "; running without screens");
       isHeadless_ = true;
-      OutputLines::setSink(std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output"));
+      printLines();
       return;
     }
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
@@ -111,6 +125,7 @@ class Run {
   bool isHeadless_;
   Outcome outcome_ = Outcome::done;
   RunLoop loop_{clock_};
+  const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
   MetricArrivals arrivals_{clock_};
   EventSource source_;
