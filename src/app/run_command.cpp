@@ -45,8 +45,18 @@ class Run {
   }
 
  private:
+  /// The diagnostic lines on standard output. When they can no longer be written nothing is left to be done.
+  void printLines() {
+    auto sink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
+    sink->setFailureHandler([this](const std::string& reason) {
+      tell("vesk: " + reason);
+      loop_.stop();
+    });
+    sink->setInterrupt(&stopSignal_);
+    OutputLines::setSink(std::move(sink));
+  }
+
   void mainLoop(Application& application, NavigationController& root) {
-    stopMainLoopOnSignals();
     std::optional<Timer> end;
     if (options_.duration) {
       end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
@@ -129,6 +139,7 @@ class Run {
   bool isHeadless_;
   Outcome outcome_ = Outcome::done;
   RunLoop loop_{clock_};
+  const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
   MetricArrivals arrivals_{clock_};
   EventSource source_;
