@@ -107,17 +107,6 @@ class Run {
     return {shown.text, clock_.now() + std::chrono::seconds(1)};
   }
 
-  /// The lines go to standard output. When nobody reads them any more, there is nothing left to run for.
-  void printLines() {
-    auto sink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
-    sink->setInterrupt(&loop_.stopSignal());
-    sink->setFailureHandler([this](const std::string& reason) {
-      tell("vesk: " + reason);
-      loop_.stop();
-    });
-    OutputLines::setSink(std::move(sink));
-  }
-
   /// To the user where there are no screens, and to the diagnostic lines where there are.
   void tell(const std::string& line) {
     outcome_ = Outcome::failed;
