@@ -1,6 +1,5 @@
 #include "app/decode_command.h"
 
-#include <charconv>
 #include <optional>
 #include <unistd.h>
 #include <variant>
@@ -15,16 +14,6 @@ namespace vesk {
 
 namespace {
 
-/// 0x and upper-case digits, as metric identifiers are written everywhere.
-void appendMetricId(std::string& out, std::int64_t metricId) {
-  char digits[16];
-  const auto result = std::to_chars(digits, std::end(digits), static_cast<std::uint64_t>(metricId), 16);
-  out += "0x";
-  for (const char* digit = digits; digit != result.ptr; ++digit) {
-    out += static_cast<char>(*digit >= 'a' ? *digit - 'a' + 'A' : *digit);
-  }
-}
-
 void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
   const MetricClass* metricClass = findMetricClass(event.metricId);
   std::optional<Dictionary> fields;
@@ -32,9 +21,9 @@ void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
 
   out += "{\"at\":";
   appendDecimal(out, event.at);
-  out += ",\"metric\":\"";
-  appendMetricId(out, event.metricId);
-  out += "\",\"class\":";
+  out += ",\"metric\":";
+  corvik::appendMetricId(out, event.metricId);
+  out += ",\"class\":";
   if (metricClass == nullptr) {
     out += "null";
   } else {
@@ -51,7 +40,7 @@ void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
   out += '}';
 }
 
-/// What a command does with the steps of a recording; each answers whether to go on.
+/// Decodes a recording step by step; each step answers whether to go on.
 class Decoding {
  public:
   explicit Decoding(const std::string& path) : reader_(path) {

@@ -67,25 +67,21 @@ struct RecordedEventParser::Fields {
   bool hasPayload = false;
 };
 
+void appendMetricId(std::string& out, std::int64_t metricId) {
+  if (metricId < 0) {
+    vesk::appendDecimal(out, metricId);
+    return;
+  }
+  out += "\"0x";
+  vesk::appendUpperHex(out, static_cast<std::uint64_t>(metricId));
+  out += '"';
+}
+
 void appendRecordedEvent(std::string& out, const RecordedEvent& event) {
   out += "{\"at\": ";
   vesk::appendDecimal(out, event.at);
   out += ", \"metric\": ";
-  if (event.metricId < 0) {
-    vesk::appendDecimal(out, event.metricId);
-  } else {
-    constexpr std::string_view kDigits = "0123456789ABCDEF";
-    std::array<char, 16> digits;
-    std::size_t first = digits.size();
-    std::int64_t rest = event.metricId;
-    do {
-      digits[--first] = kDigits[static_cast<std::size_t>(rest & 0x0F)];
-      rest >>= 4;
-    } while (rest != 0);
-    out += "\"0x";
-    out.append(digits.data() + first, digits.size() - first);
-    out += '"';
-  }
+  appendMetricId(out, event.metricId);
   out += ", \"payload\": \"";
   vesk::appendHex(out, event.payload);
   out += "\"}\n";

@@ -19,12 +19,16 @@ struct RecordedEvent {
   std::span<const std::uint8_t> payload;
 };
 
+/// Appends a metric identifier as JSON: "0x3C4E04", or an integer where it is negative.
+void appendMetricId(std::string& out, std::int64_t metricId);
+
 /// Appends the event's line, with its line feed:
 /// {"at": 12.5, "metric": "0x3C4E04", "payload": "0895"}
 void appendRecordedEvent(std::string& out, const RecordedEvent& event);
 
 /// Reads such lines: a JSON object with "at" (a number), "metric" (an integer or "0x…" text) and "payload"
-/// (hex text) in any order. Other keys are ignored.
+/// (hex text) in any order. Other keys are ignored, and what stands under
+/// them is not looked at. The hex text is taken as it stands, without escapes.
 class RecordedEventParser {
  public:
   /// A line must be followed by this many bytes that may be read, whatever they hold.

@@ -67,7 +67,6 @@ class Outbox {
  private:
   template <class MetricMessage>
   [[nodiscard]] HandsetEvent encode(MetricMessage& message, std::int64_t atMs) {
-    static_assert(kMetricId<MetricMessage> != 0);
     message.setTimestamp(timestamp(atMs));
     writer_.clear();
     message.writeTo(writer_);

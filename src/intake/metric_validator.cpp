@@ -1,6 +1,5 @@
 #include "intake/metric_validator.h"
 
-#include <charconv>
 #include <string>
 
 #include "intake/metric_table.h"
@@ -14,14 +13,10 @@ namespace {
 constexpr std::string_view metricIDKey = "kKeyMetricID";
 constexpr std::string_view payloadKey = "kKeyPayload";
 
-/// Upper-case hexadecimal of at least two characters, as of an unsigned number.
+/// Of at least two characters, as of an unsigned number.
 std::string hexadecimal(std::int64_t number) {
-  char digits[16];
-  const auto result = std::to_chars(digits, std::end(digits), static_cast<std::uint64_t>(number), 16);
-  std::string text(digits, result.ptr);
-  for (char& digit : text) {
-    if (digit >= 'a') digit = static_cast<char>(digit - 'a' + 'A');
-  }
+  std::string text;
+  appendUpperHex(text, static_cast<std::uint64_t>(number));
   return text.size() < 2 ? " " + text : text;
 }
 

@@ -7,6 +7,8 @@
 #include <syslog.h>
 #include <utility>
 
+#include "platform/visible_text.h"
+
 namespace vesk {
 
 namespace {
@@ -91,7 +93,8 @@ void SystemLog::write(const char* format, ...) {
   if (!isOpen()) return;
   std::va_list arguments;
   va_start(arguments, format);
-  const std::string line = formatted(format, arguments);
+  std::string line;
+  appendVisible(line, formatted(format, arguments));
   va_end(arguments);
   const std::lock_guard lock(state().mutex);
   if (state().sink != nullptr) state().sink->write(line);

@@ -17,7 +17,8 @@ class LogSink {
 
 [[nodiscard]] std::unique_ptr<LogSink> makeSyslogSink();
 [[nodiscard]] std::unique_ptr<LogSink> makeStandardErrorSink();
-/// Appends to the file; null when it cannot be opened, with errno telling why.
+/// Appends to the file, and drops what does not fit on a full disk; null when it cannot be opened, with errno telling
+/// why.
 [[nodiscard]] std::unique_ptr<LogSink> makeFileSink(const std::string& path);
 
 /// The log of the process. Without a sink, as at start, nothing is written.

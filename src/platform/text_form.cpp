@@ -2,6 +2,7 @@
 
 #include <array>
 #include <charconv>
+#include <cmath>
 #include <string_view>
 
 #include "platform/utf8.h"
@@ -28,7 +29,7 @@ void appendReal(std::string& out, Number number) {
   const std::size_t exponent = shortest.find('e');
   const std::string_view mantissa = shortest.substr(0, exponent);
   out += mantissa;
-  if (mantissa.find('.') == std::string_view::npos) out += ".0";
+  if (std::isfinite(number) && mantissa.find('.') == std::string_view::npos) out += ".0";
   if (exponent != std::string_view::npos) out += shortest.substr(exponent);
 }
 
@@ -61,6 +62,17 @@ void appendDecimal(std::string& out, float number) {
 }
 void appendDecimal(std::string& out, double number) {
   appendReal(out, number);
+}
+
+void appendUpperHex(std::string& out, std::uint64_t number) {
+  constexpr std::string_view kDigits = "0123456789ABCDEF";
+  std::array<char, 16> digits;
+  std::size_t first = digits.size();
+  do {
+    digits[--first] = kDigits[number & 0x0F];
+    number >>= 4;
+  } while (number != 0);
+  out.append(digits.data() + first, digits.size() - first);
 }
 
 void appendHex(std::string& out, std::span<const std::uint8_t> bytes) {

@@ -26,6 +26,8 @@ void appendDecimal(std::string& out, std::uint64_t number);
 /// Appends the shortest form that reads back as `number`, always with a point: 20.0, 1.4, 1.0e+20.
 void appendDecimal(std::string& out, float number);
 void appendDecimal(std::string& out, double number);
+/// Appends `number` in upper-case hexadecimal.
+void appendUpperHex(std::string& out, std::uint64_t number);
 /// Appends two lower-case digits a byte.
 void appendHex(std::string& out, std::span<const std::uint8_t> bytes);
 

@@ -13,12 +13,7 @@ struct Accessor {
 std::string emitAll(std::initializer_list<Accessor> accessors, const Variables& variables) {
   std::string out;
   for (const auto& [head, statement] : accessors) {
-    // Heads and statements are single lines: the line feed that expand() adds is taken off again.
-    std::string filledHead = expand(head, variables);
-    std::string filledStatement = expand(statement, variables);
-    filledHead.pop_back();
-    filledStatement.pop_back();
-    out += inlineFunction(filledHead, filledStatement);
+    out += inlineFunction(expandLine(head, variables), expandLine(statement, variables));
   }
   return out;
 }
@@ -26,7 +21,7 @@ std::string emitAll(std::initializer_list<Accessor> accessors, const Variables& 
 std::string emitScalarAccessors(const Field& field, const Variables& variables) {
   const Accessor getter =
       field.type == FieldType::enumeration
-          ? Accessor{"[[nodiscard]] $value$ $property$() const", "return has($bit$) ? $member$ : $default$;"}
+          ? Accessor{"[[nodiscard]] $value$ $property$() const", "return has($bit$) ? $member$ : $value$::$default$;"}
           : Accessor{"[[nodiscard]] $value$ $property$() const", "return $member$;"};
   return emitAll({getter,
                   {"void set$Property$($value$ value)", "assign($bit$, $member$, value);"},

@@ -22,8 +22,7 @@ std::string hashTerm(const Field& field) {
 std::string emitEquality(const MessageType& message) {
   std::string tests;
   for (const Field& field : fieldsByNumber(message)) {
-    std::string test = expand(sameness(field), fieldVariables(field));
-    test.pop_back();
+    const std::string test = expandLine(sameness(field), fieldVariables(field));
     const bool isComparison = field.isObject() && !field.isMessage();
     tests += conditional(isComparison ? "!(" + test + ")" : "!" + test, "return false;");
   }

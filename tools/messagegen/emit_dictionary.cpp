@@ -19,17 +19,12 @@ std::string dictionaryValue(const Field& field) {
   return field.type == FieldType::enumeration ? "nameOf($member$)" : "$member$";
 }
 
-std::string filled(std::string_view line, const Variables& variables) {
-  std::string text = expand(line, variables);
-  text.pop_back();
-  return text;
-}
-
 std::string appendStatement(const Field& field) {
   const Variables variables = fieldVariables(field);
-  const std::string append = filled("dictionary.append(\"$key$\"_text, " + dictionaryValue(field) + ");", variables);
+  const std::string append =
+      expandLine("dictionary.append(\"$key$\"_text, " + dictionaryValue(field) + ");", variables);
   if (field.isRepeatedScalar()) return append + "\n";
-  return conditional(filled(presenceTest(field), variables), append);
+  return conditional(expandLine(presenceTest(field), variables), append);
 }
 
 }  // namespace

@@ -59,11 +59,10 @@ Variables fieldVariables(const Field& field) {
       {"Element", capitalized(elementOf(field))},
       {"member", property + "_"},
       {"bit", "k" + capitalized(property)},
-      {"type", field.typeName},
       {"value", names.held},
       {"held", heldType(field, names)},
       {"initial", field.repeated ? "" : names.initial},
-      {"default", field.typeName + "::" + field.defaultName},
+      {"default", field.defaultName},
       {"read", names.read},
       {"write", names.write},
   };

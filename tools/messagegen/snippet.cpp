@@ -1,5 +1,6 @@
 #include "snippet.h"
 
+#include <algorithm>
 #include <stdexcept>
 
 namespace messagegen {
@@ -89,6 +90,12 @@ class Expansion {
 
 std::string expand(std::string_view snippet, const Variables& variables) {
   return Expansion(snippet, variables).run();
+}
+
+std::string expandLine(std::string_view snippet, const Variables& variables) {
+  std::string line = expand(snippet, variables);
+  line.pop_back();
+  return line;
 }
 
 std::string conditional(std::string_view condition, std::string_view statement) {

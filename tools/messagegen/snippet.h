@@ -17,6 +17,9 @@ inline constexpr std::size_t kLineWidth = 120;
 /// takes its line away. Throws std::logic_error that quotes the snippet when it names an unknown variable.
 [[nodiscard]] std::string expand(std::string_view snippet, const Variables& variables);
 
+/// The same for a snippet of one line, without its line feed.
+[[nodiscard]] std::string expandLine(std::string_view snippet, const Variables& variables);
+
 /// `if (condition) statement`, on one line where it fits.
 [[nodiscard]] std::string conditional(std::string_view condition, std::string_view statement);
 

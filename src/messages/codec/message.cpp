@@ -20,7 +20,8 @@ bool readUndeclaredField(FieldKey key, std::string_view messageClass, ProtoReade
   if (!KBBMetricUtility::isValidMetricIdTag(key.number, messageClass)) {
     return reader.skipField(key.number, key.wireType);
   }
-  SystemLog::write("Unknown tag: %x:%u", key.number, reader.readUInt32());
+  const std::uint32_t value = reader.readUInt32();
+  SystemLog::write("Unknown tag: %x:%u", key.number, value);
   return true;
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <bit>
 #include <cstdint>
 #include <memory>
@@ -175,7 +176,8 @@ template <class Element>
 template <class Element>
 [[nodiscard]] Array arrayOf(const MessageList<Element>& list) {
   Array array;
-  array.reserve(countOf(list));
+  if (!list) return array;
+  array.reserve(list->size());
   for (const auto& element : *list)
     array.append(element->dictionaryRepresentation());
   return array;

@@ -10,9 +10,12 @@
 
 namespace vesk {
 
-/// The identifier of the metric that a message class decodes; 0 for a class that is no metric of its own.
+/// The identifier of the metric that a message class decodes.
 template <class MetricMessage>
-inline constexpr std::int64_t kMetricId = 0;
+inline constexpr std::int64_t kMetricId = [] {
+  static_assert(sizeof(MetricMessage) == 0, "this class is no metric of its own");
+  return std::int64_t{};
+}();
 
 template <>
 inline constexpr std::int64_t kMetricId<metrics::KCellularSimCardFiles> = K_SIM_FILE_INFO;
