@@ -30,8 +30,7 @@ Outcome playRecording(const std::optional<std::string>& path,
                       const std::function<void(NavigationController& root)>& use) {
   OutputLines::setSink(nullptr);
   if (path && !hasMetricConfiguration()) return Outcome::failed;
-  // What plays lives as long as the connection to it, which ends with the process.
-  static const SteadyClock clock;
+  const SteadyClock clock;
   RunLoop loop(clock);
   Outcome outcome = Outcome::done;
   const auto fail = [&outcome](const std::string& reason) {
@@ -56,6 +55,8 @@ Outcome playRecording(const std::optional<std::string>& path,
     if (path) loop.run();
     use(root);
   });
+  // The connection outlives all that the service was made of here.
+  if (service != nullptr) service->shutDown();
   return outcome;
 }
 

@@ -26,27 +26,37 @@ class Run {
   explicit Run(const RunOptions& options) : options_(options), isHeadless_(options.isHeadless) {}
 
   Outcome run() {
-    source_ = makeEventSource(options_.source, clock(),
+    source_ = makeEventSource(options_.source, clock_,
                               {[this](const std::string& message) { tell(message); },
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
     corvik::installService(source_.service);
     if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
-    if (!isHeadless_) OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    if (isHeadless_) {
+      printLines();
+    } else {
+      OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    }
     Application application(veskInterface(), delegate_);
     application.run([&](NavigationController& root) { mainLoop(application, root); });
-    OutputLines::flush();
+    // The connection outlives all that the service was made of here.
+    source_.service->shutDown();
+    OutputLines::setSink(nullptr);
     return outcome_;
   }
 
  private:
-  /// What plays lives as long as the connection to it, which ends with the process.
-  static const Clock& clock() {
-    static const SteadyClock theClock;
-    return theClock;
+  /// The diagnostic lines on standard output. When they can no longer be written nothing is left to be done.
+  void printLines() {
+    auto sink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
+    sink->setFailureHandler([this](const std::string& reason) {
+      tell("vesk: " + reason);
+      loop_.stop();
+    });
+    sink->setInterrupt(&stopSignal_);
+    OutputLines::setSink(std::move(sink));
   }
 
   void mainLoop(Application& application, NavigationController& root) {
-    stopMainLoopOnSignals();
     std::optional<Timer> end;
     if (options_.duration) {
       end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
@@ -58,11 +68,11 @@ class Run {
 
   void openTerminal(Application& application, NavigationController& root) {
     std::string reason;
-    terminal_ = Terminal::open(root, clock(), surroundings(application), reason);
+    terminal_ = Terminal::open(root, clock_, surroundings(application), reason);
     if (terminal_ == nullptr) {
       tellUser("vesk: " + reason + "; running without screens");
       isHeadless_ = true;
-      OutputLines::setSink(std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output"));
+      printLines();
       return;
     }
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
@@ -74,10 +84,7 @@ class Run {
 
   Surroundings surroundings(Application& application) {
     return {
-        .sourceState =
-            [this] {
-              return SourceState{source_.state(), clock().now() + std::chrono::seconds(1)};
-            },
+        .sourceState = [this] { return sourceState(); },
         .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
         .diagnostics = &diagnostics_,
         .setTracking =
@@ -92,6 +99,12 @@ class Run {
               }
             },
     };
+  }
+
+  SourceState sourceState() {
+    const ShownState shown = source_.state();
+    if (!shown.isMoving) return {shown.text};
+    return {shown.text, clock_.now() + std::chrono::seconds(1)};
   }
 
   /// To the user where there are no screens, and to the diagnostic lines where there are.
@@ -111,11 +124,13 @@ class Run {
   }
 
   const RunOptions& options_;
+  const SteadyClock clock_;
   bool isHeadless_;
   Outcome outcome_ = Outcome::done;
-  RunLoop loop_{clock()};
+  RunLoop loop_{clock_};
+  const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
-  MetricArrivals arrivals_{clock()};
+  MetricArrivals arrivals_{clock_};
   EventSource source_;
   AppDelegate delegate_;
   std::unique_ptr<Terminal> terminal_;

@@ -11,16 +11,23 @@ namespace {
 
 /// Looked up beforehand: a handler may not.
 RunLoop* mainLoop = nullptr;
+const WakeUp* stopRequest = nullptr;
 
 }  // namespace
 
-void stopMainLoopOnSignals() {
+const WakeUp& stopMainLoopOnSignals() {
+  static const WakeUp theRequest;
+  stopRequest = &theRequest;
   mainLoop = &RunLoop::main();
   struct sigaction action {};
-  action.sa_handler = [](int /*signal*/) { mainLoop->stop(); };
+  action.sa_handler = [](int /*signal*/) {
+    stopRequest->signal();
+    mainLoop->stop();
+  };
   action.sa_flags = SA_RESTART;
   for (const int signal : {SIGINT, SIGTERM, SIGHUP})
     sigaction(signal, &action, nullptr);
+  return theRequest;
 }
 
 }  // namespace vesk

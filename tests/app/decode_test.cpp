@@ -1,9 +1,6 @@
 // The program itself, as a user runs it.
 
-#include <cstdio>
-#include <fstream>
-
-#include "support/child_process.h"
+#include "app/vesk_program.h"
 
 namespace vesk {
 namespace {
@@ -12,10 +9,6 @@ const std::string kConnected = R"({"at": 12.5, "metric": "0x3C4E04", "payload": 
 const std::string kConnectedDecoded =
     R"({"at":12.5,"metric":"0x3C4E04","class":"KCellularLteRrcState","status":"decoded",)"
     R"("fields":{"state":"KLTE_RRC_STATE_CONNECTED"}})";
-
-Finished vesk(std::vector<std::string> arguments, std::string_view input = "") {
-  return run(VESK_PROGRAM, std::move(arguments), input);
-}
 
 TEST(Decode, WritesALineForEveryEvent) {
   struct Case {
@@ -57,13 +50,12 @@ TEST(Decode, WritesALineForEveryEvent) {
 }
 
 TEST(Decode, GoesOnBehindLinesThatAreNoEvent) {
-  const std::string path = testing::TempDir() + "vesk-decode.jsonl";
-  std::ofstream(path) << kConnected + "\nbad\n\n{\"at\": 1}\n" + kConnected;
+  const TemporaryFile recording(kConnected + "\nbad\n\n{\"at\": 1}\n" + kConnected);
+  const std::string& path = recording.path();
   const Finished file = vesk({"decode", path});
   EXPECT_EQ(file.output, kConnectedDecoded + '\n' + kConnectedDecoded + '\n');
   EXPECT_EQ(file.error, path + ":2: no JSON object\n" + path + ":4: \"metric\": missing\n");
   EXPECT_EQ(file.status, 1);
-  std::remove(path.c_str());
 }
 
 TEST(Decode, TellsWhatItCannotRead) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cerrno>
+#include <csignal>
 #include <cstdlib>
 #include <gtest/gtest.h>
 #include <initializer_list>
@@ -39,6 +40,10 @@ class ChildProcess {
     if (process_ > 0) waitForExit();
   }
 
+  int endBy(int signal) {
+    kill(process_, signal);
+    return waitForExit();
+  }
   /// Its exit status, or the negative number of the signal that ended it.
   int waitForExit() {
     int status = 0;

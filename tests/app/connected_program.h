@@ -1,0 +1,100 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "app/app_delegate.h"
+#include "app/vesk_interface.h"
+#include "corvik/service.h"
+#include "intake/metric_validator.h"
+#include "link/corvik_wrapper.h"
+#include "platform/run_loop.h"
+#include "platform/text_form.h"
+#include "support/recorded_log.h"
+
+namespace vesk {
+
+using Lines = std::vector<std::string>;
+
+/// Notes the commands it executes or refuses, and lets the test raise events.
+class NotingService : public corvik::Service {
+ public:
+  corvik::Result perform(const Text& command, const InterProcessDictionary& message) override {
+    if (notes != nullptr) notes->push_back(std::string(command.view()) + ' ' + textOf(message.ordinary().value()));
+    return Service::perform(command, message);
+  }
+
+  Lines* notes = nullptr;
+  corvik::EventStream* events = nullptr;
+
+ private:
+  void start(corvik::EventStream& stream) override { events = &stream; }
+  void stop() override { events = nullptr; }
+  corvik::Result answer(const corvik::MetricQuery&, corvik::EventStream&) override { return {}; }
+};
+
+/// The whole program in this process, over a service of the test's. The link and the intake are the process's, and stay
+/// connected to that service; each of these starts with empty stores.
+class ConnectedProgram {
+ public:
+  ConnectedProgram() {
+    const auto fresh = MetricValidator::listeningTo(nullptr);
+    for (const auto& [name, record] : kLatestRecords)
+      (*intake).*record = (*fresh).*record;
+    intake->myLTE = fresh->myLTE;
+    intake->myUMTS = fresh->myUMTS;
+    intake->myGSM = fresh->myGSM;
+    intake->myCommon = fresh->myCommon;
+  }
+  ConnectedProgram(const ConnectedProgram&) = delete;
+  ConnectedProgram& operator=(const ConnectedProgram&) = delete;
+  ~ConnectedProgram() {
+    deliverAll();
+    service.refuseAll(std::nullopt);
+  }
+
+  /// Its exit status; `use` is what its user does between launch and end.
+  int run(const std::function<void(NavigationController& root)>& use) {
+    return Application(veskInterface(), delegate).run(use);
+  }
+
+  void raise(std::int64_t metricId, std::span<const std::uint8_t> payload) {
+    service.events->raise(corvik::kEventMetric, corvik::makeMetricEvent(metricId, payload));
+  }
+  /// Runs until everything raised before is in the stores.
+  void deliverAll() {
+    service.events->afterDelivery([this] { loop_.stop(); });
+    loop_.run();
+  }
+
+ private:
+  struct Connection {
+    Connection() {
+      corvik::installService(service);
+      const RecordedLog log;
+      MetricValidator::shared();
+      linesOfMaking = log.lines();
+    }
+
+    std::shared_ptr<NotingService> service = std::make_shared<NotingService>();
+    Lines linesOfMaking;
+  };
+  static Connection& connection() {
+    static Connection theConnection;
+    return theConnection;
+  }
+
+  const SteadyClock clock_;
+  RunLoop loop_{clock_};
+
+ public:
+  NotingService& service = *connection().service;
+  /// What the system log was told when the link and the intake were made.
+  const Lines& linesOfMaking = connection().linesOfMaking;
+  const std::shared_ptr<MetricValidator>& intake = MetricValidator::shared();
+  AppDelegate delegate;
+};
+
+}  // namespace vesk
