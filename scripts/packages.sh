@@ -18,6 +18,9 @@ clang     clang               clang++
 format    clang-format        clang-format
 tidy      clang-tidy          clang-tidy
 schema    protobuf-compiler   protoc
+manual    groff               groff
+readme    jq                  jq
+readme    bsdutils            script
 shell     shellcheck          shellcheck
 '
 

@@ -22,20 +22,20 @@ std::string playingTime(double seconds) {
   return text;
 }
 
-std::string shown(const corvik::PlaybackState& state) {
+ShownState shown(const corvik::PlaybackState& state) {
   using Phase = corvik::PlaybackState::Phase;
   switch (state.phase) {
     case Phase::notStarted:
     case Phase::waitingForInput:
-      return "waiting";
+      return {"waiting"};
     case Phase::ended:
-      return "ended";
+      return {"ended"};
     case Phase::playing:
       break;
   }
   // A pipe has no length, and is as good as live.
-  if (!state.duration) return "live";
-  return "replaying " + playingTime(state.position) + " of " + playingTime(*state.duration);
+  if (!state.duration) return {"live"};
+  return {"replaying " + playingTime(state.position) + " of " + playingTime(*state.duration), true};
 }
 
 }  // namespace
@@ -45,7 +45,7 @@ EventSource makeEventSource(const SourceOptions& options, const Clock& clock, So
     const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
     const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
     return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
-            [] { return std::string("simulated"); }};
+            [] { return ShownState{"simulated"}; }};
   }
   auto service =
       std::make_shared<corvik::RecordedService>(corvik::RecordingReader(*options.replay), clock, options.playback);

@@ -21,11 +21,18 @@ struct SourceOptions {
   corvik::Playback playback;
 };
 
+/// What a status bar shows of a source.
+struct ShownState {
+  /// "live", "replaying 3:12 of 9:40", "waiting", "ended".
+  std::string text;
+  /// Whether the text changes with the seconds.
+  bool isMoving = false;
+};
+
 /// A service with what the program shows of it.
 struct EventSource {
   std::shared_ptr<corvik::Service> service;
-  /// "live", "replaying 3:12 of 9:40", "waiting", "ended".
-  std::function<std::string()> state;
+  std::function<ShownState()> state;
 };
 
 /// What an event source tells; both on the main queue.

@@ -87,10 +87,7 @@ class Run {
 
   Surroundings surroundings(Application& application) {
     return {
-        .sourceState =
-            [this] {
-              return SourceState{source_.state(), clock_.now() + std::chrono::seconds(1)};
-            },
+        .sourceState = [this] { return sourceState(); },
         .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
         .diagnostics = &diagnostics_,
         .setTracking =
@@ -105,6 +102,12 @@ class Run {
               }
             },
     };
+  }
+
+  SourceState sourceState() {
+    const ShownState shown = source_.state();
+    if (!shown.isMoving) return {shown.text};
+    return {shown.text, clock_.now() + std::chrono::seconds(1)};
   }
 
   /// To the user where there are no screens, and to the diagnostic lines where there are.

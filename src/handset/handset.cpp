@@ -1,6 +1,7 @@
 #include "handset/handset.h"
 
 #include "handset/sim_card.h"
+#include "handset/triggers.h"
 
 namespace vesk::handset {
 

@@ -4,6 +4,8 @@
 #include <string>
 #include <utility>
 
+#include "handset/triggers.h"
+
 namespace vesk::handset {
 
 using ::corvik::EventStream;

@@ -1,5 +1,7 @@
 #include "handset/lte_mode.h"
 
+#include "handset/triggers.h"
+
 namespace vesk::handset {
 
 using namespace metrics;

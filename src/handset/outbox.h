@@ -4,8 +4,8 @@
 #include <deque>
 #include <span>
 
-#include "handset/metric_ids.h"
 #include "messages/codec/proto_writer.h"
+#include "messages/registry/metric_of_message.h"
 #include "platform/data.h"
 
 namespace vesk::handset {
@@ -47,7 +47,7 @@ class Outbox {
   void tellRadioLinkFailure() {
     writer_.clear();
     writer_.writeUInt64(timestamp(ms_), 1);
-    events_.push_back(makeMetric(kLteRadioLinkFailure, ms_));
+    events_.push_back(makeMetric(K_LTE_RLF, ms_));
     ++ms_;
   }
   void raiseTrigger(std::int64_t id) {

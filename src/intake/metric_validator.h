@@ -8,9 +8,9 @@
 #include <string_view>
 #include <utility>
 
-#include "intake/metric_identifiers.h"
 #include "intake/technology_stores.h"
 #include "link/corvik_wrapper.h"
+#include "messages/registry/metric_identifiers.h"
 #include "platform/date_format.h"
 #include "platform/value.h"
 

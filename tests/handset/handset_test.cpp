@@ -29,14 +29,14 @@ TEST(HandsetTest, TheSeedAndTheStartMakeTheDrive) {
 }
 
 TEST(HandsetTest, TellsEveryKindWithinTheFirstMinute) {
-  std::set<std::int64_t> expected{kLteRadioLinkFailure};
+  std::set<std::int64_t> expected{K_LTE_RLF};
   for (std::int64_t id = 0x3C0000; id <= 0x3CFFFF; ++id) {
     if (findMetricClass(id) != nullptr) expected.insert(id);
   }
   for (std::uint64_t seed = 0; seed < 10; ++seed) {
     std::set<std::int64_t> told;
     // These two come now and then, and when asked for.
-    told.insert({kLteRadioLinkFailure, kMetricId<metrics::KCellularSimCardFiles>});
+    told.insert({K_LTE_RLF, kMetricId<metrics::KCellularSimCardFiles>});
     std::size_t triggers = 0;
     for (const HandsetEvent& event : drivenEvents(seed, 60)) {
       if (event.kind == HandsetEvent::Kind::metric) {
@@ -56,7 +56,7 @@ TEST(HandsetTest, EveryMetricIsReadBackWithItsClassAndStampedWithItsTime) {
   for (const HandsetEvent& event : drivenEvents(3, 1200)) {
     ASSERT_GE(event.atMs, lastMs);
     lastMs = event.atMs;
-    hasFailed |= event.id == kLteRadioLinkFailure;
+    hasFailed |= event.id == K_LTE_RLF;
     if (findMetricClass(event.id) == nullptr) continue;
     const auto fields = fieldsOf(event);
     ASSERT_TRUE(fields) << event.id;

@@ -1,0 +1,126 @@
+# Completion of vesk's command line for bash.
+
+# The categories of an area, one a line.
+_vesk_categories() {
+  case $1 in
+    'Device Info')
+      printf '%s\n' 'IMSI' \
+        'IMEISV' \
+        'SIM Files'
+      ;;
+    LTE)
+      printf '%s\n' 'NAS' \
+        'RRC State' \
+        'Serving Cell Info' \
+        'Serving Cell Meas' \
+        'Tx Power' \
+        'Sel Resel Parameters' \
+        'EUTRA Neighbor Info' \
+        'C-DRX' \
+        'LTE Neighbor Cell Meas' \
+        'UMTS Neighbor Cell Meas' \
+        'GSM Neighbor Cell Meas' \
+        'CA Status' \
+        'Active Bearers'
+      ;;
+    UMTS)
+      printf '%s\n' 'NAS GMM' \
+        'NAS MM' \
+        'RRC State' \
+        'RRC Configuration' \
+        'Serving Cell Info' \
+        'Serving Cell Meas' \
+        'Tx Power' \
+        'Sel Resel Parameters' \
+        'EUTRA Neighbor Info' \
+        'UTRA Neighbor Info' \
+        'GSM Neighbor Info' \
+        'LTE Neighbor Cell Meas' \
+        'UMTS Neighbor Cell Meas' \
+        'GSM Neighbor Cell Meas' \
+        'Active Bearers'
+      ;;
+    GSM)
+      printf '%s\n' 'NAS GMM' \
+        'NAS MM' \
+        'Serving Cell Info' \
+        'Idle Config' \
+        'Idle Serv Cell Meas' \
+        'Connected Serv Cell Meas' \
+        'GSM GPRS Config' \
+        'LTE Neighbor Cell Meas' \
+        'UMTS Neighbor Cell Meas' \
+        'GSM Neighbor Cell Meas' \
+        'Active Bearers'
+      ;;
+  esac
+}
+
+# Offers the lines of standard input that go on from the word at the cursor, quoted as the shell needs them.
+_vesk_offer() {
+  local line word
+  # What is typed may be quoted already, and half a quotation cannot be read: then it is taken as it stands.
+  word=${cur//[\\\'\"]/}
+  while IFS= read -r line; do
+    if [[ $line == "$word"* ]]; then
+      case $cur in
+        \'*) COMPREPLY+=("'$line'") ;;
+        \"*) COMPREPLY+=("\"$line\"") ;;
+        *) COMPREPLY+=("$(printf '%q' "$line")") ;;
+      esac
+    fi
+  done
+}
+
+_vesk_files() {
+  compopt -o filenames
+  mapfile -t COMPREPLY < <(compgen -f -- "$cur")
+}
+
+_vesk() {
+  local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
+  local command='' word skip='' arguments=() options='--replay --headless --speed --seed --loop --seconds --log --version'
+  COMPREPLY=()
+
+  for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
+    if [[ -n $skip ]]; then
+      skip=''
+    elif [[ $word == --@(replay|speed|seed|seconds|log) ]]; then
+      skip=1
+    elif [[ $word != -?* && -z $command ]]; then
+      command=$word
+    elif [[ $word != -?* ]]; then
+      arguments+=("${word//[\\\'\"]/}")
+    fi
+  done
+
+  case $previous in
+    --replay) _vesk_files && return ;;
+    --speed) _vesk_offer < <(printf '%s\n' 1 2 5 10 max) && return ;;
+    --log)
+      _vesk_files
+      _vesk_offer < <(printf '%s\n' syslog stderr none)
+      return
+      ;;
+    --seed | --seconds) return ;;
+  esac
+
+  case $command in
+    decode | stores) options='--log' ;;
+    show) options='--json --log' ;;
+    simulate) options='--seed --seconds --log' ;;
+  esac
+  if [[ $cur == -* ]]; then
+    mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
+  elif [[ -z $command ]]; then
+    mapfile -t COMPREPLY < <(compgen -W 'decode stores show simulate' -- "$cur")
+  elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
+    _vesk_offer < <(printf '%s\n' 'Device Info' LTE UMTS GSM)
+  elif [[ $command == show && ${#arguments[@]} == 1 ]]; then
+    _vesk_offer < <(_vesk_categories "${arguments[0]}")
+  elif [[ $command != simulate ]]; then
+    _vesk_files
+  fi
+}
+
+complete -F _vesk vesk
