@@ -73,6 +73,9 @@ class Run {
       tellUser("vesk: " + reason + "; running without screens");
       isHeadless_ = true;
       printLines();
+      // The lines of the start were meant for the pane.
+      for (const std::string& line : diagnostics_.lines())
+        OutputLines::print({line});
       return;
     }
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {

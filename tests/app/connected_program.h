@@ -35,6 +35,24 @@ class NotingService : public corvik::Service {
   corvik::Result answer(const corvik::MetricQuery&, corvik::EventStream&) override { return {}; }
 };
 
+/// The process's link and intake, made over a service of the test's.
+struct ProcessConnection {
+  ProcessConnection() {
+    corvik::installService(service);
+    const RecordedLog log;
+    MetricValidator::shared();
+    linesOfMaking = log.lines();
+  }
+
+  std::shared_ptr<NotingService> service = std::make_shared<NotingService>();
+  Lines linesOfMaking;
+
+  static ProcessConnection& shared() {
+    static ProcessConnection theConnection;
+    return theConnection;
+  }
+};
+
 /// The whole program in this process, over a service of the test's. The link and the intake are the process's, and stay
 /// connected to that service; each of these starts with empty stores.
 class ConnectedProgram {
@@ -57,8 +75,10 @@ class ConnectedProgram {
 
   /// Its exit status; `use` is what its user does between launch and end.
   int run(const std::function<void(NavigationController& root)>& use) {
-    return Application(veskInterface(), delegate).run(use);
+    return Application(veskInterface(), delegate_).run(use);
   }
+
+  [[nodiscard]] const Window& window() const { return *delegate_.window(); }
 
   void raise(std::int64_t metricId, std::span<const std::uint8_t> payload) {
     service.events->raise(corvik::kEventMetric, corvik::makeMetricEvent(metricId, payload));
@@ -69,32 +89,15 @@ class ConnectedProgram {
     loop_.run();
   }
 
+  NotingService& service = *ProcessConnection::shared().service;
+  /// What the system log was told when the link and the intake were made.
+  const Lines& linesOfMaking = ProcessConnection::shared().linesOfMaking;
+  const std::shared_ptr<MetricValidator>& intake = MetricValidator::shared();
+
  private:
-  struct Connection {
-    Connection() {
-      corvik::installService(service);
-      const RecordedLog log;
-      MetricValidator::shared();
-      linesOfMaking = log.lines();
-    }
-
-    std::shared_ptr<NotingService> service = std::make_shared<NotingService>();
-    Lines linesOfMaking;
-  };
-  static Connection& connection() {
-    static Connection theConnection;
-    return theConnection;
-  }
-
   const SteadyClock clock_;
   RunLoop loop_{clock_};
-
- public:
-  NotingService& service = *connection().service;
-  /// What the system log was told when the link and the intake were made.
-  const Lines& linesOfMaking = connection().linesOfMaking;
-  const std::shared_ptr<MetricValidator>& intake = MetricValidator::shared();
-  AppDelegate delegate;
+  AppDelegate delegate_;
 };
 
 }  // namespace vesk

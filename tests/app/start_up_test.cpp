@@ -91,7 +91,7 @@ TEST(StartUp, PushesTheConfigurationAndAsksForTheSimFilesUnlessSomethingIsInTheW
     auto output = OutputLines::setSink(std::make_unique<Narrator>(story));
     auto log = SystemLog::setSink(std::make_unique<Narrator>(story));
     const int status = program.run([&](NavigationController& root) {
-      EXPECT_EQ(&program.delegate.window()->rootNavigationController(), &root);
+      EXPECT_EQ(&program.window().rootNavigationController(), &root);
       EXPECT_NE(dynamic_cast<RootNavigationController*>(&root), nullptr);
       ASSERT_EQ(root.stack().size(), 1U);
       EXPECT_NE(dynamic_cast<VeskViewController*>(root.topViewController().get()), nullptr);

@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 #include <initializer_list>
 #include <string>
+#include <sys/ioctl.h>
 #include <sys/wait.h>
 #include <unistd.h>
 #include <vector>
@@ -20,19 +21,17 @@ class ChildProcess {
  public:
   /// Reads `input`, writes to `output` and `error`; they may be closed here once it runs.
   ChildProcess(const std::string& program, std::vector<std::string> arguments, const FileDescriptor& input,
-               const FileDescriptor& output, const FileDescriptor& error) {
-    std::vector<char*> argv;
-    arguments.insert(arguments.begin(), program);
-    for (std::string& argument : arguments)
-      argv.push_back(argument.data());
-    argv.push_back(nullptr);
-    process_ = fork();
+               const FileDescriptor& output, const FileDescriptor& error)
+      : process_(fork()) {
+    if (process_ == 0) become(program, std::move(arguments), input, output, error);
+  }
+  /// Runs on that terminal, in a session of its own.
+  ChildProcess(const std::string& program, std::vector<std::string> arguments, const FileDescriptor& terminal)
+      : process_(fork()) {
     if (process_ != 0) return;
-    dup2(input.get(), STDIN_FILENO);
-    dup2(output.get(), STDOUT_FILENO);
-    dup2(error.get(), STDERR_FILENO);
-    execv(program.c_str(), argv.data());
-    _exit(127);
+    setsid();
+    ioctl(terminal.get(), TIOCSCTTY, 0);
+    become(program, std::move(arguments), terminal, terminal, terminal);
   }
   ChildProcess(const ChildProcess&) = delete;
   ChildProcess& operator=(const ChildProcess&) = delete;
@@ -53,6 +52,21 @@ class ChildProcess {
   }
 
  private:
+  [[noreturn]] static void become(const std::string& program, std::vector<std::string> arguments,
+                                  const FileDescriptor& input, const FileDescriptor& output,
+                                  const FileDescriptor& error) {
+    std::vector<char*> argv;
+    arguments.insert(arguments.begin(), program);
+    for (std::string& argument : arguments)
+      argv.push_back(argument.data());
+    argv.push_back(nullptr);
+    dup2(input.get(), STDIN_FILENO);
+    dup2(output.get(), STDOUT_FILENO);
+    dup2(error.get(), STDERR_FILENO);
+    execv(program.c_str(), argv.data());
+    _exit(127);
+  }
+
   pid_t process_ = -1;
 };
 
