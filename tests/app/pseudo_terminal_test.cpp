@@ -8,8 +8,8 @@
 #include <functional>
 
 #include "app/vesk_program.h"
-#include "intake/metric_identifiers.h"
 #include "messages/lte/lte.h"
+#include "messages/registry/metric_identifiers.h"
 
 namespace vesk {
 namespace {
