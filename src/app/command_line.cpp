@@ -1,6 +1,7 @@
 #include "app/command_line.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <cerrno>
 #include <charconv>
 #include <cmath>
@@ -8,12 +9,14 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "app/decode_command.h"
 #include "app/run_command.h"
 #include "app/show_command.h"
 #include "app/simulate_command.h"
 #include "app/stores_command.h"
+#include "app/suggestion.h"
 #include "platform/system_log.h"
 
 namespace vesk {
@@ -23,37 +26,45 @@ namespace {
 constexpr const char* kExamples =
     "Examples:\n"
     "  vesk                                   walk the screens of a simulated drive\n"
-    "  vesk --replay drive.jsonl              walk the screens while a drive is replayed\n"
+    "  vesk --replay drive.jsonl              the screens while a drive is replayed\n"
     "  vesk --replay drive.jsonl --speed 10   the same, ten times as fast\n"
     "  tail -f live.jsonl | vesk --replay -   the screens on a live pipe\n"
-    "  vesk --headless --replay drive.jsonl   the diagnostic lines instead of screens\n"
+    "  vesk --headless --replay drive.jsonl   the diagnostic lines, no screens\n"
     "\n"
     "A recording has one event a line:\n"
-    "  {\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"0895…\"}";
+    "  {\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"1003\"}\n"
+    "\n"
+    "Exit status: 0 done, 1 something failed, 2 wrong usage.\n"
+    "vesk SUBCOMMAND --help tells more of a subcommand.";
 
 constexpr const char* kDecodeExamples =
-    "One JSON line an event:\n"
-    "  {\"at\":12.5,\"metric\":\"0x3C4E04\",\"class\":\"KCellularLteRrcState\",\"status\":\"decoded\",\"fields\":{…}}\n"
-    "status is decoded, undecodable (the payload is damaged) or ignored (no class knows the metric).\n"
+    "One JSON object an event, on one line (here in two):\n"
+    "  {\"at\":12.5,\"metric\":\"0x3C4E04\",\"class\":\"KCellularLteRrcState\",\n"
+    "   \"status\":\"decoded\",\"fields\":{\"state\":\"KLTE_RRC_STATE_CONNECTED\"}}\n"
+    "The status is decoded, undecodable (the payload is damaged) or ignored (no\n"
+    "class knows the metric).\n"
     "\n"
     "Examples:\n"
     "  vesk decode drive.jsonl | jq -r '.fields.state // empty'\n"
-    "  tail -f drive.jsonl | vesk decode -";
+    "  tail -f live.jsonl | vesk decode";
 
 constexpr const char* kStoresExamples =
     "Examples:\n"
     "  vesk stores drive.jsonl | jq .LTE.SelReselCellInfo\n"
-    "  vesk stores drive.jsonl | jq '.dictionaries | map_values(select(. != null)) | keys'";
+    "  vesk stores drive.jsonl | jq .dictionaries.myLTERRCStateDict.state";
 
 constexpr const char* kShowExamples =
     "Examples:\n"
     "  vesk show LTE \"Serving Cell Meas\" drive.jsonl\n"
-    "  vesk show UMTS \"Tx Power\" drive.jsonl --json | jq -r '.sections[].rows[].value'";
+    "  vesk show UMTS \"Tx Power\" drive.jsonl --json | jq '.sections[].rows'";
 
 constexpr const char* kSimulateExamples =
     "Examples:\n"
     "  vesk simulate --seconds 600 > drive.jsonl\n"
     "  vesk simulate --seed 7 | vesk show LTE \"RRC State\" -";
+
+/// So narrow that the descriptions beside the options end before column 80.
+constexpr std::size_t kOptionColumn = 20;
 
 /// Where the system log usually goes: that of the program with its screens, and that of a command that prints data.
 constexpr const char* kProgramLog = "syslog";
@@ -93,6 +104,7 @@ class CommandLine {
  public:
   CommandLine() {
     program_.name("vesk");
+    program_.get_formatter()->column_width(kOptionColumn);
     program_.set_version_flag("--version", "vesk " VESK_VERSION, "Print the version");
     program_.set_help_flag("-h,--help", "Print this help");
     program_.require_subcommand(0, 1);
@@ -108,7 +120,12 @@ class CommandLine {
     try {
       program_.parse(argc, argv);
     } catch (const CLI::ParseError& error) {
-      return program_.exit(error) == 0 ? Outcome::done : Outcome::wrongUsage;
+      if (error.get_exit_code() == 0) {
+        program_.exit(error);
+        return Outcome::done;
+      }
+      tellMistake(error);
+      return Outcome::wrongUsage;
     }
     const char* usualLog = program_.get_subcommands().empty() ? kProgramLog : kDataLog;
     if (!openLog(logTo_.value_or(usualLog))) return Outcome::failed;
@@ -117,11 +134,9 @@ class CommandLine {
 
  private:
   void addRunOptions() {
-    program_
-        .add_option("--replay", run_.source.replay,
-                    "Feed the program with a recording instead of the simulated handset; - is standard input")
+    program_.add_option("--replay", run_.source.replay, "Feed it a recording, not simulated events; - is stdin")
         ->type_name("FILE");
-    program_.add_flag("--headless", run_.isHeadless, "No screens: the diagnostic lines on standard output");
+    program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
     program_
         .add_option_function<std::string>(
             "--speed",
@@ -129,7 +144,7 @@ class CommandLine {
               if (parseSpeed(text, run_.source.playback.speed)) return;
               throw CLI::ValidationError("--speed", "expected a positive number or max, got " + text);
             },
-            "How many seconds of the recording pass in one: a number, or max")
+            "Replay so many seconds in one: a number, or max")
         ->type_name("N")
         ->default_str("1");
     program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")->type_name("N");
@@ -143,7 +158,7 @@ class CommandLine {
             },
             "End after that many seconds")
         ->type_name("N")
-        ->check(CLI::Range(0.001, 1e9));
+        ->check(CLI::Range(0.001, 1e9).description(""));
     addLogOption(program_, kProgramLog);
     program_.callback([this] {
       if (program_.get_subcommands().empty()) command_ = [this] { return runProgram(run_); };
@@ -172,7 +187,7 @@ class CommandLine {
     show->add_option("CATEGORY", show_.category, "A line of the area's screen, as \"Tx Power\"")
         ->required()
         ->type_name("");
-    addRecording(*show, show_.path, "The recording; - for standard input, nothing for before any event");
+    addRecording(*show, show_.path, "The recording; - is standard input, nothing: no events yet");
     show->add_flag("--json", show_.asJson, "Print JSON");
     addLogOption(*show, kDataLog);
     show->footer(kShowExamples);
@@ -185,10 +200,43 @@ class CommandLine {
     simulate->add_option("--seconds", simulate_.seconds, "How long it is")
         ->type_name("N")
         ->default_str("60")
-        ->check(CLI::Range(0.0, 1e9));
+        ->check(CLI::Range(0.0, 1e9).description(""));
     addLogOption(*simulate, kDataLog);
     simulate->footer(kSimulateExamples);
     simulate->final_callback([this] { command_ = [this] { return runSimulate(simulate_); }; });
+  }
+
+  /// One line: what was wrong, what may have been meant, and where more is told.
+  void tellMistake(const CLI::ParseError& error) {
+    const auto commands = program_.get_subcommands();
+    const CLI::App& command = commands.empty() ? program_ : *commands.front();
+    std::string line = "vesk: ";
+    const std::vector<std::string> unexpected = program_.remaining(true);
+    if (dynamic_cast<const CLI::ExtrasError*>(&error) != nullptr && !unexpected.empty()) {
+      line += inWords(unexpected, command);
+    } else {
+      line += error.what();
+    }
+    line += commands.empty() ? "; see vesk --help" : "; see vesk " + command.get_name() + " --help";
+    tellUser(line);
+  }
+
+  std::string inWords(const std::vector<std::string>& unexpected, const CLI::App& command) const {
+    const auto option = std::find_if(unexpected.begin(), unexpected.end(),
+                                     [](const std::string& word) { return word.starts_with('-') && word != "-"; });
+    std::vector<std::string> names;
+    if (option != unexpected.end()) {
+      for (const CLI::Option* known :
+           command.get_options([](const CLI::Option* each) { return each->nonpositional(); }))
+        names.push_back("--" + known->get_lnames().front());
+      const std::string name = option->substr(0, option->find('='));
+      return "no option " + name + suggestionFor(name, names);
+    }
+    const std::string& word = unexpected.front();
+    if (&command != &program_) return "an argument too many: " + word + " (quote a name that holds blanks)";
+    for (const CLI::App* known : program_.get_subcommands([](const CLI::App*) { return true; }))
+      names.push_back(known->get_name());
+    return "no subcommand " + word + suggestionFor(word, names);
   }
 
   static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {

@@ -6,6 +6,8 @@
 
 #include "app/data_output.h"
 #include "app/json_form.h"
+#include "app/progress.h"
+#include "app/recording_hint.h"
 #include "corvik/recording_reader.h"
 #include "messages/registry/metric_classes.h"
 #include "platform/text_form.h"
@@ -43,7 +45,7 @@ void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
 /// Decodes a recording step by step; each step answers whether to go on.
 class Decoding {
  public:
-  explicit Decoding(const std::string& path) : reader_(path) {
+  explicit Decoding(const std::string& path) : path_(path), reader_(path) {
     reader_.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();
@@ -53,6 +55,8 @@ class Decoding {
   Outcome run() {
     while (!output_.hasFailed() && std::visit(*this, reader_.next())) {
     }
+    progress_.hide();
+    if (events_ == 0 && hasBadLines_) tellIsNoRecording(path_);
     return output_.finish(outcome_);
   }
 
@@ -60,10 +64,13 @@ class Decoding {
     line_.clear();
     appendDecodedEvent(line_, event);
     output_.writeLine(line_);
+    // So rarely that asking the clock costs nothing.
+    if (++events_ % kEventsToProgress == 0) progress_.show(events_, event.at, duration_);
     return true;
   }
 
   bool operator()(const corvik::BadLine& bad) {
+    hasBadLines_ = true;
     fail(bad.message);
     return true;
   }
@@ -76,13 +83,21 @@ class Decoding {
   bool operator()(corvik::EndOfRecording /*end*/) { return false; }
 
  private:
+  static constexpr std::uint64_t kEventsToProgress = 4096;
+
   void fail(const std::string& reason) {
+    progress_.hide();
     tellUser(reason);
     outcome_ = Outcome::failed;
   }
 
+  const std::string& path_;
   corvik::RecordingReader reader_;
   DataOutput output_;
+  Progress progress_{Progress::Output::meanwhile};
+  const std::optional<double> duration_ = progress_.isPossible() ? reader_.duration() : std::nullopt;
+  std::uint64_t events_ = 0;
+  bool hasBadLines_ = false;
   std::string line_;
   Outcome outcome_ = Outcome::done;
 };

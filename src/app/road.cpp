@@ -1,8 +1,11 @@
 #include "app/road.h"
 
+#include <chrono>
 #include <memory>
 
 #include "app/app_delegate.h"
+#include "app/progress.h"
+#include "app/recording_hint.h"
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
@@ -10,9 +13,16 @@
 #include "platform/clock.h"
 #include "platform/output_lines.h"
 #include "platform/run_loop.h"
+#include "platform/timer.h"
 #include "toolkit/application.h"
 
 namespace vesk {
+
+namespace {
+
+constexpr std::chrono::milliseconds kProgressInterval{200};
+
+}  // namespace
 
 bool hasMetricConfiguration() {
   using Root = RootNavigationController;
@@ -33,7 +43,9 @@ Outcome playRecording(const std::optional<std::string>& path,
   const SteadyClock clock;
   RunLoop loop(clock);
   Outcome outcome = Outcome::done;
-  const auto fail = [&outcome](const std::string& reason) {
+  Progress progress(Progress::Output::atTheEnd);
+  const auto fail = [&](const std::string& reason) {
+    progress.hide();
     tellUser(reason);
     outcome = Outcome::failed;
   };
@@ -52,7 +64,18 @@ Outcome playRecording(const std::optional<std::string>& path,
   AppDelegate delegate;
   Application application(veskInterface(), delegate);
   application.run([&](NavigationController& root) {
-    if (path) loop.run();
+    if (path) {
+      std::optional<Timer> ticker;
+      if (progress.isPossible()) {
+        ticker.emplace(loop, kProgressInterval, RunLoopMode::defaultMode, [&] {
+          const corvik::PlaybackState state = service->state();
+          progress.show(state.events, state.position, state.duration);
+        });
+      }
+      loop.run();
+      progress.hide();
+      if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*path);
+    }
     use(root);
   });
   // The connection outlives all that the service was made of here.

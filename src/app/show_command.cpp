@@ -7,6 +7,7 @@
 #include "app/data_output.h"
 #include "app/json_form.h"
 #include "app/road.h"
+#include "app/suggestion.h"
 #include "platform/visible_text.h"
 #include "screens/vesk_view_items.h"
 #include "toolkit/interface_layout.h"
@@ -151,16 +152,24 @@ std::string joined(const std::vector<Text>& labels) {
   return out;
 }
 
+std::string suggestionAmong(const std::vector<Text>& labels, std::string_view typed) {
+  std::vector<std::string> candidates;
+  for (const Text& label : labels)
+    candidates.emplace_back(label.view());
+  return suggestionFor(typed, candidates, "\"");
+}
+
 /// Tells which labels there are when these are not among them.
 void tellUnknownLabels(const ShowOptions& options) {
   const VeskViewItems& menu = VeskViewItems::shared();
   const auto& areas = menu.launchViewItemNames;
   const auto& categories = menu.categoriesOf(options.area);
   if (categories.empty()) {
-    tellUser("vesk: no area \"" + options.area + "\"; there are: " + joined(areas));
+    tellUser("vesk: no area \"" + options.area + "\"" + suggestionAmong(areas, options.area) +
+             "; there are: " + joined(areas));
   } else if (std::find(categories.begin(), categories.end(), options.category) == categories.end()) {
     tellUser("vesk: no category \"" + options.category + "\" in " + options.area +
-             "; there are: " + joined(categories));
+             suggestionAmong(categories, options.category) + "; there are: " + joined(categories));
   }
 }
 

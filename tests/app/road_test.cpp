@@ -161,8 +161,9 @@ TEST_F(Road, ShowsWhatAnUnknownPairShowsAndTellsWhichThereAre) {
     const char* told;
   };
   const Case cases[] = {
-      {"GSM", "GPRS Config", "vesk: no category \"GPRS Config\" in GSM; there are: NAS GMM, NAS MM, "},
-      {"gsm", "NAS MM", "vesk: no area \"gsm\"; there are: Device Info, LTE, UMTS, GSM\n"},
+      {"GSM", "GPRS Config",
+       "vesk: no category \"GPRS Config\" in GSM; did you mean \"GSM GPRS Config\"; there are: NAS GMM, NAS MM, "},
+      {"gsm", "NAS MM", "vesk: no area \"gsm\"; did you mean \"GSM\"; there are: Device Info, LTE, UMTS, GSM\n"},
       {"", "\x1B[2J", "vesk: no area \"\""},
   };
   for (const Case& row : cases) {
