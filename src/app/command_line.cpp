@@ -70,7 +70,7 @@ constexpr std::size_t kOptionColumn = 20;
 constexpr const char* kProgramLog = "syslog";
 constexpr const char* kDataLog = "none";
 
-/// Where the system log goes.
+/// Opens the log; false, and the user is told, when it cannot be.
 bool openLog(const std::string& to) {
   if (to == "none") return true;
   if (to == "syslog") {
@@ -100,6 +100,18 @@ bool parseSpeed(const std::string& text, std::optional<double>& speed) {
   return true;
 }
 
+/// Seconds from `least` to a billion.
+CLI::Validator secondsFrom(double least) {
+  const auto reasonAgainst = [least](const std::string& text) -> std::string {
+    double seconds = 0;
+    const auto result = std::from_chars(text.data(), text.data() + text.size(), seconds);
+    const bool isWhole = result.ec == std::errc{} && result.ptr == text.data() + text.size();
+    if (isWhole && seconds >= least && seconds <= 1e9) return "";
+    return "expected a number of seconds, got " + text;
+  };
+  return CLI::Validator(reasonAgainst, "");
+}
+
 class CommandLine {
  public:
   CommandLine() {
@@ -127,6 +139,10 @@ class CommandLine {
       tellMistake(error);
       return Outcome::wrongUsage;
     }
+    if (const std::string stray = optionBeforeCommand(); !stray.empty()) {
+      tellUser("vesk: " + stray + " goes without a subcommand; see vesk --help");
+      return Outcome::wrongUsage;
+    }
     const char* usualLog = program_.get_subcommands().empty() ? kProgramLog : kDataLog;
     if (!openLog(logTo_.value_or(usualLog))) return Outcome::failed;
     return command_();
@@ -134,8 +150,9 @@ class CommandLine {
 
  private:
   void addRunOptions() {
-    program_.add_option("--replay", run_.source.replay, "Feed it a recording, not simulated events; - is stdin")
-        ->type_name("FILE");
+    CLI::Option* replay =
+        program_.add_option("--replay", run_.source.replay, "Feed it a recording, not simulated events; - is stdin")
+            ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
     program_
         .add_option_function<std::string>(
@@ -146,9 +163,13 @@ class CommandLine {
             },
             "Replay so many seconds in one: a number, or max")
         ->type_name("N")
-        ->default_str("1");
-    program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")->type_name("N");
-    program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end");
+        ->default_str("1")
+        ->needs(replay);
+    program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")
+        ->type_name("N")
+        ->check(CLI::NonNegativeNumber.description(""))
+        ->excludes(replay);
+    program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
     program_
         .add_option_function<double>(
             "--seconds",
@@ -158,7 +179,7 @@ class CommandLine {
             },
             "End after that many seconds")
         ->type_name("N")
-        ->check(CLI::Range(0.001, 1e9).description(""));
+        ->check(secondsFrom(0.001));
     addLogOption(program_, kProgramLog);
     program_.callback([this] {
       if (program_.get_subcommands().empty()) command_ = [this] { return runProgram(run_); };
@@ -196,14 +217,26 @@ class CommandLine {
 
   void addSimulate() {
     CLI::App* simulate = program_.add_subcommand("simulate", "Print a drive of the simulated handset, as a recording");
-    simulate->add_option("--seed", simulate_.seed, "Which drive")->type_name("N")->default_str("1");
+    simulate->add_option("--seed", simulate_.seed, "Which drive")
+        ->type_name("N")
+        ->default_str("1")
+        ->check(CLI::NonNegativeNumber.description(""));
     simulate->add_option("--seconds", simulate_.seconds, "How long it is")
         ->type_name("N")
         ->default_str("60")
-        ->check(CLI::Range(0.0, 1e9).description(""));
+        ->check(secondsFrom(0));
     addLogOption(*simulate, kDataLog);
     simulate->footer(kSimulateExamples);
     simulate->final_callback([this] { command_ = [this] { return runSimulate(simulate_); }; });
+  }
+
+  /// An option of the program that the subcommand would not heed; empty for none.
+  [[nodiscard]] std::string optionBeforeCommand() const {
+    if (program_.get_subcommands().empty()) return "";
+    const auto given = program_.get_options([](const CLI::Option* each) { return each->count() > 0; });
+    const auto stray =
+        std::find_if(given.begin(), given.end(), [](const CLI::Option* each) { return !each->check_lname("log"); });
+    return stray == given.end() ? "" : (*stray)->get_name();
   }
 
   /// One line: what was wrong, what may have been meant, and where more is told.
