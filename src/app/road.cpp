@@ -9,7 +9,6 @@
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
-#include "platform/bundle.h"
 #include "platform/clock.h"
 #include "platform/output_lines.h"
 #include "platform/run_loop.h"
@@ -24,22 +23,14 @@ constexpr std::chrono::milliseconds kProgressInterval{200};
 
 }  // namespace
 
-bool hasMetricConfiguration() {
-  using Root = RootNavigationController;
-  if (Bundle::main().pathForResource(Root::metricFileName, Root::metricFileType)) return true;
-  std::string line = "vesk: the metric configuration ";
-  line += Root::metricFileName;
-  line += '.';
-  line += Root::metricFileType;
-  line += " is missing, and without it no metric arrives; install the program again";
-  tellUser(line);
-  return false;
+std::optional<std::string> whyNoMetricArrives(const NavigationController& root) {
+  if (dynamic_cast<const RootNavigationController&>(root).isConfigurationAccepted()) return std::nullopt;
+  return "vesk: the metric configuration is missing or was refused, and no metric arrives; --log stderr tells more";
 }
 
 Outcome playRecording(const std::optional<std::string>& path,
                       const std::function<void(NavigationController& root)>& use) {
   OutputLines::setSink(nullptr);
-  if (path && !hasMetricConfiguration()) return Outcome::failed;
   const SteadyClock clock;
   RunLoop loop(clock);
   Outcome outcome = Outcome::done;
@@ -51,8 +42,13 @@ Outcome playRecording(const std::optional<std::string>& path,
   };
   std::shared_ptr<corvik::RecordedService> service;
   if (path) {
-    service = std::make_shared<corvik::RecordedService>(corvik::RecordingReader(*path), clock,
-                                                        corvik::Playback{.speed = std::nullopt});
+    corvik::RecordingReader recording(*path);
+    if (recording.failure()) {
+      fail("vesk: " + *recording.failure());
+      return outcome;
+    }
+    service =
+        std::make_shared<corvik::RecordedService>(std::move(recording), clock, corvik::Playback{.speed = std::nullopt});
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
       if (failure) fail("vesk: " + *failure);
@@ -63,8 +59,12 @@ Outcome playRecording(const std::optional<std::string>& path,
 
   AppDelegate delegate;
   Application application(veskInterface(), delegate);
-  application.run([&](NavigationController& root) {
+  const int status = application.run([&](NavigationController& root) {
     if (path) {
+      if (const auto reason = whyNoMetricArrives(root)) {
+        fail(*reason);
+        return;
+      }
       std::optional<Timer> ticker;
       if (progress.isPossible()) {
         ticker.emplace(loop, kProgressInterval, RunLoopMode::defaultMode, [&] {
@@ -78,6 +78,7 @@ Outcome playRecording(const std::optional<std::string>& path,
     }
     use(root);
   });
+  if (status != 0) outcome = Outcome::failed;
   // The connection outlives all that the service was made of here.
   if (service != nullptr) service->shutDown();
   return outcome;

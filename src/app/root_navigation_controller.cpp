@@ -30,7 +30,8 @@ void RootNavigationController::startMetrics() {
     return;
   }
   OutputLines::print({"pushing metric file"});
-  if (myCorvikWrapper == nullptr || !myCorvikWrapper->addQuodraConfigForAppId(myAppID, *path)) return;
+  isConfigurationAccepted_ = myCorvikWrapper != nullptr && myCorvikWrapper->addQuodraConfigForAppId(myAppID, *path);
+  if (!isConfigurationAccepted_) return;
   if (const auto& wrapper = myMetricValidator->sharedCorvikInstance()) wrapper->listen();
 
   OutputLines::print({"Querying SIM files"});

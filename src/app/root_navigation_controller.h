@@ -13,18 +13,21 @@ namespace vesk {
 /// configuration and asks once for the SIM files.
 class RootNavigationController : public NavigationController {
  public:
-  static constexpr std::string_view myAppID = "vesk";
-  /// The resource that holds the metric configuration.
-  static constexpr std::string_view metricFileName = "ice_test_lte";
-  static constexpr std::string_view metricFileType = "deviceconfig";
-
   void viewDidLoad() override;
+
+  /// Whether the service took the configuration, which is asked for when the view loads: without it no metric arrives.
+  [[nodiscard]] bool isConfigurationAccepted() const { return isConfigurationAccepted_; }
 
  private:
   void startMetrics();
 
+  static constexpr std::string_view myAppID = "vesk";
+  static constexpr std::string_view metricFileName = "ice_test_lte";
+  static constexpr std::string_view metricFileType = "deviceconfig";
+
   const std::shared_ptr<CorvikWrapper> myCorvikWrapper = CorvikWrapper::sharedInstance();
   const std::shared_ptr<MetricValidator> myMetricValidator = MetricValidator::shared();
+  bool isConfigurationAccepted_ = false;
 };
 
 }  // namespace vesk

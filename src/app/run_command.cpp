@@ -37,7 +37,8 @@ class Run {
       OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
     }
     Application application(veskInterface(), delegate_);
-    application.run([&](NavigationController& root) { mainLoop(application, root); });
+    const int status = application.run([&](NavigationController& root) { mainLoop(application, root); });
+    if (status != 0) outcome_ = Outcome::failed;
     // The connection outlives all that the service was made of here.
     source_.service->shutDown();
     OutputLines::setSink(nullptr);
@@ -62,8 +63,10 @@ class Run {
       end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
     }
     if (!isHeadless_) openTerminal(application, root);
-    loop_.run();
-    terminal_.reset();
+    const std::optional<std::string> reason = whyNoMetricArrives(root);
+    if (reason) tell(*reason);
+    if (!reason || !isHeadless_) loop_.run();
+    closeTerminal();
   }
 
   void openTerminal(Application& application, NavigationController& root) {
@@ -83,6 +86,13 @@ class Run {
       terminal_->setNeedsDisplay();
     });
     loop_.addInput(terminal_->descriptor(), [this] { terminal_->serve(); });
+  }
+
+  void closeTerminal() {
+    MetricValidator::shared()->setArrivalObserver(nullptr);
+    terminal_.reset();
+    // What only the diagnostic lines have told is seen by nobody any more.
+    if (!isHeadless_ && firstFault_) tellUser(*firstFault_);
   }
 
   Surroundings surroundings(Application& application) {
@@ -113,6 +123,7 @@ class Run {
   /// To the user where there are no screens, and to the diagnostic lines where there are.
   void tell(const std::string& line) {
     outcome_ = Outcome::failed;
+    if (!firstFault_) firstFault_ = line;
     if (isHeadless_) {
       tellUser(line);
     } else {
@@ -130,6 +141,7 @@ class Run {
   const SteadyClock clock_;
   bool isHeadless_;
   Outcome outcome_ = Outcome::done;
+  std::optional<std::string> firstFault_;
   RunLoop loop_{clock_};
   const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
@@ -142,7 +154,12 @@ class Run {
 }  // namespace
 
 Outcome runProgram(const RunOptions& options) {
-  if (!hasMetricConfiguration()) return Outcome::failed;
+  if (options.source.replay) {
+    if (const auto failure = corvik::RecordingReader(*options.source.replay).failure()) {
+      tellUser("vesk: " + *failure);
+      return Outcome::failed;
+    }
+  }
   return Run(options).run();
 }
 

@@ -8,8 +8,9 @@ namespace corvik::client {
 
 namespace {
 
-/// How far a source may get ahead, on each of the two queues that an event passes.
-constexpr std::size_t kMostWaiting = 1024;
+/// How far a source may get ahead, on each of the two queues that an event passes: far enough that the threads seldom
+/// wait for each other, and so little that the largest events, of megabytes, still fit.
+constexpr std::size_t kMostWaiting = 64;
 
 }  // namespace
 

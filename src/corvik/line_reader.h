@@ -18,7 +18,7 @@ class LineReader {
   /// Called before every read(2), which may block. False ends the reading as if the input had ended.
   using BeforeRead = std::function<bool(int descriptor)>;
 
-  static constexpr std::size_t kLongestLine = std::size_t{16} << 20;
+  static constexpr std::size_t kLongestLine = std::size_t{8} << 20;
 
   /// `padding` bytes behind every line may be read, whatever they hold.
   LineReader(vesk::FileDescriptor descriptor, std::size_t padding, std::size_t longestLine = kLongestLine);

@@ -25,7 +25,13 @@ RecordedService::RecordedService(RecordingReader recording, const vesk::Clock& c
 
 PlaybackState RecordedService::state() const {
   const std::lock_guard lock(mutex_);
-  return state_;
+  PlaybackState shown = state_;
+  if (next_) {
+    const std::chrono::duration<double> left = next_->due - clock_.now();
+    const double position = next_->at - left.count() * *playback_.speed;
+    shown.position = std::clamp(position, shown.position, std::max(shown.position, next_->at));
+  }
+  return shown;
 }
 
 void RecordedService::setPhase(PlaybackState::Phase phase) {
@@ -85,6 +91,10 @@ bool RecordedService::waitUntil(double at, const std::stop_token& stop) {
   const double wait = std::clamp((at - at_) / *playback_.speed, 0.0, kLongestWait);
   *due_ += std::chrono::duration_cast<Clock::Duration>(std::chrono::duration<double>(wait));
   at_ = at;
+  {
+    const std::lock_guard lock(mutex_);
+    next_ = NextEvent{at, *due_};
+  }
   clock_.sleepUntil(*due_, interrupt_);
   return !stop.stop_requested();
 }
@@ -93,6 +103,7 @@ void RecordedService::playEvent(const RecordedEvent& event, EventStream& events)
   ++eventsOfLap_;
   {
     const std::lock_guard lock(mutex_);
+    next_.reset();
     state_.position = event.at;
     ++state_.events;
   }

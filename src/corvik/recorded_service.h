@@ -34,7 +34,7 @@ struct PlaybackState {
   };
 
   Phase phase = Phase::notStarted;
-  /// Seconds: "at" of the last event played.
+  /// Seconds: how far into the recording it is, between the last event played and the next.
   double position = 0;
   /// Seconds: "at" of the last event of all, where it can be known.
   std::optional<double> duration;
@@ -96,8 +96,15 @@ class RecordedService final : public Service {
   std::size_t lap_ = 0;
   std::size_t eventsOfLap_ = 0;
 
+  struct NextEvent {
+    double at;
+    vesk::Clock::Instant due;
+  };
+
   mutable std::mutex mutex_;
   PlaybackState state_;
+  /// What is waited for; absent when nothing is.
+  std::optional<NextEvent> next_;
   vesk::WakeUp interrupt_;
   std::jthread thread_;
 };

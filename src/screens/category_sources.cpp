@@ -16,9 +16,6 @@ constexpr CategorySource latest(std::string_view area, std::string_view category
           .category = category,
           .kind = SourceKind::metricRecord,
           .latestRecord = [](const Intake& intake) { return intake.*record; },
-          .storeRecord = nullptr,
-          .list = nullptr,
-          .headerPrefix = {},
           .metric = metric};
 }
 
@@ -27,10 +24,7 @@ constexpr CategorySource record(std::string_view area, std::string_view category
   return {.area = area,
           .category = category,
           .kind = SourceKind::storeRecord,
-          .latestRecord = nullptr,
           .storeRecord = [](const Intake& intake) { return intake.*store.*field; },
-          .list = nullptr,
-          .headerPrefix = {},
           .metric = metric};
 }
 
@@ -40,8 +34,6 @@ constexpr CategorySource list(std::string_view area, std::string_view category, 
   return {.area = area,
           .category = category,
           .kind = SourceKind::storeList,
-          .latestRecord = nullptr,
-          .storeRecord = nullptr,
           .list = [](const Intake& intake) { return intake.*store.*field; },
           .headerPrefix = headerPrefix,
           .metric = metric};
@@ -55,14 +47,7 @@ constexpr CategorySource first(std::string_view area, std::string_view category,
 }
 
 constexpr CategorySource placeholder(std::string_view area, std::string_view category) {
-  return {.area = area,
-          .category = category,
-          .kind = SourceKind::placeholder,
-          .latestRecord = nullptr,
-          .storeRecord = nullptr,
-          .list = nullptr,
-          .headerPrefix = {},
-          .metric = std::nullopt};
+  return {.area = area, .category = category, .kind = SourceKind::placeholder};
 }
 
 constexpr auto lte = &Intake::myLTE;

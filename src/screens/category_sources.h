@@ -28,13 +28,13 @@ struct CategorySource {
   std::string_view category;
   SourceKind kind;
   /// What the kind reads, from the intake as it is at the time of the call; null for the other kinds.
-  MetricValidator::LatestRecord (*latestRecord)(const MetricValidator& intake);
-  Record (*storeRecord)(const MetricValidator& intake);
-  RecordList (*list)(const MetricValidator& intake);
+  MetricValidator::LatestRecord (*latestRecord)(const MetricValidator& intake) = nullptr;
+  Record (*storeRecord)(const MetricValidator& intake) = nullptr;
+  RecordList (*list)(const MetricValidator& intake) = nullptr;
   /// What stands before the number of an element in the header of its section.
-  std::string_view headerPrefix;
+  std::string_view headerPrefix{};
   /// The metric that changes the source; absent for a placeholder.
-  std::optional<std::int64_t> metric;
+  std::optional<std::int64_t> metric{};
 };
 
 /// The source of a pair of labels. A pair that no menu has is a placeholder.

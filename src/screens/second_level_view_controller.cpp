@@ -45,8 +45,8 @@ std::optional<Record> SecondLevelViewController::recordOf(std::size_t section) c
 }
 
 void SecondLevelViewController::viewDidLoad() {
-  refreshTimer_.emplace(RunLoop::main(), kRefreshInterval, RunLoopMode::defaultMode, [this] { update(); });
   TableViewController::viewDidLoad();
+  refreshTimer_.emplace(RunLoop::main(), kRefreshInterval, RunLoopMode::defaultMode, [this] { update(); });
   applyCommonLook(*this);
 }
 

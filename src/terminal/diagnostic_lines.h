@@ -17,10 +17,13 @@ class DiagnosticLines {
   /// `capacity` is at least 1.
   explicit DiagnosticLines(std::size_t capacity = 1000) : capacity_(capacity) {}
 
+  /// More of a line is not kept.
+  static constexpr std::size_t kLongestLine = 4096;
+
   /// Adds one line without its line feed; beyond the capacity the oldest goes.
   void append(std::string_view line) {
     if (lines_.size() == capacity_) lines_.pop_front();
-    lines_.emplace_back(line);
+    lines_.emplace_back(line.substr(0, kLongestLine));
     ++total_;
     if (observer_) observer_();
   }

@@ -24,8 +24,4 @@ void Application::enterForeground() {
   delegate_.didBecomeActive();
 }
 
-void Application::receiveMemoryWarning() {
-  if (delegate_.window() != nullptr) delegate_.window()->rootNavigationController().didReceiveMemoryWarning();
-}
-
 }  // namespace vesk

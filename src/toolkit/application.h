@@ -47,13 +47,11 @@ class Application {
 
   /// Launches, then runs `mainLoop`, which is handed the root stack and returns when the program shall end.
   /// The exit status: 0, or 1 when the delegate refused the launch.
-  int run(const std::function<void(NavigationController&)>& mainLoop);
+  [[nodiscard]] int run(const std::function<void(NavigationController&)>& mainLoop);
 
   /// Between these two the interface does not show, as when the program is suspended.
   void enterBackground();
   void enterForeground();
-  /// Memory is short: every screen is told.
-  void receiveMemoryWarning();
 
  private:
   const InterfaceLayout& layout_;

@@ -42,9 +42,9 @@ std::shared_ptr<NavigationController> makeStackOf() {
 ///     const InterfaceLayout layout({
 ///         .rootStack = makeStackOf<RootStack>,
 ///         .firstScreen = "Launch",
-///         .screens = {{"Launch", makeScreenOf<LaunchScreen>, "Start"}, {"List", makeScreenOf<ListScreen>,
-///         ""}}, .cells = {{"LaunchView", CellStyle::Basic, CellAccessory::Disclosure}}, .transitions =
-///         {{"Launch", "showList", "List"}},
+///         .screens = {{"Launch", makeScreenOf<LaunchScreen>, "Start"}},
+///         .cells = {{"LaunchView", CellStyle::Basic, CellAccessory::Disclosure}},
+///         .transitions = {{"Launch", "showList", "List"}},
 ///     });
 class InterfaceLayout {
  public:
