@@ -47,12 +47,13 @@ EventSource makeEventSource(const SourceOptions& options, const Clock& clock, So
     return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
             [] { return ShownState{"simulated"}; }};
   }
-  auto service =
-      std::make_shared<corvik::RecordedService>(corvik::RecordingReader(*options.replay), clock, options.playback);
+  corvik::RecordingReader recording(*options.replay);
+  const std::optional<std::string> failure = recording.failure();
+  auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));
   service->setEndHandler(std::move(handlers.ended));
   corvik::RecordedService& recorded = *service;
-  return {std::move(service), [&recorded] { return shown(recorded.state()); }};
+  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure};
 }
 
 }  // namespace vesk

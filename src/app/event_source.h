@@ -33,6 +33,8 @@ struct ShownState {
 struct EventSource {
   std::shared_ptr<corvik::Service> service;
   std::function<ShownState()> state;
+  /// Why the recording cannot be read at all.
+  std::optional<std::string> failure{};
 };
 
 /// What an event source tells; both on the main queue.

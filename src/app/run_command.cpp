@@ -29,6 +29,10 @@ class Run {
     source_ = makeEventSource(options_.source, clock_,
                               {[this](const std::string& message) { tell(message); },
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
+    if (source_.failure) {
+      tellUser("vesk: " + *source_.failure);
+      return Outcome::failed;
+    }
     corvik::installService(source_.service);
     if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
     if (isHeadless_) {
@@ -154,12 +158,6 @@ class Run {
 }  // namespace
 
 Outcome runProgram(const RunOptions& options) {
-  if (options.source.replay) {
-    if (const auto failure = corvik::RecordingReader(*options.source.replay).failure()) {
-      tellUser("vesk: " + *failure);
-      return Outcome::failed;
-    }
-  }
   return Run(options).run();
 }
 
