@@ -109,7 +109,7 @@ CLI::Validator secondsFrom(double least) {
     if (isWhole && seconds >= least && seconds <= 1e9) return "";
     return "expected a number of seconds, got " + text;
   };
-  return CLI::Validator(reasonAgainst, "");
+  return {reasonAgainst, ""};
 }
 
 class CommandLine {

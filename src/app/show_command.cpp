@@ -154,6 +154,7 @@ std::string joined(const std::vector<Text>& labels) {
 
 std::string suggestionAmong(const std::vector<Text>& labels, std::string_view typed) {
   std::vector<std::string> candidates;
+  candidates.reserve(labels.size());
   for (const Text& label : labels)
     candidates.emplace_back(label.view());
   return suggestionFor(typed, candidates, "\"");

@@ -29,7 +29,7 @@ class DescriptorSink : public OutputSink {
   /// The descriptor is borrowed; `name` is what messages call it. From here on a closed pipe does not end the
   /// process: SIGPIPE is ignored.
   DescriptorSink(int descriptor, std::string name);
-  ~DescriptorSink() override { flush(); }
+  ~DescriptorSink() override { DescriptorSink::flush(); }
   DescriptorSink(const DescriptorSink&) = delete;
   DescriptorSink& operator=(const DescriptorSink&) = delete;
 
