@@ -55,8 +55,9 @@ class ChildProcess {
   [[noreturn]] static void become(const std::string& program, std::vector<std::string> arguments,
                                   const FileDescriptor& input, const FileDescriptor& output,
                                   const FileDescriptor& error) {
-    std::vector<char*> argv;
     arguments.insert(arguments.begin(), program);
+    std::vector<char*> argv;
+    argv.reserve(arguments.size() + 1);
     for (std::string& argument : arguments)
       argv.push_back(argument.data());
     argv.push_back(nullptr);
