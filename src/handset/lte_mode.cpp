@@ -86,7 +86,7 @@ std::optional<Departure> LteMode::stepIdle(const Surroundings& now, const LteSig
     if (departure) return departure;
   }
   const LteCell* better = betterCell(now.radio, signal, kReselectionMargin);
-  if (reselection_.hasHeld(better != nullptr, now.nowMs)) {
+  if (reselection_.hasHeld(better != nullptr, now.nowMs) && better != nullptr) {
     camp(*better, now);
   } else if (!isTooWeak && !now.registration.isRegisteredIn(area())) {
     startConnection(Cause::KLTE_RRC_CAUSE_EST_MO_SIGNAL, now);
@@ -131,7 +131,7 @@ void LteMode::stepConnected(const Surroundings& now, const LteSignal* signal) {
     return;
   }
   const LteCell* better = betterCell(now.radio, signal, kA3Margin);
-  if (eventA3_.hasHeld(better != nullptr, now.nowMs)) {
+  if (eventA3_.hasHeld(better != nullptr, now.nowMs) && better != nullptr) {
     handOver(*better, now);
   } else if (now.nowMs >= dueMs_) {
     changeState(State::KLTE_RRC_STATE_ENDING, Cause::KLTE_RRC_CAUSE_NA, now);

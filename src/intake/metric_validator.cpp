@@ -42,7 +42,7 @@ const std::shared_ptr<MetricValidator>& MetricValidator::shared() {
 }
 
 std::shared_ptr<MetricValidator> MetricValidator::listeningTo(std::shared_ptr<CorvikWrapper> wrapper) {
-  const std::shared_ptr<MetricValidator> intake(new MetricValidator);
+  std::shared_ptr<MetricValidator> intake(new MetricValidator);
   intake->mySharedCorvikInstance = std::move(wrapper);
   if (intake->mySharedCorvikInstance != nullptr) {
     intake->mySharedCorvikInstance->listen();

@@ -14,7 +14,7 @@ inline constexpr std::uint64_t kStartMs = 1'700'000'000'000;
 inline std::vector<HandsetEvent> drivenEvents(std::uint64_t seed, int seconds) {
   Handset handset(seed, kStartMs);
   std::vector<HandsetEvent> events;
-  for (HandsetEvent event = handset.next(); event.atMs <= 1000 * seconds; event = handset.next())
+  for (HandsetEvent event = handset.next(); event.atMs <= std::int64_t{1000} * seconds; event = handset.next())
     events.push_back(std::move(event));
   return events;
 }

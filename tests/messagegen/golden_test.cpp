@@ -24,8 +24,9 @@ std::string firstDifference(const std::optional<std::string>& golden, const std:
   std::string oldLine;
   std::string newLine;
   for (int number = 1;; ++number) {
-    const bool isOver = !std::getline(was, oldLine) | !std::getline(is, newLine);
-    if (isOver || oldLine != newLine) {
+    const bool wasOver = !std::getline(was, oldLine);
+    const bool isOver = !std::getline(is, newLine);
+    if (wasOver || isOver || oldLine != newLine) {
       return "line " + std::to_string(number) + ": was \"" + oldLine + "\", is \"" + newLine + '"';
     }
   }

@@ -58,7 +58,7 @@ class PseudoTerminal {
   std::string readUpTo(std::string_view end) {
     while (true) {
       if (const std::size_t place = unread_.find(end); place != std::string::npos) {
-        const std::string taken = unread_.substr(0, place + end.size());
+        std::string taken = unread_.substr(0, place + end.size());
         unread_.erase(0, taken.size());
         return taken;
       }
