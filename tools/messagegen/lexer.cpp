@@ -26,7 +26,7 @@ constexpr std::string_view kSymbols = "{}[]()<>=;,-";
 }  // namespace
 
 std::string Token::shown() const {
-  const std::string quoted = "'" + std::string(text) + "'";
+  std::string quoted = "'" + std::string(text) + "'";
   switch (kind) {
     case TokenKind::identifier:
       return "identifier " + quoted;
