@@ -65,7 +65,7 @@ TEST(ProtoWriter, WritesVarintsThatReadBackInTheFewestBytes) {
 }
 
 TEST(ProtoWriter, PutsTheLengthBeforeASectionOfAnySize) {
-  for (const std::size_t size : {0, 1, 127, 128, 129, 16'383, 16'384, 16'385, 2'097'152}) {
+  for (const std::size_t size : {0U, 1U, 127U, 128U, 129U, 16'383U, 16'384U, 16'385U, 2'097'152U}) {
     ProtoWriter writer;
     WriterMark outer{};
     WriterMark inner{};
