@@ -36,13 +36,11 @@ void RunLoop::run() {
   while (!isStopped_)
     serve(Sleep::untilSomethingIsDue);
   isStopped_ = false;
-  stopSignal_.clear();
   OutputLines::flush();
 }
 
 void RunLoop::stop() noexcept {
   isStopped_ = true;
-  stopSignal_.signal();
   wakeUp_.signal();
 }
 

@@ -33,8 +33,6 @@ class RunLoop {
   void run();
   /// Makes run(), or the next run(), return. From any thread, and from a signal handler.
   void stop() noexcept;
-  /// Readable once stop() was called, until run() has returned.
-  [[nodiscard]] const WakeUp& stopSignal() const { return stopSignal_; }
   /// Serves all that is due, until nothing is, without sleeping.
   void runDue();
 
@@ -70,7 +68,6 @@ class RunLoop {
   const Clock& clock_;
   MainQueue& queue_;
   WakeUp wakeUp_;
-  WakeUp stopSignal_;
   std::atomic<bool> isStopped_ = false;
   RunLoopMode mode_ = RunLoopMode::defaultMode;
   std::vector<std::shared_ptr<Timer::State>> timers_;
