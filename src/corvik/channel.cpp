@@ -8,9 +8,18 @@ namespace corvik::client {
 
 namespace {
 
-/// How far a source may get ahead, on each of the two queues that an event passes: far enough that the threads seldom
-/// wait for each other, and so little that the largest events, of megabytes, still fit.
-constexpr std::size_t kMostWaiting = 64;
+/// How many events a source may get ahead, on each of the two queues that an event passes: so far that the threads
+/// seldom wait for each other, for waking one costs as much as some ten events.
+constexpr std::size_t kMostWaiting = 1024;
+/// And after a large one: so little that events of megabytes still fit.
+constexpr std::size_t kMostWaitingBehindLarge = 64;
+/// Bytes of payload.
+constexpr std::size_t kLarge = 512;
+
+bool isLarge(const vesk::InterProcessDictionary& message) {
+  const vesk::Data* payload = message.data(kKeyPayload.view());
+  return payload != nullptr && payload->bytes().size() > kLarge;
+}
 
 }  // namespace
 
@@ -45,11 +54,12 @@ bool Channel::waitUntilWanted(const std::stop_token& stop) {
     std::unique_lock lock(mutex_);
     if (!wanted_.wait(lock, stop, [this] { return isWanted(); })) return false;
   }
-  return backlog_.waitUntilFewerThan(kMostWaiting, stop) &&
-         vesk::MainQueue::shared().waitUntilFewerThan(kMostWaiting, stop);
+  const std::size_t most = wasLarge_ ? kMostWaitingBehindLarge : kMostWaiting;
+  return backlog_.waitUntilFewerThan(most, stop) && vesk::MainQueue::shared().waitUntilFewerThan(most, stop);
 }
 
 void Channel::raise(const vesk::Text& event, vesk::InterProcessDictionary message) {
+  wasLarge_ = isLarge(message);
   add(Event{event, std::move(message)});
 }
 

@@ -12,41 +12,41 @@ namespace vesk {
 
 namespace {
 
-constexpr std::array kUtraConversions{
-    FieldConversion{"rscp", convertRscp},
-    FieldConversion{"ecno", convertEcNo},
+const std::array kUtraConversions{
+    FieldConversion{"rscp"_text, convertRscp},
+    FieldConversion{"ecno"_text, convertEcNo},
 };
-constexpr std::array kGeranConversions{
-    FieldConversion{"rxlev", convertRxLev},
+const std::array kGeranConversions{
+    FieldConversion{"rxlev"_text, convertRxLev},
 };
-constexpr std::array kEutraConversions{
-    FieldConversion{"rsrp", convertRsrp},
-    FieldConversion{"rsrq", convertRsrq},
+const std::array kEutraConversions{
+    FieldConversion{"rsrp"_text, convertRsrp},
+    FieldConversion{"rsrq"_text, convertRsrq},
 };
-constexpr std::array kCpichConversions{
-    FieldConversion{"cpich_rscp", convertRscp},
-    FieldConversion{"cpich_ecn0", convertEcNo},
+const std::array kCpichConversions{
+    FieldConversion{"cpich_rscp"_text, convertRscp},
+    FieldConversion{"cpich_ecn0"_text, convertEcNo},
 };
-constexpr std::array kLteNeighborConversions{
-    FieldConversion{"nbr_rsrp", convertRsrp},
-    FieldConversion{"nbr_rsrq", convertRsrq},
+const std::array kLteNeighborConversions{
+    FieldConversion{"nbr_rsrp"_text, convertRsrp},
+    FieldConversion{"nbr_rsrq"_text, convertRsrq},
 };
-constexpr std::array kSinrConversions{
-    FieldConversion{"sinr0", convertSinr},
-    FieldConversion{"sinr1", convertSinr},
+const std::array kSinrConversions{
+    FieldConversion{"sinr0"_text, convertSinr},
+    FieldConversion{"sinr1"_text, convertSinr},
 };
-constexpr std::array kCarrierConversions{
-    FieldConversion{"rsrp", convertCentiInteger},
-    FieldConversion{"rsrq", convertCentiFloat},
-    FieldConversion{"rssi", convertCentiInteger},
-    FieldConversion{"dl_bandwidth", convertBandwidthCode},
+const std::array kCarrierConversions{
+    FieldConversion{"rsrp"_text, convertCentiInteger},
+    FieldConversion{"rsrq"_text, convertCentiFloat},
+    FieldConversion{"rssi"_text, convertCentiInteger},
+    FieldConversion{"dl_bandwidth"_text, convertBandwidthCode},
 };
-constexpr std::array kBroadcastNeighborConversions{
-    FieldConversion{"dl_bw", convertBandwidthCode},
+const std::array kBroadcastNeighborConversions{
+    FieldConversion{"dl_bw"_text, convertBandwidthCode},
 };
-constexpr std::array kServingCellConversions{
-    FieldConversion{"dl_bw", convertHalf},
-    FieldConversion{"ul_bw", convertHalf},
+const std::array kServingCellConversions{
+    FieldConversion{"dl_bw"_text, convertHalf},
+    FieldConversion{"ul_bw"_text, convertHalf},
 };
 
 /// A field that every element of a list takes over from elsewhere.
@@ -57,7 +57,7 @@ struct Stamp {
 };
 
 Stamp timestampOf(const Record& parent) {
-  return {"timestamp"_text, parent.find("timestamp")};
+  return {"timestamp"_text, parent.find("timestamp"_text)};
 }
 
 bool isRecordList(const Value* value) {
@@ -68,7 +68,7 @@ bool isRecordList(const Value* value) {
 
 /// Fills `field` with the records of the list under `listKey`, stamped and converted. What is no list of records
 /// leaves the field as it was.
-void liftList(const Record& source, std::string_view listKey, RecordList& field, std::initializer_list<Stamp> stamps,
+void liftList(const Record& source, const Text& listKey, RecordList& field, std::initializer_list<Stamp> stamps,
               std::span<const FieldConversion> conversions = {}) {
   const Value* list = source.find(listKey);
   if (!isRecordList(list)) return;
@@ -80,7 +80,7 @@ void liftList(const Record& source, std::string_view listKey, RecordList& field,
       if (value != nullptr) {
         record.set(key, *value);
       } else {
-        record.erase(key.view());
+        record.erase(key);
       }
     }
     convertFields(record, conversions);
@@ -89,7 +89,7 @@ void liftList(const Record& source, std::string_view listKey, RecordList& field,
 
 /// Replaces the value under `key` by its text when it is what `isMeant` asks for; the text, or null.
 template <class IsMeant>
-const Text* replaceByText(Record& record, std::string_view key, IsMeant isMeant) {
+const Text* replaceByText(Record& record, const Text& key, IsMeant isMeant) {
   const Value* present = record.find(key);
   if (present == nullptr || !isMeant(*present)) return nullptr;
   Value text = Text::copy(textOf(*present));
@@ -105,7 +105,8 @@ bool isIntegerList(const Value& value) {
 }
 
 void replaceMultiBandInfo(Record& record) {
-  if (const Text* text = replaceByText(record, "multi_band_info", isIntegerList)) OutputLines::print({text->view()});
+  if (const Text* text = replaceByText(record, "multi_band_info"_text, isIntegerList))
+    OutputLines::print({text->view()});
 }
 
 /// Refreshes every key of the store's record; what the source does not have becomes the empty text.
@@ -113,7 +114,7 @@ void fillTemplate(Record& store, const Record& source) {
   Record filled;
   filled.reserve(store.size());
   for (const auto& [key, value] : store) {
-    const Value* found = source.find(key.view());
+    const Value* found = source.find(key);
     filled.append(key, found == nullptr ? Value(""_text) : *found);
   }
   store = std::move(filled);
@@ -131,58 +132,58 @@ void takeLteSelectionParameters(MetricValidator& intake) {
   replaceMultiBandInfo(source);
   fillTemplate(parameters, source);
   intake.formatTimestampOf(parameters);
-  liftList(source, "nbr_eutra", intake.myLTE.EutraNbrs, {timestampOf(parameters)}, kBroadcastNeighborConversions);
+  liftList(source, "nbr_eutra"_text, intake.myLTE.EutraNbrs, {timestampOf(parameters)}, kBroadcastNeighborConversions);
 }
 
 void takeLteTxPower(MetricValidator& intake) {
   const Record& source = *intake.myLTETxPowerDict;
-  liftList(source, "tx_power_info", intake.myLTE.TxPower, {timestampOf(source)});
+  liftList(source, "tx_power_info"_text, intake.myLTE.TxPower, {timestampOf(source)});
 }
 
 void takeLteRsrpRsrqSinr(MetricValidator& intake) {
   const Record& source = *intake.myLTERsrpRsrqSinrDict;
   Record parent;
-  if (const Value* timestamp = source.find("timestamp")) parent.set("timestamp"_text, *timestamp);
+  if (const Value* timestamp = source.find("timestamp"_text)) parent.set("timestamp"_text, *timestamp);
   intake.formatTimestampOf(parent);
-  liftList(source, "inst_values", intake.myLTE.RsrpRsrqSinr, {timestampOf(parent)}, kSinrConversions);
+  liftList(source, "inst_values"_text, intake.myLTE.RsrpRsrqSinr, {timestampOf(parent)}, kSinrConversions);
 }
 
 void takeLteCarrierAggregation(MetricValidator& intake) {
   const Record& source = *intake.myLTECAStatusDict;
-  liftList(source, "scc_list", intake.myLTE.CAStatusList, {timestampOf(source)}, kCarrierConversions);
+  liftList(source, "scc_list"_text, intake.myLTE.CAStatusList, {timestampOf(source)}, kCarrierConversions);
 }
 
 void takeLteInterRatNeighbors(MetricValidator& intake) {
   const Record& source = *intake.myLTEInterRatMeasDict;
-  liftList(source, "meas_nbr_utra", intake.myLTE.UtraNbrsMeas, {timestampOf(source)}, kUtraConversions);
-  liftList(source, "meas_nbr_geran", intake.myLTE.GeraNbrsMeas, {timestampOf(source)}, kGeranConversions);
+  liftList(source, "meas_nbr_utra"_text, intake.myLTE.UtraNbrsMeas, {timestampOf(source)}, kUtraConversions);
+  liftList(source, "meas_nbr_geran"_text, intake.myLTE.GeraNbrsMeas, {timestampOf(source)}, kGeranConversions);
 }
 
 void takeLteNeighbors(MetricValidator& intake) {
   const Record& source = *intake.myLTEIntraRatMeasDict;
-  liftList(source, "meas_nbr_eutra", intake.myLTE.EutraNbrsMeas, {timestampOf(source)}, kLteNeighborConversions);
+  liftList(source, "meas_nbr_eutra"_text, intake.myLTE.EutraNbrsMeas, {timestampOf(source)}, kLteNeighborConversions);
 }
 
 void takeActiveBearers(MetricValidator& intake) {
   const Record& source = *intake.myCellularActiveBearerDict;
-  liftList(source, "bearer_contexts", intake.myCommon.activeBearer, {timestampOf(source)});
+  liftList(source, "bearer_contexts"_text, intake.myCommon.activeBearer, {timestampOf(source)});
 }
 
 void takeEmmContext(MetricValidator& intake) {
   Record& source = *intake.myLTEEMMContextDict;
-  replaceByText(source, "guti", [](const Value& value) { return value.dictionary() != nullptr; });
-  replaceByText(source, "tai_list", [](const Value& value) { return isRecordList(&value); });
+  replaceByText(source, "guti"_text, [](const Value& value) { return value.dictionary() != nullptr; });
+  replaceByText(source, "tai_list"_text, [](const Value& value) { return isRecordList(&value); });
 }
 
 void takeUmtsServingCellMeasurement(MetricValidator& intake) {
   const Record& source = *intake.myUMTSCellMeasDict;
-  liftList(source, "rx_info", intake.myUMTS.rXInfo,
-           {timestampOf(source), {"connected_mode"_text, source.find("connected_mode")}});
+  liftList(source, "rx_info"_text, intake.myUMTS.rXInfo,
+           {timestampOf(source), {"connected_mode"_text, source.find("connected_mode"_text)}});
 }
 
 void takeUmtsTxPower(MetricValidator& intake) {
   const Record& source = *intake.myUMTSTxPowerDict;
-  liftList(source, "tx_power_info", intake.myUMTS.TxPower, {timestampOf(source)});
+  liftList(source, "tx_power_info"_text, intake.myUMTS.TxPower, {timestampOf(source)});
 }
 
 void takeUmtsSelectionParameters(MetricValidator& intake) {
@@ -190,28 +191,28 @@ void takeUmtsSelectionParameters(MetricValidator& intake) {
   Record& parameters = intake.myUMTS.SelReselCellInfo;
   replaceMultiBandInfo(source);
   fillTemplate(parameters, source);
-  liftList(source, "eutra_prio_info", intake.myUMTS.eUtraNbrs, {timestampOf(parameters)});
-  liftList(source, "utra_prio_info", intake.myUMTS.utraNbrs, {timestampOf(parameters)});
-  liftList(source, "gsm_prio_info", intake.myUMTS.geraNbrs, {timestampOf(parameters)});
+  liftList(source, "eutra_prio_info"_text, intake.myUMTS.eUtraNbrs, {timestampOf(parameters)});
+  liftList(source, "utra_prio_info"_text, intake.myUMTS.utraNbrs, {timestampOf(parameters)});
+  liftList(source, "gsm_prio_info"_text, intake.myUMTS.geraNbrs, {timestampOf(parameters)});
 }
 
 void takeUmtsNeighbors(MetricValidator& intake) {
   const Record& source = *intake.myUMTSNbrMeasDict;
-  liftList(source, "meas_utra_result", intake.myUMTS.utraNbrMeas, {timestampOf(source)}, kUtraConversions);
-  liftList(source, "meas_gsm_result", intake.myUMTS.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
-  liftList(source, "meas_lte_result", intake.myUMTS.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
+  liftList(source, "meas_utra_result"_text, intake.myUMTS.utraNbrMeas, {timestampOf(source)}, kUtraConversions);
+  liftList(source, "meas_gsm_result"_text, intake.myUMTS.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
+  liftList(source, "meas_lte_result"_text, intake.myUMTS.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
 }
 
 void takeGsmNeighbors(MetricValidator& intake) {
   const Record& source = *intake.myGSMNbrMeasDict;
-  liftList(source, "gsm_ncell_meas", intake.myGSM.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
-  liftList(source, "umts_ncell_meas", intake.myGSM.utraNbrMeas, {timestampOf(source)}, kCpichConversions);
-  liftList(source, "lte_ncell_meas", intake.myGSM.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
+  liftList(source, "gsm_ncell_meas"_text, intake.myGSM.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
+  liftList(source, "umts_ncell_meas"_text, intake.myGSM.utraNbrMeas, {timestampOf(source)}, kCpichConversions);
+  liftList(source, "lte_ncell_meas"_text, intake.myGSM.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
 }
 
 void takeSimFiles(MetricValidator& intake) {
   const Record& source = *intake.mySIMFileInfoDict;
-  liftList(source, "ef_list", intake.myCommon.simContents, {timestampOf(source)});
+  liftList(source, "ef_list"_text, intake.myCommon.simContents, {timestampOf(source)});
 }
 
 }  // namespace vesk

@@ -10,8 +10,8 @@ namespace vesk {
 
 namespace {
 
-constexpr std::string_view metricIDKey = "kKeyMetricID";
-constexpr std::string_view payloadKey = "kKeyPayload";
+const Text metricIDKey = "kKeyMetricID"_text;
+const Text payloadKey = "kKeyPayload"_text;
 
 /// Of at least two characters, as of an unsigned number.
 std::string hexadecimal(std::int64_t number) {
@@ -104,12 +104,12 @@ bool MetricValidator::validateMetric(const Dictionary& event) {
 }
 
 void MetricValidator::formatTimestampOf(Record& record) {
-  const Value* timestamp = record.find("timestamp");
+  const Value* timestamp = record.find("timestamp"_text);
   const std::optional<double> milliseconds = timestamp == nullptr ? std::nullopt : timestamp->number();
   if (!milliseconds) return;
   std::string date;
   dateFormat_.append(date, *milliseconds);
-  *record.findForChange("timestamp") = Text::copy(date);
+  *record.findForChange("timestamp"_text) = Text::copy(date);
 }
 
 }  // namespace vesk

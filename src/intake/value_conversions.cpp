@@ -12,17 +12,17 @@ constexpr std::array dlbwlookup{1.4F, 3.0F, 5.0F, 10.0F, 15.0F, 20.0F};
 
 /// Replaces the value by `compute` of the form in which `as` gives it, when it has that form.
 template <class Number, class Compute>
-void replace(Dictionary& record, std::string_view key, std::optional<Number> (Value::*as)() const, Compute compute) {
+void replace(Dictionary& record, const Text& key, std::optional<Number> (Value::*as)() const, Compute compute) {
   const Value* present = record.find(key);
   if (present == nullptr) return;
   if (const std::optional<Number> number = (present->*as)()) *record.findForChange(key) = compute(*number);
 }
 
-void subtract(Dictionary& record, std::string_view key, std::int64_t offset) {
+void subtract(Dictionary& record, const Text& key, std::int64_t offset) {
   replace(record, key, &Value::integer, [offset](std::int64_t number) { return number - offset; });
 }
 
-void halveAndSubtract(Dictionary& record, std::string_view key, float offset) {
+void halveAndSubtract(Dictionary& record, const Text& key, float offset) {
   replace(record, key, &Value::exactFloat, [offset](float number) { return number * 0.5F - offset; });
 }
 
@@ -33,34 +33,34 @@ void convertFields(Dictionary& record, std::span<const FieldConversion> conversi
     convert(record, key);
 }
 
-void convertRscp(Dictionary& record, std::string_view key) {
+void convertRscp(Dictionary& record, const Text& key) {
   subtract(record, key, 116);
 }
-void convertEcNo(Dictionary& record, std::string_view key) {
+void convertEcNo(Dictionary& record, const Text& key) {
   halveAndSubtract(record, key, 24.5F);
 }
-void convertRxLev(Dictionary& record, std::string_view key) {
+void convertRxLev(Dictionary& record, const Text& key) {
   subtract(record, key, 110);
 }
-void convertRsrp(Dictionary& record, std::string_view key) {
+void convertRsrp(Dictionary& record, const Text& key) {
   subtract(record, key, 140);
 }
-void convertRsrq(Dictionary& record, std::string_view key) {
+void convertRsrq(Dictionary& record, const Text& key) {
   halveAndSubtract(record, key, 19.5F);
 }
-void convertSinr(Dictionary& record, std::string_view key) {
+void convertSinr(Dictionary& record, const Text& key) {
   halveAndSubtract(record, key, 0.0F);
 }
 
-void convertCentiInteger(Dictionary& record, std::string_view key) {
+void convertCentiInteger(Dictionary& record, const Text& key) {
   replace(record, key, &Value::integer, [](std::int64_t number) { return number / 100; });
 }
 
-void convertCentiFloat(Dictionary& record, std::string_view key) {
+void convertCentiFloat(Dictionary& record, const Text& key) {
   replace(record, key, &Value::exactFloat, [](float number) { return number / 100.0F; });
 }
 
-void convertBandwidthCode(Dictionary& record, std::string_view key) {
+void convertBandwidthCode(Dictionary& record, const Text& key) {
   const Value* present = record.find(key);
   const std::optional<std::int32_t> code = present == nullptr ? std::nullopt : present->integer32();
   if (!code) return;
@@ -71,7 +71,7 @@ void convertBandwidthCode(Dictionary& record, std::string_view key) {
   }
 }
 
-void convertHalf(Dictionary& record, std::string_view key) {
+void convertHalf(Dictionary& record, const Text& key) {
   replace(record, key, &Value::integer32, [](std::int32_t number) { return number / 2; });
 }
 

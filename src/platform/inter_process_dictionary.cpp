@@ -10,7 +10,7 @@ void InterProcessDictionary::setValue(Text key, Value value) {
 }
 
 void InterProcessDictionary::setDescriptor(Text key, FileDescriptor descriptor) {
-  values_.erase(key.view());
+  values_.erase(key);
   std::erase_if(descriptors_, [&](const Descriptor& each) { return each.key == key; });
   descriptors_.push_back({std::move(key), std::make_shared<const FileDescriptor>(std::move(descriptor))});
 }

@@ -22,7 +22,8 @@ class SharedBytes {
   SharedBytes() = default;
   /// Takes over one count of `block`.
   explicit SharedBytes(Block* block) : block_(reinterpret_cast<std::uintptr_t>(block)) {}
-  /// Bytes over a block of static storage, which is never counted and never freed.
+  /// Bytes over a block of static storage, which is never counted and never freed, and is the only such block of the
+  /// same bytes.
   static SharedBytes ofImmortal(Block* block) {
     SharedBytes bytes(block);
     bytes.block_ |= kImmortalBit;
@@ -48,7 +49,9 @@ class SharedBytes {
   }
 
   friend bool operator==(const SharedBytes& a, const SharedBytes& b) {
-    return a.block_ == b.block_ || a.view() == b.view();
+    if (a.block_ == b.block_) return true;
+    const bool areBothImmortal = (a.block_ & b.block_ & kImmortalBit) != 0;
+    return !areBothImmortal && a.view() == b.view();
   }
 
  private:

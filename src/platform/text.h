@@ -16,7 +16,7 @@ class Text {
  public:
   Text() = default;
   static Text copy(std::string_view text) { return Text(SharedBytes::copy(text)); }
-  /// A text over an immortal block of static storage.
+  /// A text over an immortal block of static storage, the only one of this text.
   static Text ofLiteral(SharedBytes::Block* block) { return Text(SharedBytes::ofImmortal(block)); }
 
   [[nodiscard]] std::string_view view() const { return bytes_.view(); }

@@ -45,7 +45,8 @@ Dictionary::Dictionary(std::initializer_list<Entry> entries) {
     set(entry.key, entry.value);
 }
 
-std::optional<std::size_t> Dictionary::indexOf(std::string_view key) const {
+template <class Key>
+std::optional<std::size_t> Dictionary::indexOf(const Key& key) const {
   const Entry* entry = std::find_if(begin(), end(), [&](const Entry& each) { return each.key == key; });
   if (entry == end()) return std::nullopt;
   return static_cast<std::size_t>(entry - begin());
@@ -56,27 +57,32 @@ const Value* Dictionary::find(std::string_view key) const {
   return index ? &entries_[*index].value : nullptr;
 }
 
-Value* Dictionary::findForChange(std::string_view key) {
+const Value* Dictionary::find(const Text& key) const {
+  const std::optional<std::size_t> index = indexOf(key);
+  return index ? &entries_[*index].value : nullptr;
+}
+
+Value* Dictionary::findForChange(const Text& key) {
   const std::optional<std::size_t> index = indexOf(key);
   return index ? &entries_.mutableItems()[*index].value : nullptr;
 }
 
 void Dictionary::set(Text key, Value value) {
-  if (Value* present = findForChange(key.view())) {
+  if (Value* present = findForChange(key)) {
     *present = std::move(value);
   } else {
     append(std::move(key), std::move(value));
   }
 }
 
-void Dictionary::erase(std::string_view key) {
+void Dictionary::erase(const Text& key) {
   if (const std::optional<std::size_t> index = indexOf(key)) entries_.erase(*index);
 }
 
 bool operator==(const Dictionary& a, const Dictionary& b) {
   if (a.size() != b.size()) return false;
   return std::all_of(a.begin(), a.end(), [&](const Dictionary::Entry& entry) {
-    const Value* other = b.find(entry.key.view());
+    const Value* other = b.find(entry.key);
     return other != nullptr && *other == entry.value;
   });
 }

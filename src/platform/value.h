@@ -43,7 +43,8 @@ class Array {
 };
 
 /// Text keys to values, in the order in which the keys first came. Copies share their content until one of
-/// them changes. Meant for a message's worth of entries: a lookup compares keys one after another.
+/// them changes. Meant for a message's worth of entries: a lookup compares keys one after another, literal ones by
+/// their address.
 class Dictionary {
  public:
   struct Entry;
@@ -58,8 +59,9 @@ class Dictionary {
 
   /// The value under `key`, or null; valid until the dictionary changes.
   [[nodiscard]] const Value* find(std::string_view key) const;
+  [[nodiscard]] const Value* find(const Text& key) const;
   /// The same, for changing it.
-  [[nodiscard]] Value* findForChange(std::string_view key);
+  [[nodiscard]] Value* findForChange(const Text& key);
   [[nodiscard]] bool contains(std::string_view key) const { return find(key) != nullptr; }
 
   void reserve(std::size_t capacity);
@@ -70,14 +72,15 @@ class Dictionary {
   template <class Held>
   void append(Text key, Held&& value);
   /// Takes the entry out, if there is one.
-  void erase(std::string_view key);
+  void erase(const Text& key);
   void clear() { entries_.clear(); }
 
   /// Equal keys and values, in any order.
   friend bool operator==(const Dictionary& a, const Dictionary& b);
 
  private:
-  [[nodiscard]] std::optional<std::size_t> indexOf(std::string_view key) const;
+  template <class Key>
+  [[nodiscard]] std::optional<std::size_t> indexOf(const Key& key) const;
 
   SharedVector<Entry> entries_;
 };

@@ -59,8 +59,8 @@ TEST(Dictionary, KeepsTheOrderInWhichKeysCame) {
   Dictionary dictionary{{"b"_text, 1}, {"a"_text, 2}};
   dictionary.set("c"_text, 3);
   dictionary.set("b"_text, 4);
-  dictionary.erase("a");
-  dictionary.erase("missing");
+  dictionary.erase("a"_text);
+  dictionary.erase("missing"_text);
   ASSERT_EQ(dictionary.size(), 2U);
   EXPECT_EQ(dictionary.begin()[0], (Dictionary::Entry{"b"_text, 4}));
   EXPECT_EQ(dictionary.begin()[1], (Dictionary::Entry{"c"_text, 3}));
@@ -78,7 +78,7 @@ TEST(Dictionary, ACopyIsUntouchedByChangesToTheOther) {
   EXPECT_EQ(copy, (Dictionary{{"list"_text, Array{1, 2}}, {"inner"_text, inner}}));
 
   Dictionary shrunk = copy;
-  shrunk.erase("list");
+  shrunk.erase("list"_text);
   EXPECT_EQ(shrunk.size(), 1U);
   EXPECT_EQ(*copy.find("list"), Value(Array{1, 2}));
 }
