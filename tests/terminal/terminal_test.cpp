@@ -132,6 +132,36 @@ TEST_F(TerminalTest, DrawsAfreshWhenResized) {
   EXPECT_NE(drawn.find("<1,11>?"), std::string::npos) << drawn;
 }
 
+TEST_F(TerminalTest, GoesOnBesideATerminalThatStoppedReadingAndShowsItTheNewestLater) {
+  open();
+  const auto resize = [&](Size size) {
+    tty_.resize(size);
+    raise(SIGWINCH);
+    serveWhenReadable();
+  };
+  // Far more pictures than the terminal has room for.
+  for (int times = 0; times < 100; ++times) {
+    resize({300, 100});
+    resize({299, 100});
+  }
+  interface_.top().selectRow({0, 1});
+  tty_.type("j\r");
+  serveWhenReadable();
+  EXPECT_EQ(interface_.stack().stack().size(), 3U);
+  resize({61, 12});
+  clock_.advance(Terminal::kFrame);
+  std::string drawn;
+  while (drawn.find("<1,11>?") == std::string::npos) {
+    const std::string some = tty_.readSome();
+    ASSERT_FALSE(some.empty()) << drawn;
+    drawn += some;
+    terminal_->serve();
+  }
+  EXPECT_LT(drawn.find("<clear>"), drawn.rfind("<clear>"));
+  terminal_.reset();
+  EXPECT_TRUE(tty_.readUpTo("<leave>").ends_with("<leave>"));
+}
+
 TEST_F(TerminalTest, QuitsWhenTheTerminalIsGone) {
   open();
   tty_ = PseudoTerminal({1, 1});
