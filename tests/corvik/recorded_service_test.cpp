@@ -160,6 +160,20 @@ TEST_F(RecordedServiceTest, IsInterruptedWhileItWaitsForAnEventsTime) {
   EXPECT_TRUE(ids_.empty());
 }
 
+TEST_F(RecordedServiceTest, EndsInTheMidstOfEventsAtFullSpeed) {
+  connect(vesk::fileWith(line(0, 1) + line(1, 2)), {std::nullopt, true});
+  stopAfter_ = 1000;
+  loop_.run();
+  manager_.reset();
+  queue_.reset();
+  loop_.runDue();
+  const std::size_t delivered = ids_.size();
+  EXPECT_GE(delivered, stopAfter_);
+  EXPECT_EQ(service_->state().phase, Phase::playing);
+  loop_.runDue();
+  EXPECT_EQ(ids_.size(), delivered);
+}
+
 TEST_F(RecordedServiceTest, TellsWhyTheRecordingCouldNotBeRead) {
   connect(vesk::FileDescriptor(open("/", O_RDONLY)), {1.0, true});
   loop_.run();
