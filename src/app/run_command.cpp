@@ -60,6 +60,7 @@ class Run {
       loop_.stop();
     });
     sink->setInterrupt(&stopSignal_);
+    if (options_.duration) sink->setDeadline(clock_.now() + *options_.duration);
     OutputLines::setSink(std::move(sink));
   }
 
