@@ -20,11 +20,12 @@ namespace {
 /// How long the program waits for a terminal that takes nothing before it leaves it as it is.
 constexpr int kPatienceMs = 1000;
 
-/// Keys come one by one and unseen; the keys for interrupting and stopping go on working, those for holding
-/// the output do not.
+/// Keys come one by one and unseen; the keys for interrupting and stopping go on working, but cut off nothing that
+/// was written before; those for holding the output do not.
 termios screenModes(termios modes) {
   modes.c_iflag &= ~static_cast<tcflag_t>(ICRNL | INLCR | IXON);
   modes.c_lflag &= ~static_cast<tcflag_t>(ICANON | ECHO | ECHONL | IEXTEN);
+  modes.c_lflag |= NOFLSH;
   modes.c_cc[VMIN] = 1;
   modes.c_cc[VTIME] = 0;
   return modes;
