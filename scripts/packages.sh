@@ -21,6 +21,8 @@ schema    protobuf-compiler   protoc
 manual    groff               groff
 readme    jq                  jq
 readme    bsdutils            script
+load      time                /usr/bin/time
+load      diffutils           cmp
 shell     shellcheck          shellcheck
 '
 

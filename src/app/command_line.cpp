@@ -8,9 +8,11 @@
 #include <cstring>
 #include <functional>
 #include <optional>
+#include <sstream>
 #include <string>
 #include <vector>
 
+#include "app/data_output.h"
 #include "app/decode_command.h"
 #include "app/run_command.h"
 #include "app/show_command.h"
@@ -133,8 +135,7 @@ class CommandLine {
       program_.parse(argc, argv);
     } catch (const CLI::ParseError& error) {
       if (error.get_exit_code() == 0) {
-        program_.exit(error);
-        return Outcome::done;
+        return printAnswer(error);
       }
       tellMistake(error);
       return Outcome::wrongUsage;
@@ -228,6 +229,17 @@ class CommandLine {
     addLogOption(*simulate, kDataLog);
     simulate->footer(kSimulateExamples);
     simulate->final_callback([this] { command_ = [this] { return runSimulate(simulate_); }; });
+  }
+
+  /// The help or the version.
+  Outcome printAnswer(const CLI::ParseError& asked) {
+    std::ostringstream answer;
+    program_.exit(asked, answer, answer);
+    std::string text = answer.str();
+    if (text.ends_with('\n')) text.pop_back();
+    DataOutput output;
+    output.writeLine(text);
+    return output.finish(Outcome::done);
   }
 
   /// An option of the program that the subcommand would not heed; empty for none.

@@ -1,17 +1,31 @@
 #include "app/outcome.h"
 
-#include <cstdio>
 #include <string>
+#include <unistd.h>
 
+#include "platform/output_lines.h"
 #include "platform/visible_text.h"
 
 namespace vesk {
 
+namespace {
+
+DescriptorSink& standardError() {
+  static DescriptorSink theSink(STDERR_FILENO, "standard error");
+  return theSink;
+}
+
+}  // namespace
+
 void tellUser(std::string_view line) {
   std::string shown;
   appendVisible(shown, line);
-  shown += '\n';
-  std::fwrite(shown.data(), 1, shown.size(), stderr);
+  standardError().write(shown);
+  standardError().flush();
+}
+
+void interruptTellingBy(const WakeUp& interrupt) {
+  standardError().setInterrupt(&interrupt);
 }
 
 }  // namespace vesk

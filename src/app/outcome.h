@@ -2,12 +2,17 @@
 
 #include <string_view>
 
+#include "platform/wake_up.h"
+
 namespace vesk {
 
 /// How a command ends; the values are its exit statuses.
 enum class Outcome : int { done = 0, failed = 1, wrongUsage = 2 };
 
-/// Writes one line to standard error, control characters made visible.
+/// Writes one line to standard error, control characters made visible. Waits for a slow reader.
 void tellUser(std::string_view line);
+/// While `interrupt` is signalled, tellUser drops what a reader does not take at once. It must outlive the process's
+/// last line.
+void interruptTellingBy(const WakeUp& interrupt);
 
 }  // namespace vesk

@@ -23,7 +23,9 @@ namespace {
 /// One run of the program, from the source of its events to what shows them.
 class Run {
  public:
-  explicit Run(const RunOptions& options) : options_(options), isHeadless_(options.isHeadless) {}
+  explicit Run(const RunOptions& options) : options_(options), isHeadless_(options.isHeadless) {
+    interruptTellingBy(stopSignal_);
+  }
 
   Outcome run() {
     source_ = makeEventSource(options_.source, clock_,
@@ -58,6 +60,7 @@ class Run {
       loop_.stop();
     });
     sink->setInterrupt(&stopSignal_);
+    if (options_.duration) sink->setDeadline(clock_.now() + *options_.duration);
     OutputLines::setSink(std::move(sink));
   }
 

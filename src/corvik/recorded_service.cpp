@@ -105,6 +105,8 @@ void RecordedService::playEvent(const RecordedEvent& event, EventStream& events)
     const std::lock_guard lock(mutex_);
     next_.reset();
     state_.position = event.at;
+    // A recording may have grown since its end was looked at.
+    if (state_.duration) state_.duration = std::max(*state_.duration, event.at);
     ++state_.events;
   }
   events.raise(kEventMetric, makeMetricEvent(event.metricId, event.payload));

@@ -36,7 +36,7 @@ struct PlaybackState {
   Phase phase = Phase::notStarted;
   /// Seconds: how far into the recording it is, between the last event played and the next.
   double position = 0;
-  /// Seconds: "at" of the last event of all, where it can be known.
+  /// Seconds: "at" of the last event of all, where it can be known; never before the position.
   std::optional<double> duration;
   std::optional<double> speed;
   std::size_t events = 0;

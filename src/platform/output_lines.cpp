@@ -5,6 +5,7 @@
 #include <climits>
 #include <csignal>
 #include <cstring>
+#include <limits>
 #include <poll.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -47,33 +48,49 @@ void DescriptorSink::write(std::string_view line) {
 }
 
 void DescriptorSink::flush() {
+  const bool mayBlock = interrupt_ == nullptr && !deadline_;
   std::string_view rest = buffer_;
   while (!rest.empty() && !hasFailed_) {
-    if (waitForRoom() == Room::interrupted) break;
-    const std::size_t most = interrupt_ == nullptr ? rest.size() : chunk_;
-    const ssize_t written = ::write(descriptor_, rest.data(), std::min(rest.size(), most));
+    const Room room = mayBlock ? Room::some : waitForRoom();
+    if (room == Room::interrupted) break;
+    if (room == Room::neverAgain) {
+      fail("nobody reads it");
+      break;
+    }
+    const ssize_t written = ::write(descriptor_, rest.data(), mayBlock ? rest.size() : std::min(rest.size(), chunk_));
     if (written >= 0) {
       rest.remove_prefix(static_cast<std::size_t>(written));
     } else if (errno != EINTR && errno != EAGAIN) {
-      fail(errno);
+      fail(std::strerror(errno));
     }
   }
   buffer_.clear();
 }
 
 DescriptorSink::Room DescriptorSink::waitForRoom() const {
-  if (interrupt_ == nullptr) return Room::some;
-  pollfd polled[] = {{descriptor_, POLLOUT, 0}, {interrupt_->descriptor(), POLLIN, 0}};
+  // A negative descriptor is passed over.
+  pollfd polled[] = {{descriptor_, POLLOUT, 0}, {interrupt_ != nullptr ? interrupt_->descriptor() : -1, POLLIN, 0}};
   // What poll fails for, the write that follows tells better.
-  while (poll(polled, std::size(polled), -1) < 0 && errno == EINTR) {
-  }
+  int count = 0;
+  do
+    count = poll(polled, std::size(polled), longestWait());
+  while ((count < 0 && errno == EINTR) || (count == 0 && std::chrono::steady_clock::now() < *deadline_));
+  if (count == 0) return Room::neverAgain;
   const bool isBlocked = polled[0].revents == 0;
   return isBlocked && polled[1].revents != 0 ? Room::interrupted : Room::some;
 }
 
-void DescriptorSink::fail(int error) {
+int DescriptorSink::longestWait() const {
+  if (!deadline_) return -1;
+  using std::chrono::milliseconds;
+  const auto left = std::chrono::ceil<milliseconds>(*deadline_ - std::chrono::steady_clock::now());
+  const auto wait = std::max(left, milliseconds(0)) + patience_;
+  return static_cast<int>(std::min<milliseconds::rep>(wait.count(), std::numeric_limits<int>::max()));
+}
+
+void DescriptorSink::fail(const char* reason) {
   hasFailed_ = true;
-  if (onFailure_) onFailure_(name_ + ": " + std::strerror(error));
+  if (onFailure_) onFailure_(name_ + ": " + reason);
 }
 
 std::unique_ptr<OutputSink> OutputLines::setSink(std::unique_ptr<OutputSink> sink) {

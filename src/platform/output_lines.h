@@ -1,8 +1,10 @@
 #pragma once
 
+#include <chrono>
 #include <functional>
 #include <initializer_list>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -38,23 +40,33 @@ class DescriptorSink : public OutputSink {
   /// While this is signalled no slow reader is waited for, and what it does not take is dropped; null for
   /// always waiting. Must outlive the sink.
   void setInterrupt(const WakeUp* interrupt) { interrupt_ = interrupt; }
+  /// From `deadline` on a reader that takes nothing for as long as `patience` has failed. Absent for never.
+  void setDeadline(std::optional<std::chrono::steady_clock::time_point> deadline,
+                   std::chrono::milliseconds patience = std::chrono::seconds(1)) {
+    deadline_ = deadline;
+    patience_ = patience;
+  }
 
   void write(std::string_view line) override;
   void flush() override;
   [[nodiscard]] bool hasFailed() const { return hasFailed_; }
 
  private:
-  enum class Room { some, interrupted };
+  enum class Room { some, interrupted, neverAgain };
 
   [[nodiscard]] Room waitForRoom() const;
-  void fail(int error);
+  /// Milliseconds in poll(2)'s manner.
+  [[nodiscard]] int longestWait() const;
+  void fail(const char* reason);
 
   int descriptor_;
   std::string name_;
   bool isTerminal_;
-  /// The most that is written at once while an interrupt is watched; a pipe that has room at all has room for this.
+  /// The most that is written at once where it may not block; a pipe that has room at all has room for this.
   std::size_t chunk_;
   const WakeUp* interrupt_ = nullptr;
+  std::optional<std::chrono::steady_clock::time_point> deadline_;
+  std::chrono::milliseconds patience_{};
   FailureHandler onFailure_;
   bool hasFailed_ = false;
   std::string buffer_;

@@ -1,12 +1,19 @@
 #include "platform/system_log.h"
 
+#include <algorithm>
 #include <atomic>
+#include <cerrno>
+#include <climits>
 #include <cstdarg>
 #include <cstdio>
+#include <fcntl.h>
 #include <mutex>
+#include <poll.h>
 #include <syslog.h>
+#include <unistd.h>
 #include <utility>
 
+#include "platform/file_descriptor.h"
 #include "platform/visible_text.h"
 
 namespace vesk {
@@ -23,21 +30,51 @@ class SyslogSink : public LogSink {
   void write(std::string_view line) override { syslog(LOG_NOTICE, "%.*s", static_cast<int>(line.size()), line.data()); }
 };
 
-class StreamSink : public LogSink {
+class DescriptorLogSink : public LogSink {
  public:
-  using Stream = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
-
-  explicit StreamSink(Stream stream) : stream_(std::move(stream)) {}
+  DescriptorLogSink(FileDescriptor descriptor, std::chrono::milliseconds patience)
+      : descriptor_(std::move(descriptor)), patience_(static_cast<int>(patience.count())) {}
 
   void write(std::string_view line) override {
-    std::string whole(line);
+    std::string whole;
+    if (dropped_ > 0) {
+      if (isCut_) whole += '\n';
+      whole += std::to_string(dropped_) + " lines were dropped here\n";
+    }
+    whole += line;
     whole += '\n';
-    std::fwrite(whole.data(), 1, whole.size(), stream_.get());
-    std::fflush(stream_.get());
+    const std::size_t left = leftOf(whole);
+    if (left == 0) {
+      dropped_ = 0;
+      isCut_ = false;
+    } else {
+      ++dropped_;
+      if (left < whole.size()) isCut_ = true;
+    }
   }
 
  private:
-  Stream stream_;
+  /// How many bytes the reader does not take. It is waited for once; when it has let that pass, no more until it reads.
+  std::size_t leftOf(std::string_view bytes) {
+    while (!bytes.empty()) {
+      pollfd polled{descriptor_.get(), POLLOUT, 0};
+      const int ready = poll(&polled, 1, dropped_ > 0 ? 0 : patience_);
+      if (ready == 0) break;
+      const ssize_t written = ::write(descriptor_.get(), bytes.data(), std::min<std::size_t>(bytes.size(), PIPE_BUF));
+      if (written >= 0) {
+        bytes.remove_prefix(static_cast<std::size_t>(written));
+      } else if (errno != EINTR && errno != EAGAIN) {
+        break;
+      }
+    }
+    return bytes.size();
+  }
+
+  FileDescriptor descriptor_;
+  int patience_;
+  /// Lines since the reader last took one, and whether the first of them was written in part.
+  std::size_t dropped_ = 0;
+  bool isCut_ = false;
 };
 
 struct State {
@@ -70,13 +107,14 @@ std::unique_ptr<LogSink> makeSyslogSink() {
 }
 
 std::unique_ptr<LogSink> makeStandardErrorSink() {
-  return std::make_unique<StreamSink>(StreamSink::Stream(stderr, [](std::FILE*) { return 0; }));
+  return std::make_unique<DescriptorLogSink>(FileDescriptor::borrowed(STDERR_FILENO), kLogPatience);
 }
 
-std::unique_ptr<LogSink> makeFileSink(const std::string& path) {
-  StreamSink::Stream stream(std::fopen(path.c_str(), "ae"), &std::fclose);
-  if (stream == nullptr) return nullptr;
-  return std::make_unique<StreamSink>(std::move(stream));
+std::unique_ptr<LogSink> makeFileSink(const std::string& path, std::chrono::milliseconds patience) {
+  constexpr int kMode = 0666;
+  FileDescriptor file(open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, kMode));
+  if (!file.isOpen()) return nullptr;
+  return std::make_unique<DescriptorLogSink>(std::move(file), patience);
 }
 
 std::unique_ptr<LogSink> SystemLog::setSink(std::unique_ptr<LogSink> sink) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -16,10 +17,15 @@ class LogSink {
 };
 
 [[nodiscard]] std::unique_ptr<LogSink> makeSyslogSink();
+/// How long the program waits for a reader of the log that has stopped reading. From then on lines are dropped until it
+/// reads again, and it is told how many they were.
+inline constexpr std::chrono::milliseconds kLogPatience{1000};
+
 [[nodiscard]] std::unique_ptr<LogSink> makeStandardErrorSink();
 /// Appends to the file, and drops what does not fit on a full disk; null when it cannot be opened, with errno telling
-/// why.
-[[nodiscard]] std::unique_ptr<LogSink> makeFileSink(const std::string& path);
+/// why. The file may be a pipe with a name.
+[[nodiscard]] std::unique_ptr<LogSink> makeFileSink(const std::string& path,
+                                                    std::chrono::milliseconds patience = kLogPatience);
 
 /// The log of the process. Without a sink, as at start, nothing is written.
 class SystemLog {

@@ -95,7 +95,12 @@ void Terminal::startAfresh() {
   shown_ = {};
 }
 
+/// A terminal that is still behind with the picture before is shown the newest one later.
 void Terminal::draw(Clock::Instant now) {
+  if (device_.isBehind()) {
+    needsDisplay_ = true;
+    return scheduleWakeUp(now);
+  }
   Grid wanted = render(presenter_.picture(now));
   std::string bytes;
   appendDifference(bytes, shown_, wanted, capabilities_);
@@ -111,8 +116,11 @@ void Terminal::scheduleWakeUp(Clock::Instant now) {
   const auto consider = [&](std::optional<Clock::Instant> when) {
     if (when && (!next || *when < *next)) next = when;
   };
-  consider(presenter_.nextChange());
-  if (needsDisplay_) consider(lastDrawn_ + kFrame);
+  // The device tells by itself when a terminal that is behind has room again.
+  if (!device_.isBehind()) {
+    consider(presenter_.nextChange());
+    if (needsDisplay_) consider(lastDrawn_ + kFrame);
+  }
   device_.wakeAfter(next ? std::optional(*next - now) : std::nullopt);
 }
 

@@ -17,18 +17,22 @@ namespace vesk {
 
 namespace {
 
-/// Keys come one by one and unseen; the keys for interrupting and stopping go on working, those for holding
-/// the output do not.
+/// How long the program waits for a terminal that takes nothing before it leaves it as it is.
+constexpr int kPatienceMs = 1000;
+
+/// Keys come one by one and unseen; the keys for interrupting and stopping go on working, but cut off nothing that
+/// was written before; those for holding the output do not.
 termios screenModes(termios modes) {
   modes.c_iflag &= ~static_cast<tcflag_t>(ICRNL | INLCR | IXON);
   modes.c_lflag &= ~static_cast<tcflag_t>(ICANON | ECHO | ECHONL | IEXTEN);
+  modes.c_lflag |= NOFLSH;
   modes.c_cc[VMIN] = 1;
   modes.c_cc[VTIME] = 0;
   return modes;
 }
 
 void setModes(int terminal, const termios& modes) {
-  while (tcsetattr(terminal, TCSADRAIN, &modes) != 0 && errno == EINTR) {
+  while (tcsetattr(terminal, TCSANOW, &modes) != 0 && errno == EINTR) {
   }
 }
 
@@ -74,6 +78,7 @@ void TerminalDevice::enter() {
 void TerminalDevice::leave() {
   terminal_signals::disarm();
   write(switches_.leave);
+  waitForTerminal();
   setModes(terminal_.get(), original_);
 }
 
@@ -87,6 +92,7 @@ TerminalDevice::Arrived TerminalDevice::receive() {
   std::uint64_t expirations = 0;
   [[maybe_unused]] const ssize_t ticks = read(timer_.get(), &expirations, sizeof expirations);
   signalled_.clear();
+  writeOn();
   const auto [isResized, isStopWanted, isContinued] = terminal_signals::take();
   Arrived arrived{.bytes = {}, .isResized = isResized, .isStopWanted = isStopWanted, .isContinued = isContinued};
 
@@ -123,16 +129,37 @@ Size TerminalDevice::size() const {
 }
 
 void TerminalDevice::write(std::string_view bytes) {
-  while (!bytes.empty() && !isGone_) {
-    const ssize_t written = ::write(terminal_.get(), bytes.data(), bytes.size());
+  unwritten_ += bytes;
+  writeOn();
+}
+
+void TerminalDevice::writeOn() {
+  if (unwritten_.empty()) return;
+  std::string_view rest = unwritten_;
+  bool hasRoom = true;
+  while (!rest.empty() && hasRoom && !isGone_) {
+    const ssize_t written = ::write(terminal_.get(), rest.data(), rest.size());
     if (written >= 0) {
-      bytes.remove_prefix(static_cast<std::size_t>(written));
+      rest.remove_prefix(static_cast<std::size_t>(written));
     } else if (errno == EAGAIN) {
-      pollfd polled{terminal_.get(), POLLOUT, 0};
-      poll(&polled, 1, -1);
+      hasRoom = false;
     } else if (errno != EINTR) {
       isGone_ = true;
     }
+  }
+  unwritten_.erase(0, isGone_ ? unwritten_.size() : unwritten_.size() - rest.size());
+  epoll_event event{};
+  event.events = unwritten_.empty() ? EPOLLIN : EPOLLIN | EPOLLOUT;
+  event.data.fd = terminal_.get();
+  epoll_ctl(events_.get(), EPOLL_CTL_MOD, terminal_.get(), &event);
+}
+
+/// Until it has taken everything, or is given up.
+void TerminalDevice::waitForTerminal() {
+  while (isBehind()) {
+    pollfd polled{terminal_.get(), POLLOUT, 0};
+    if (poll(&polled, 1, kPatienceMs) == 0) unwritten_.clear();
+    writeOn();
   }
 }
 

@@ -52,8 +52,11 @@ class TerminalDevice {
 
   /// 80 by 24 where the terminal does not know.
   [[nodiscard]] Size size() const;
-  /// Waits for a slow terminal. What a terminal that is gone does not take is dropped.
+  /// Writes what the terminal takes at once; the rest goes with the calls of `receive`. What a terminal that is gone
+  /// does not take is dropped.
   void write(std::string_view bytes);
+  /// Whether it has not taken all that was written yet: there is no use in writing more.
+  [[nodiscard]] bool isBehind() const { return !unwritten_.empty(); }
 
   /// Gives the terminal back, stops the program until it is continued, and takes the terminal over again.
   void suspend();
@@ -63,6 +66,8 @@ class TerminalDevice {
  private:
   void leave();
   void watch(int descriptor);
+  void writeOn();
+  void waitForTerminal();
 
   FileDescriptor terminal_;
   FileDescriptor events_;
@@ -70,6 +75,7 @@ class TerminalDevice {
   WakeUp signalled_;
   Switches switches_;
   termios original_{};
+  std::string unwritten_;
   bool isGone_ = false;
 };
 

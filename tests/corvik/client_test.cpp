@@ -196,6 +196,33 @@ TEST_F(ClientTest, WantsMetricsOnceConfiguredAndOnAndHoldsASourceBackThatIsAhead
   EXPECT_LT(mostAhead, kEvents / 2);
 }
 
+TEST_F(ClientTest, KeepsTheOrderOfEachThreadOfAServiceThatRaisesFromSeveral) {
+  constexpr std::int64_t kThreads = 4;
+  constexpr std::int64_t kEventsEach = 5000;
+  std::vector<std::int64_t> ids;
+  note(ids);
+  EventsOn(manager_);
+  {
+    std::vector<std::jthread> threads;
+    for (std::int64_t thread = 0; thread < kThreads; ++thread) {
+      threads.emplace_back([&, thread] {
+        for (std::int64_t event = 0; event < kEventsEach; ++event)
+          raise(event * kThreads + thread);
+      });
+    }
+    // Switching them off and on meanwhile loses none either.
+    for (int times = 0; times < 100; ++times) {
+      EventsOff(manager_);
+      EventsOn(manager_);
+    }
+  }
+  deliverAll();
+  ASSERT_EQ(ids.size(), static_cast<std::size_t>(kThreads * kEventsEach));
+  std::vector<std::int64_t> next(kThreads);
+  for (const std::int64_t id : ids)
+    ASSERT_EQ(id / kThreads, next[static_cast<std::size_t>(id % kThreads)]++);
+}
+
 TEST_F(ClientTest, LetsASourceGoThatShallStop) {
   std::jthread source([&](const std::stop_token& stop) { EXPECT_FALSE(service_->events->waitUntilWanted(stop)); });
 }

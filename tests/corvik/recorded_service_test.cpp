@@ -121,6 +121,21 @@ TEST_F(RecordedServiceTest, KeepsTheRecordingsPaceAndDoesNotWaitForAStepBack) {
     loop_.run();
 }
 
+TEST_F(RecordedServiceTest, TakesARecordingThatGrowsToBeAsLongAsItIsByThen) {
+  vesk::FileDescriptor recording = vesk::fileWith(line(1, 1));
+  const vesk::FileDescriptor writer(dup(recording.get()));
+  connect(std::move(recording), {1.0, true});
+  EXPECT_EQ(next(1), Ids{1});
+  EXPECT_EQ(service_->state().duration, 1.0);
+  // It comes to the end again and again, until that is elsewhere.
+  const std::string more = line(7, 2);
+  EXPECT_EQ(pwrite(writer.get(), more.data(), more.size(), static_cast<off_t>(line(1, 1).size())),
+            static_cast<ssize_t>(more.size()));
+  while (next(1) != Ids{2}) {
+  }
+  EXPECT_EQ(service_->state().duration, 7.0);
+}
+
 TEST_F(RecordedServiceTest, GoesRoundAndTellsBadLinesOnce) {
   connect(vesk::fileWith(line(0, 1) + "bad\n" + line(2, 2)), {1.0, true});
   stopAfter_ = 1;
@@ -158,6 +173,20 @@ TEST_F(RecordedServiceTest, IsInterruptedWhileItWaitsForAnEventsTime) {
   EXPECT_GT(clock_.waitForSleeper(), 1h);
   manager_.reset();
   EXPECT_TRUE(ids_.empty());
+}
+
+TEST_F(RecordedServiceTest, EndsInTheMidstOfEventsAtFullSpeed) {
+  connect(vesk::fileWith(line(0, 1) + line(1, 2)), {std::nullopt, true});
+  stopAfter_ = 1000;
+  loop_.run();
+  manager_.reset();
+  queue_.reset();
+  loop_.runDue();
+  const std::size_t delivered = ids_.size();
+  EXPECT_GE(delivered, stopAfter_);
+  EXPECT_EQ(service_->state().phase, Phase::playing);
+  loop_.runDue();
+  EXPECT_EQ(ids_.size(), delivered);
 }
 
 TEST_F(RecordedServiceTest, TellsWhyTheRecordingCouldNotBeRead) {

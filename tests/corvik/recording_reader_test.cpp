@@ -119,6 +119,47 @@ TEST(RecordingReader, NumbersLinesPassesOverBlankOnesAndGoesOnBehindBadOnes) {
   EXPECT_TRUE(readAll("").empty());
 }
 
+TEST(RecordingReader, ReadsLinesAsOtherSystemsEndAndMarkThem) {
+  const std::string event = R"({"at": 1, "metric": 2, "payload": "01"})";
+  const std::string mark = "\xEF\xBB\xBF";
+  using Read = std::vector<std::string>;
+  EXPECT_EQ(readAll(mark + event + "\r\n\r\n" + event + "\r\n" + event), (Read{"1.0 2 01", "1.0 2 01", "1.0 2 01"}));
+  EXPECT_EQ(readAll(mark + "\r\n" + event), (Read{"1.0 2 01"}));
+  EXPECT_EQ(readAll(mark), Read{});
+  EXPECT_EQ(readAll(event + '\n' + mark + event), (Read{"1.0 2 01", "r:2: no JSON object"}));
+  RecordingReader reader(fileWith(mark + event), "r");
+  for (int lap = 0; lap < 2; ++lap) {
+    EXPECT_EQ(textOf(reader.next()), "1.0 2 01");
+    ASSERT_TRUE(reader.rewind());
+  }
+}
+
+TEST(RecordingReader, EndsWhereTheEndIsWhenItComesThere) {
+  const std::string event = R"({"at": 1, "metric": 2, "payload": ""})";
+  FileDescriptor growing = fileWith(event + '\n' + event.substr(0, 9));
+  const FileDescriptor writer(dup(growing.get()));
+  RecordingReader reader(std::move(growing), "r");
+  int reads = 0;
+  reader.setBeforeRead([&](int) {
+    // Behind the first read stands the rest of the line that was cut off, and one line more.
+    if (++reads == 2) {
+      const std::string rest = event.substr(9) + '\n' + event;
+      EXPECT_EQ(pwrite(writer.get(), rest.data(), rest.size(), static_cast<off_t>(event.size()) + 10),
+                static_cast<ssize_t>(rest.size()));
+    }
+    return true;
+  });
+  for (int line = 0; line < 3; ++line)
+    EXPECT_EQ(textOf(reader.next()), "1.0 2 ") << line;
+  EXPECT_EQ(textOf(reader.next()), "end");
+
+  // One that was cut shorter meanwhile has its end there.
+  ASSERT_TRUE(reader.rewind());
+  EXPECT_EQ(ftruncate(writer.get(), static_cast<off_t>(event.size())), 0);
+  EXPECT_EQ(textOf(reader.next()), "1.0 2 ");
+  EXPECT_EQ(textOf(reader.next()), "end");
+}
+
 TEST(RecordingReader, PassesOverALineBeyondTheLongest) {
   const std::string event = R"({"at": 1, "metric": 2, "payload": ")" + std::string(800, 'a') + "\"}";
   const std::string read = "1.0 2 " + std::string(800, 'a');

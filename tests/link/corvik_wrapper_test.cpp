@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 #include <limits>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include "platform/main_queue.h"
@@ -146,6 +147,38 @@ TEST_F(CorvikWrapperTest, DropsAnEventWithoutADelegateWhenItComesOrWhenItsTurnCo
   loop_.runDue();
   EXPECT_TRUE(notes_.empty());
   EXPECT_EQ(log.lines().size(), 4U);
+}
+
+TEST_F(CorvikWrapperTest, LosesItsDelegateInTheMidstOfItsEvents) {
+  constexpr int kEvents = 5000;
+  constexpr std::size_t kNoted = 100;
+  /// Lets go of the last one who holds it while it is told of an event.
+  class LeavingDelegate : public NotingDelegate {
+   public:
+    LeavingDelegate(Lines& notes, std::shared_ptr<LeavingDelegate>& held) : NotingDelegate(notes), held_(held) {}
+    void metricsDidUpdate(const std::optional<Dictionary>& event) override {
+      NotingDelegate::metricsDidUpdate(event);
+      if (++count_ == kNoted) held_.reset();
+    }
+
+   private:
+    std::shared_ptr<LeavingDelegate>& held_;
+    std::size_t count_ = 0;
+  };
+  std::shared_ptr<LeavingDelegate> held;
+  held = std::make_shared<LeavingDelegate>(notes_, held);
+  wrapper_->listen();
+  wrapper_->setDelegate(held);
+  std::jthread source([this] {
+    for (int id = 0; id < kEvents; ++id)
+      service_->events->raise(corvik::kEventMetric, InterProcessDictionary());
+  });
+  while (held != nullptr)
+    loop_.runDue();
+  source.join();
+  settleHandlers();
+  loop_.runDue();
+  EXPECT_EQ(notes_.size(), kNoted);
 }
 
 TEST_F(CorvikWrapperTest, ReadsTheDelegateAgainWhenAnEventsTurnComes) {

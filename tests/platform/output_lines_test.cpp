@@ -1,5 +1,6 @@
 #include "platform/output_lines.h"
 
+#include <chrono>
 #include <fcntl.h>
 #include <gtest/gtest.h>
 #include <string>
@@ -101,6 +102,22 @@ TEST(DescriptorSink, DoesNotWaitForABlockedReaderOnceInterrupted) {
   sink.flush();
   EXPECT_FALSE(sink.hasFailed());
   EXPECT_FALSE(readSome(pipe.reading).empty());
+}
+
+TEST(DescriptorSink, GivesABlockedReaderUpWhenTheTimeIsOver) {
+  Pipe pipe;
+  std::vector<std::string> reasons;
+  DescriptorSink sink(pipe.writing.get(), "pipe");
+  sink.setFailureHandler([&](const std::string& reason) { reasons.push_back(reason); });
+  sink.setDeadline(std::chrono::steady_clock::now() - std::chrono::hours(1), std::chrono::milliseconds(0));
+  sink.write("in time");
+  sink.flush();
+  EXPECT_FALSE(sink.hasFailed());
+  const std::string line(1000, 'x');
+  for (int number = 0; number < 1000; ++number)
+    sink.write(line);
+  EXPECT_EQ(reasons, std::vector<std::string>{"pipe: nobody reads it"});
+  EXPECT_TRUE(readSome(pipe.reading).starts_with("in time\nxxx"));
 }
 
 }  // namespace

@@ -39,6 +39,7 @@ class ChildProcess {
     if (process_ > 0) waitForExit();
   }
 
+  [[nodiscard]] pid_t id() const { return process_; }
   int endBy(int signal) {
     kill(process_, signal);
     return waitForExit();

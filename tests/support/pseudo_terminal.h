@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstdlib>
@@ -15,12 +16,12 @@
 
 namespace vesk {
 
-/// Waits until there is something to read; false after ten seconds, which is never.
-inline bool waitUntilReadable(int descriptor) {
+/// Waits until there is something to read; false after that time, by default ten seconds, which is never.
+inline bool waitUntilReadable(int descriptor, int milliseconds = 10000) {
   pollfd polled{descriptor, POLLIN, 0};
   int count = 0;
   do
-    count = poll(&polled, 1, 10000);
+    count = poll(&polled, 1, milliseconds);
   while (count < 0 && errno == EINTR);
   return count == 1;
 }
@@ -62,12 +63,19 @@ class PseudoTerminal {
         unread_.erase(0, taken.size());
         return taken;
       }
-      std::array<char, 4096> buffer;
-      if (!waitUntilReadable(user_.get())) return unread_;
-      const ssize_t count = read(user_.get(), buffer.data(), buffer.size());
-      if (count <= 0) return unread_;
-      unread_.append(buffer.data(), static_cast<std::size_t>(count));
+      const std::string some = readSome();
+      if (some.empty()) return unread_;
+      unread_ += some;
     }
+  }
+  /// Blocks until something was written to the terminal; empty when nothing ever is, or never more.
+  [[nodiscard]] std::string readSome() const { return readWithin(10000); }
+  /// The same, for no longer than that.
+  [[nodiscard]] std::string readWithin(int milliseconds) const {
+    std::array<char, 4096> buffer;
+    if (!waitUntilReadable(user_.get(), milliseconds)) return {};
+    const ssize_t count = read(user_.get(), buffer.data(), buffer.size());
+    return {buffer.data(), static_cast<std::size_t>(std::max<ssize_t>(count, 0))};
   }
 
  private:

@@ -69,7 +69,8 @@ class TerminalTest : public testing::Test {
 TEST_F(TerminalTest, TakesTheTerminalOverAndGivesItBack) {
   ASSERT_TRUE(tty_.isLineByLine());
   open();
-  EXPECT_EQ(tty_.modes().c_lflag & (ICANON | ECHO | ISIG), static_cast<tcflag_t>(ISIG));
+  // A key that interrupts must not cut what is drawn off within a sequence.
+  EXPECT_EQ(tty_.modes().c_lflag & (ICANON | ECHO | ISIG | NOFLSH), static_cast<tcflag_t>(ISIG | NOFLSH));
   const std::string drawn = tty_.readUpTo("filter");
   EXPECT_TRUE(drawn.starts_with("<enter><clear>")) << drawn;
   EXPECT_NE(drawn.find("Device Info"), std::string::npos);
@@ -130,6 +131,36 @@ TEST_F(TerminalTest, DrawsAfreshWhenResized) {
   const std::string drawn = tty_.readUpTo("lines");
   EXPECT_TRUE(drawn.starts_with("<clear>")) << drawn;
   EXPECT_NE(drawn.find("<1,11>?"), std::string::npos) << drawn;
+}
+
+TEST_F(TerminalTest, GoesOnBesideATerminalThatStoppedReadingAndShowsItTheNewestLater) {
+  open();
+  const auto resize = [&](Size size) {
+    tty_.resize(size);
+    raise(SIGWINCH);
+    serveWhenReadable();
+  };
+  // Far more pictures than the terminal has room for.
+  for (int times = 0; times < 100; ++times) {
+    resize({300, 100});
+    resize({299, 100});
+  }
+  interface_.top().selectRow({0, 1});
+  tty_.type("j\r");
+  serveWhenReadable();
+  EXPECT_EQ(interface_.stack().stack().size(), 3U);
+  resize({61, 12});
+  clock_.advance(Terminal::kFrame);
+  std::string drawn;
+  while (drawn.find("<1,11>?") == std::string::npos) {
+    const std::string some = tty_.readSome();
+    ASSERT_FALSE(some.empty()) << drawn;
+    drawn += some;
+    terminal_->serve();
+  }
+  EXPECT_LT(drawn.find("<clear>"), drawn.rfind("<clear>"));
+  terminal_.reset();
+  EXPECT_TRUE(tty_.readUpTo("<leave>").ends_with("<leave>"));
 }
 
 TEST_F(TerminalTest, QuitsWhenTheTerminalIsGone) {

@@ -1,0 +1,206 @@
+// The program's own screens over contents that nobody would wish for.
+
+#include <gtest/gtest.h>
+#include <random>
+#include <variant>
+
+#include "app/connected_program.h"
+#include "app/hostile_recording.h"
+#include "corvik/recording_reader.h"
+#include "screens/first_level_view_controller.h"
+#include "screens/second_level_view_controller.h"
+#include "screens/vesk_view_controller.h"
+#include "support/input.h"
+#include "support/pictures.h"
+#include "support/recorded_output.h"
+#include "support/terminal_language.h"
+#include "terminal/capabilities.h"
+#include "terminal/diagnostic_lines.h"
+#include "terminal/difference.h"
+#include "toolkit/interface_layout.h"
+
+namespace vesk {
+namespace {
+
+/// What an intake holds, to be put back.
+struct Stores {
+  explicit Stores(const MetricValidator& intake)
+      : lte(intake.myLTE), umts(intake.myUMTS), gsm(intake.myGSM), common(intake.myCommon) {
+    for (const auto& [name, member] : kLatestRecords)
+      records.push_back(intake.*member);
+  }
+  void putInto(MetricValidator& intake) const {
+    intake.myLTE = lte;
+    intake.myUMTS = umts;
+    intake.myGSM = gsm;
+    intake.myCommon = common;
+    for (std::size_t index = 0; index < records.size(); ++index)
+      intake.*kLatestRecords[index].second = records[index];
+  }
+
+  LTE lte;
+  UMTS umts;
+  GSM gsm;
+  Common common;
+  std::vector<MetricValidator::LatestRecord> records;
+};
+
+/// Takes everything from the lists and records of the stores, one entry at a time.
+void shrinkStores(MetricValidator& intake) {
+  struct Shrink {
+    // The visitor sees stores that never change; these do.
+    void operator()(std::string_view, const RecordList& list) const {
+      if (list.size() > 0) const_cast<RecordList&>(list).erase(list.size() - 1);
+      if (list.size() > 0) operator()({}, list[0]);
+    }
+    void operator()(std::string_view, const Record& record) const {
+      if (!record.empty()) const_cast<Record&>(record).erase((record.end() - 1)->key.view());
+    }
+    void operator()(std::string_view, const Value&) const {}
+  };
+  visitFields(intake.myLTE, Shrink{});
+  visitFields(intake.myUMTS, Shrink{});
+  visitFields(intake.myGSM, Shrink{});
+  visitFields(intake.myCommon, Shrink{});
+  for (const auto& [name, member] : kLatestRecords) {
+    auto& record = intake.*member;
+    if (record) Shrink{}({}, *record);
+    if (record && record->empty()) record.reset();
+  }
+}
+
+/// Finds less in the stores each time that its table asks it for something.
+class ShrinkingScreen : public SecondLevelViewController {
+ public:
+  inline static bool isShrinking = false;
+
+  std::size_t numberOfSections() override { return shrunk().SecondLevelViewController::numberOfSections(); }
+  std::optional<Text> headerTitle(std::size_t section) override {
+    return shrunk().SecondLevelViewController::headerTitle(section);
+  }
+  std::size_t numberOfRows(std::size_t section) override {
+    return shrunk().SecondLevelViewController::numberOfRows(section);
+  }
+  std::unique_ptr<TableViewCell> cellForRow(IndexPath at) override {
+    return shrunk().SecondLevelViewController::cellForRow(at);
+  }
+  RowHeight rowHeight(IndexPath at) override { return shrunk().SecondLevelViewController::rowHeight(at); }
+
+ private:
+  ShrinkingScreen& shrunk() {
+    if (isShrinking) shrinkStores(*MetricValidator::shared());
+    return *this;
+  }
+};
+
+class ScreensUnderFire : public testing::Test {
+ protected:
+  void fillStores() {
+    corvik::RecordingReader reader(fileWith(recording_), "hostile");
+    for (auto step = reader.next(); const auto* event = std::get_if<corvik::RecordedEvent>(&step); step = reader.next())
+      program_.raise(event->metricId, event->payload);
+    program_.deliverAll();
+  }
+
+  const std::string recording_ = hostileRecording();
+  ConnectedProgram program_;
+  const InterfaceLayout layout_{{
+      .rootStack = makeStackOf<NavigationController>,
+      .firstScreen = "Launch",
+      .screens = {{"Launch", makeScreenOf<VeskViewController>, "Vesk"},
+                  {"FirstLevel", makeScreenOf<FirstLevelViewController>, {}},
+                  {"SecondLevel", makeScreenOf<ShrinkingScreen>, {}}},
+      .cells = veskInterfaceCells(),
+      .transitions = {{"Launch", "showCategories", "FirstLevel"}, {"FirstLevel", "showValues", "SecondLevel"}},
+  }};
+
+ private:
+  static std::vector<CellDeclaration> veskInterfaceCells() {
+    const auto cells = veskInterface().cells();
+    return {cells.begin(), cells.end()};
+  }
+};
+
+/// Calls `use` with the table of each category, which lies on top of `stack` meanwhile.
+template <class Use>
+void openEachCategory(NavigationController& stack, Use use) {
+  const auto top = [&stack]() -> TableViewController& {
+    return dynamic_cast<TableViewController&>(*stack.topViewController());
+  };
+  stack.loadViewIfNeeded();
+  for (std::size_t area = 0; area < top().tableView().numberOfRows(0); ++area) {
+    top().selectRow({0, area});
+    for (std::size_t category = 0; category < top().tableView().numberOfRows(0); ++category) {
+      top().selectRow({0, category});
+      use(top().tableView());
+      stack.popToDepth(2);
+    }
+    stack.popToDepth(1);
+  }
+}
+
+TEST_F(ScreensUnderFire, NothingOfAPayloadReachesTheTerminalAsAControl) {
+  setenv("TERM", "xterm-256color", 1);
+  std::string reason;
+  const std::optional<Capabilities> terminal = readCapabilities(STDOUT_FILENO, kHasUtf8Locale, reason);
+  ASSERT_TRUE(terminal.has_value()) << reason;
+  DiagnosticLines lines;
+  const auto output = OutputLines::setSink(std::make_unique<DiagnosticSink>(lines));
+  fillStores();
+  const std::shared_ptr<NavigationController> stack = layout_.makeRootStack();
+  Surroundings surroundings;
+  surroundings.diagnostics = &lines;
+  Desk desk(*stack, {100, 40}, surroundings);
+  desk.type(U"d");
+  TerminalLanguage language;
+  int screens = 0;
+  openEachCategory(*stack, [&](TableView&) {
+    ++screens;
+    for (const Size size : {Size{100, 40}, {31, 17}, {300, 90}}) {
+      desk.resize(size);
+      for (const Key key : {Key::Home, Key::Down, Key::PageDown, Key::End, Key::Up}) {
+        desk.press(key);
+        desk.type(U"[");
+        std::string bytes;
+        appendDifference(bytes, {}, desk.grid(), *terminal);
+        language.take(bytes);
+        ASSERT_EQ(language.fault(), std::nullopt);
+      }
+    }
+  });
+  EXPECT_EQ(screens, 42);
+  OutputLines::setSink(nullptr);
+}
+
+TEST_F(ScreensUnderFire, AStoreThatShrinksBetweenEveryCountAndCellLeavesRowsEmptyUntilItIsFilled) {
+  const RecordedOutput output;
+  fillStores();
+  MetricValidator& intake = *MetricValidator::shared();
+  const Stores filled(intake);
+  const std::shared_ptr<NavigationController> stack = layout_.makeRootStack();
+  constexpr std::array kKeys{Key::Down, Key::Up, Key::PageDown, Key::PageUp, Key::End, Key::Home, Key::Tab};
+  std::mt19937 random(1);
+  openEachCategory(*stack, [&](TableView& table) {
+    Desk desk(*stack, {60, 20});
+    table.reloadData();
+    const std::string whole = desk.picture();
+    ShrinkingScreen::isShrinking = true;
+    for (int number = 0; number < 60; ++number) {
+      if (number % 10 == 0) {
+        filled.putInto(intake);
+        table.reloadData();
+      }
+      if (number % 15 == 0) desk.type(number % 2 == 0 ? U"/1\r" : U"f");
+      desk.press(kKeys[random() % kKeys.size()]);
+      EXPECT_FALSE(desk.picture().empty());
+    }
+    ShrinkingScreen::isShrinking = false;
+    filled.putInto(intake);
+    Desk later(*stack, {60, 20});
+    table.reloadData();
+    EXPECT_EQ(later.picture(), whole);
+  });
+}
+
+}  // namespace
+}  // namespace vesk
