@@ -186,6 +186,11 @@ TEST(RecordingReader, KnowsItsDurationAndTheWayBackUnlessItReadsAPipe) {
   EXPECT_FALSE(live.rewind());
 }
 
+TEST(RecordingReader, KnowsTheDurationOfARecordingOfOneEventBehindAByteOrderMark) {
+  RecordingReader file(fileWith("\xEF\xBB\xBF{\"at\": 3, \"metric\": 2, \"payload\": \"\"}\n"), "file");
+  EXPECT_EQ(file.duration(), 3.0);
+}
+
 TEST(RecordedEvent, IsWrittenAsItIsRead) {
   const std::uint8_t payload[] = {0x08, 0x95};
   std::string lines;
