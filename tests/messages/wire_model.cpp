@@ -1,6 +1,5 @@
 #include "messages/wire_model.h"
 
-#include <algorithm>
 #include <map>
 #include <set>
 #include <string>
@@ -137,19 +136,22 @@ class MessageModel {
   }
 
   [[nodiscard]] Dictionary dictionary() const {
-    std::vector<Field> fields = type_.fields;
-    std::sort(fields.begin(), fields.end(), [](const Field& a, const Field& b) { return a.number < b.number; });
+    std::map<std::uint32_t, const Field*> fieldsByNumber;
+    for (const Field& field : type_.fields)
+      fieldsByNumber[field.number] = &field;
     Dictionary dictionary;
-    for (const Field& field : fields) {
-      const auto found = arrived_.find(field.number);
-      const std::vector<Value> values = found == arrived_.end() ? std::vector<Value>() : found->second;
-      if (field.repeated) {
+    for (const auto& [number, field] : fieldsByNumber) {
+      const auto found = arrived_.find(number);
+      const bool hasArrived = found != arrived_.end() && !found->second.empty();
+      if (hasArrived && !field->repeated) {
+        dictionary.set(Text::copy(field->name), found->second.back());
+      } else if (hasArrived || field->isRepeatedScalar()) {
         Array array;
-        for (const Value& each : values)
-          array.append(each);
-        if (!values.empty() || field.isRepeatedScalar()) dictionary.set(Text::copy(field.name), array);
-      } else if (!values.empty()) {
-        dictionary.set(Text::copy(field.name), values.back());
+        if (hasArrived) {
+          for (const Value& each : found->second)
+            array.append(each);
+        }
+        dictionary.set(Text::copy(field->name), array);
       }
     }
     return dictionary;

@@ -8,9 +8,13 @@ namespace {
 
 std::atomic<std::uint64_t> allocated = 0;
 
-void* allocate(std::size_t size) {
+void* countedBlock(std::size_t size) {
   allocated.fetch_add(size, std::memory_order_relaxed);
-  if (void* block = std::malloc(size == 0 ? 1 : size)) return block;
+  return std::malloc(size == 0 ? 1 : size);
+}
+
+void* countedBlockOrFailure(std::size_t size) {
+  if (void* block = countedBlock(size)) return block;
   throw std::bad_alloc();
 }
 
@@ -21,10 +25,16 @@ std::uint64_t vesk::allocatedBytes() {
 }
 
 void* operator new(std::size_t size) {
-  return allocate(size);
+  return countedBlockOrFailure(size);
 }
 void* operator new[](std::size_t size) {
-  return allocate(size);
+  return countedBlockOrFailure(size);
+}
+void* operator new(std::size_t size, const std::nothrow_t& /*tag*/) noexcept {
+  return countedBlock(size);
+}
+void* operator new[](std::size_t size, const std::nothrow_t& /*tag*/) noexcept {
+  return countedBlock(size);
 }
 void operator delete(void* block) noexcept {
   std::free(block);
