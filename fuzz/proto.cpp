@@ -109,9 +109,13 @@ void checkNames(const ProtoFile& file) {
   }
 }
 
-/// Nothing of the schema's text gets out of the comment or literal that it stands in.
+/// A comment of the schema ends in the code where it ends in the schema.
 void checkGenerated(const std::string& code) {
-  require(code.find("\\\n") == std::string::npos, "no line of code goes on in the next one");
+  for (std::size_t end = code.find('\n'); end != std::string::npos; end = code.find('\n', end + 1)) {
+    const std::size_t last = code.find_last_not_of(" \t\n", end);
+    require(last == std::string::npos || code[last] != '\\', "no line of code goes on in the next one");
+  }
+  require(code.find('\r') == std::string::npos, "every compiler sees the same lines");
 }
 
 void checkSchema(const std::string& source) {
