@@ -119,6 +119,11 @@ TEST(RecordingReader, NumbersLinesPassesOverBlankOnesAndGoesOnBehindBadOnes) {
   EXPECT_TRUE(readAll("").empty());
 }
 
+TEST(RecordingReader, RefusesALastLineForTheSameReasonWhateverWasReadBefore) {
+  EXPECT_EQ(readAll("0123456789}\n{\"at\": 1}}"),
+            (std::vector<std::string>{"r:1: no JSON object", "r:2: more than one object"}));
+}
+
 TEST(RecordingReader, PassesOverALineBeyondTheLongest) {
   const std::string event = R"({"at": 1, "metric": 2, "payload": ")" + std::string(800, 'a') + "\"}";
   const std::string read = "1.0 2 " + std::string(800, 'a');
