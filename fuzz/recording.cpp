@@ -134,7 +134,7 @@ void checkDuration(std::string_view content, const Outcomes& outcomes) {
     if (!each.text.starts_with("recording:")) last = each.text.substr(0, each.text.find(' '));
   }
   std::string duration = "none";
-  if (const auto seconds = RecordingReader(fileWith(content), "recording").duration()) {
+  if (const auto seconds = RecordingReader(fileWith(content), "recording", content.size()).duration()) {
     duration.clear();
     appendDecimal(duration, *seconds);
   }
@@ -158,7 +158,7 @@ void checkRecording(std::string_view content, std::size_t longestLine, std::size
 }  // namespace vesk
 
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  constexpr std::size_t kLongestLines[] = {80, 300, vesk::LineReader::kLongestLine};
+  constexpr std::size_t kLongestLines[] = {80, 300, 4096};
   if (size < 2) return 0;
   const std::string_view content(reinterpret_cast<const char*>(data) + 2, size - 2);
   vesk::checkRecording(content, kLongestLines[data[0] % std::size(kLongestLines)], 1 + data[1]);
