@@ -6,6 +6,7 @@
 #include <cstdlib>
 
 /// What libFuzzer and the replaying main call with each input. It returns 0, or not at all.
+// NOLINTNEXTLINE(readability-identifier-naming): libFuzzer's own name
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size);
 
 namespace vesk {

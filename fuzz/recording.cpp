@@ -16,7 +16,6 @@ namespace vesk {
 
 namespace {
 
-using corvik::LineReader;
 using corvik::RecordedEvent;
 using corvik::RecordedEventParser;
 using corvik::RecordingReader;
@@ -105,7 +104,7 @@ std::string outcomeOf(std::string_view line, std::size_t number) {
 
   std::string written;
   corvik::appendRecordedEvent(written, *event);
-  const std::string text = textOf(*event);
+  std::string text = textOf(*event);
   const Outcomes again = readFile(written, written.size());
   require(again.size() == 1 && again[0].text == text, "an event is written as it is read");
   return text;
