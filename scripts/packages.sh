@@ -15,6 +15,7 @@ test      libgtest-dev        /usr/include/gtest/gtest.h
 test      protobuf-compiler   protoc
 test      libprotobuf-dev     /usr/include/google/protobuf/message.h
 clang     clang               clang++
+fuzz      libclang-rt-14-dev  /usr/lib/llvm-14/lib/clang/14.0.6/include/fuzzer/FuzzedDataProvider.h
 format    clang-format        clang-format
 tidy      clang-tidy          clang-tidy
 schema    protobuf-compiler   protoc

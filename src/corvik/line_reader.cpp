@@ -45,6 +45,8 @@ LineReader::Found LineReader::next() {
       case Input::more:
         break;
       case Input::end:
+        // There is room: it was made for the read that brought nothing.
+        buffer_[end_] = '\n';
         if (begin_ < end_ || isPassingOver_) return take(end_, end_);
         return Found::end;
       case Input::failure:

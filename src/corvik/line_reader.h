@@ -28,7 +28,8 @@ class LineReader {
   /// Finds the next line. One beyond the longest is passed over without being kept. After a failure errno
   /// tells why, and so it stays.
   [[nodiscard]] Found next();
-  /// The line found, without its line feed; valid until the next call.
+  /// The line found, without its line feed; valid until the next call. A line feed follows it, also behind a last line
+  /// that came without.
   [[nodiscard]] std::string_view line() const { return line_; }
   /// Its number, from 1.
   [[nodiscard]] std::size_t lineNumber() const { return lineNumber_; }

@@ -33,6 +33,12 @@ std::optional<std::string> whyUnreadable(const vesk::FileDescriptor& descriptor,
   return std::nullopt;
 }
 
+/// What a recording starts with is no part of its first line.
+std::string_view withoutByteOrderMark(std::string_view line) {
+  if (line.starts_with(kByteOrderMark)) line.remove_prefix(kByteOrderMark.size());
+  return line;
+}
+
 bool isBlank(std::string_view line) {
   return line.find_first_not_of(" \t\r") == std::string_view::npos;
 }
@@ -62,9 +68,7 @@ RecordingReader::Step RecordingReader::next() {
         break;
     }
     std::string_view line = lines_.line();
-    if (lines_.lineNumber() == 1 && line.starts_with(kByteOrderMark)) {
-      line.remove_prefix(kByteOrderMark.size());
-    }
+    if (lines_.lineNumber() == 1) line = withoutByteOrderMark(line);
     if (isBlank(line)) continue;
     if (const std::optional<RecordedEvent> event = parser_.parse(line)) return *event;
     return badLine(parser_.reason());
@@ -83,6 +87,7 @@ std::optional<double> RecordingReader::duration() const {
 
   RecordedEventParser parser;
   std::string_view rest(tail.data(), size);
+  if (start == 0) rest = withoutByteOrderMark(rest);
   while (!rest.empty()) {
     const std::size_t lineFeed = rest.rfind('\n');
     const std::size_t lineStart = lineFeed == std::string_view::npos ? 0 : lineFeed + 1;

@@ -4,27 +4,11 @@
 
 namespace vesk {
 
-namespace {
-
-#if defined(__SANITIZE_ADDRESS__)
-constexpr bool kIsRecycling = false;
-#elif defined(__has_feature)
-#if __has_feature(address_sanitizer)
-constexpr bool kIsRecycling = false;
-#else
-constexpr bool kIsRecycling = true;
-#endif
-#else
-constexpr bool kIsRecycling = true;
-#endif
-
-}  // namespace
-
 /// Opens the lists of its thread, and empties and closes them when the thread ends.
 struct RecycledMemory::Keeper {
   Keeper() {
     for (FreeList& list : lists_)
-      list.room = kIsRecycling ? kMostKept : 0;
+      list.room = kHasAddressSanitizer ? 0 : kMostKept;
   }
   ~Keeper() {
     for (FreeList& list : lists_) {

@@ -160,6 +160,11 @@ TEST(RecordingReader, EndsWhereTheEndIsWhenItComesThere) {
   EXPECT_EQ(textOf(reader.next()), "end");
 }
 
+TEST(RecordingReader, RefusesALastLineForTheSameReasonWhateverWasReadBefore) {
+  EXPECT_EQ(readAll("0123456789}\n{\"at\": 1}}"),
+            (std::vector<std::string>{"r:1: no JSON object", "r:2: more than one object"}));
+}
+
 TEST(RecordingReader, PassesOverALineBeyondTheLongest) {
   const std::string event = R"({"at": 1, "metric": 2, "payload": ")" + std::string(800, 'a') + "\"}";
   const std::string read = "1.0 2 " + std::string(800, 'a');
@@ -225,6 +230,11 @@ TEST(RecordingReader, KnowsItsDurationAndTheWayBackUnlessItReadsAPipe) {
   RecordingReader live(std::move(pipe.reading), "pipe");
   EXPECT_EQ(live.duration(), std::nullopt);
   EXPECT_FALSE(live.rewind());
+}
+
+TEST(RecordingReader, KnowsTheDurationOfARecordingOfOneEventBehindAByteOrderMark) {
+  RecordingReader file(fileWith("\xEF\xBB\xBF{\"at\": 3, \"metric\": 2, \"payload\": \"\"}\n"), "file");
+  EXPECT_EQ(file.duration(), 3.0);
 }
 
 TEST(RecordedEvent, IsWrittenAsItIsRead) {

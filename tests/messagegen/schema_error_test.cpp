@@ -56,6 +56,11 @@ TEST(Schema, TellsWhereAndWhatIsWrong) {
       {"import a.proto;", "8", "expected the path of a .proto file, got identifier 'a.proto'"},
       {"import \"a.proto", "8", "a string that never ends"},
       {"  /* a", "3", "a comment that never ends"},
+      {"  // a\\", "3", "a comment that ends in a backslash"},
+      {"  // a\\ \t", "3", "a comment that ends in a backslash"},
+      {"// a\r b", "1", "a comment with a control character"},
+      {"message class { }", "9", "'class' is a keyword of C++"},
+      {"enum E { static_assert = 1; }", "10", "'static_assert' is a keyword of C++"},
       {"message M { % }", "13", "unexpected character '%'"},
 
       {"message M { optional Unknown a = 1; }", "22", "unknown type 'Unknown'"},
@@ -69,6 +74,10 @@ TEST(Schema, TellsWhereAndWhatIsWrong) {
       {"message M { optional uint32 as_count = 1; repeated uint32 a = 2; }", "59",
        "the accessor 'asCount' has its name from something else already"},
       {"message M { optional bool class = 1; }", "27", "the accessor 'class' has its name from something else already"},
+      {"message m { optional bool m = 1; }", "27", "the accessor 'm' has its name from something else already"},
+      {"message M { enum kind { A = 1; } optional bool kind = 1; }", "48",
+       "the accessor 'kind' has its name from something else already"},
+      {"message M { optional bool _1 = 1; }", "27", "the accessor '1' is no name"},
       {"message M { optional bool write_to = 1; }", "27",
        "the accessor 'writeTo' has its name from something else already"},
   };
@@ -89,6 +98,25 @@ TEST(Schema, TellsOfFilesThatCannotBeRead) {
             "a.proto:2:8: import \"b.proto\" cannot be read\nimport \"b.proto\";\n       ^\n");
   EXPECT_EQ(errorOf({{"a.proto", start + " import \"b.proto\";"}, {"b.proto", "x"}}, "a.proto"),
             "b.proto:1:1: expected 'syntax', got identifier 'x'\nx\n^\n");
+
+  const std::string imports = start + " import \"b.proto\"; message M {}";
+  const std::string shown = "\n" + imports + "\n" + std::string(37, ' ') + "^\n";
+  EXPECT_EQ(errorOf({{"a.proto", imports}, {"b.proto", start + " enum M { A = 1; }"}}, "a.proto"),
+            "a.proto:1:38: import \"b.proto\" declares 'M', which is declared already" + shown);
+  EXPECT_EQ(errorOf({{"a.proto", imports}, {"b.proto", "syntax = \"proto2\"; package q;"}}, "a.proto"),
+            "a.proto:1:38: import \"b.proto\" is of another package" + shown);
+}
+
+TEST(Schema, RefusesMessagesThatNestWithoutBound) {
+  std::string source = "syntax = \"proto2\"; package p;\n";
+  for (int depth = 0; depth < 1'000; ++depth) {
+    const std::string name = "M" + std::to_string(depth);
+    source += "message " + name + " { optional M" + std::to_string(depth + 1) + " m = 1; }\n";
+  }
+  source += "message M1000 {}\n";
+  EXPECT_EQ(errorOf({{"a.proto", source}}, "a.proto"),
+            "a.proto:33:24: messages nest more than 32 deep\nmessage M31 { optional M32 m = 1; }\n" +
+                std::string(23, ' ') + "^\n");
 }
 
 TEST(Schema, OrdersMessagesByUseAndFindsImportedTypes) {
@@ -104,6 +132,18 @@ TEST(Schema, OrdersMessagesByUseAndFindsImportedTypes) {
   EXPECT_EQ(file.messages[1].name, "A");
   EXPECT_EQ(file.messages[1].fields[1].type, FieldType::enumeration);
   EXPECT_EQ(file.messages[1].fields[1].defaultName, "FIRST");
+}
+
+TEST(Schema, TakesAMessageForOneThoughItIsCalledLikeAScalar) {
+  const std::string source = "syntax = \"proto2\"; package p; message uint32 { optional uint32 a = 1; }";
+  const ProtoFile file = loadProto("a.proto", [&](const std::string&) { return std::optional(source); });
+  EXPECT_EQ(file.messages[0].fields[0].type, FieldType::uint32);
+}
+
+TEST(Schema, TakesLinesThatEndAsOnWindows) {
+  const std::string source = "syntax = \"proto2\";\r\npackage p;\r\n// Said.\r\nenum E { A = 1; }\r\n";
+  const ProtoFile file = loadProto("a.proto", [&](const std::string&) { return std::optional(source); });
+  EXPECT_EQ(file.enumerations[0].comment, Comment{"Said."});
 }
 
 }  // namespace

@@ -4,6 +4,7 @@
 #include <set>
 
 #include "messages/filled_message.h"
+#include "messages/proto_schema.h"
 #include "support/decoded.h"
 
 namespace vesk {

@@ -1,54 +1,24 @@
 #include "messages/filled_message.h"
 
-#include <fstream>
-#include <iterator>
 #include <limits>
 
 #include "emit.h"
 #include "messages/codec/proto_writer.h"
-#include "resolver.h"
+#include "messages/proto_schema.h"
 
 namespace vesk {
 
 namespace {
 
-using messagegen::Enumeration;
 using messagegen::Field;
 using messagegen::FieldType;
-
-struct Schema {
-  std::map<std::string, messagegen::MessageType, std::less<>> messages;
-  std::map<std::string, Enumeration> enumerations;
-
-  Schema() {
-    const auto readSource = [](const std::string& path) {
-      std::ifstream file(std::string(VESK_SCHEMA) + '/' + path);
-      return std::optional(std::string(std::istreambuf_iterator<char>(file), {}));
-    };
-    for (const char* path :
-         {"gsm/gsm.proto", "lte/lte.proto", "nas/nas.proto", "shared/sys_band.proto", "wcdma/wcdma.proto"}) {
-      const messagegen::ProtoFile file = messagegen::loadProto(path, readSource);
-      for (const auto& enumeration : file.enumerations)
-        enumerations[enumeration.name] = enumeration;
-      for (const auto& message : file.messages) {
-        messages[message.name] = message;
-        for (const auto& enumeration : message.enumerations)
-          enumerations[enumeration.name] = enumeration;
-      }
-    }
-  }
-};
-
-const Schema& theSchema() {
-  static const Schema kSchema;
-  return kSchema;
-}
 
 class Filler {
  public:
   explicit Filler(Filling filling) : isExtreme_(filling == Filling::extreme) {}
 
   FilledMessage fill(const messagegen::MessageType& message) {
+    message_ = &message;
     FilledMessage filled;
     ProtoWriter writer;
     for (const Field& field : messagegen::fieldsByNumber(message)) {
@@ -95,7 +65,7 @@ class Filler {
         return data;
       }
       case FieldType::message: {
-        FilledMessage part = Filler(*this).fill(theSchema().messages.at(field.typeName));
+        FilledMessage part = Filler(*this).fill(schema().at(field.typeName));
         writer.writeBytes(Data::copy(part.payload), field.number);
         return part.dictionary;
       }
@@ -123,7 +93,7 @@ class Filler {
         writer.writeBool(true, number);
         return true;
       case FieldType::enumeration: {
-        const auto& values = theSchema().enumerations.at(field.typeName).values;
+        const auto& values = enumerationOf(*message_, field).values;
         const auto& value = isExtreme_ ? values.back() : values[1];
         writer.writeInt32(value.number, number);
         return Text::copy(value.name);
@@ -135,15 +105,12 @@ class Filler {
   }
 
   bool isExtreme_;
+  const messagegen::MessageType* message_ = nullptr;
   std::uint32_t last_ = 0;
   std::vector<std::size_t> elementEnds_;
 };
 
 }  // namespace
-
-const std::map<std::string, messagegen::MessageType, std::less<>>& schema() {
-  return theSchema().messages;
-}
 
 FilledMessage filledMessage(std::string_view className, Filling filling) {
   return Filler(filling).fill(schema().find(className)->second);

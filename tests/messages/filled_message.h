@@ -1,18 +1,12 @@
 #pragma once
 
-#include <map>
-#include <string>
 #include <string_view>
 #include <vector>
 
 #include "platform/value.h"
-#include "schema.h"
 #include "support/bytes.h"
 
 namespace vesk {
-
-/// The .proto files themselves, by the names of their messages.
-[[nodiscard]] const std::map<std::string, messagegen::MessageType, std::less<>>& schema();
 
 enum class Filling { small, extreme };
 

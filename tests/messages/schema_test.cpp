@@ -4,10 +4,10 @@
 #include <gtest/gtest.h>
 #include <map>
 
-#include "messages/filled_message.h"
 #include "messages/gsm/gsm.h"
 #include "messages/lte/lte.h"
 #include "messages/nas/nas.h"
+#include "messages/proto_schema.h"
 #include "messages/wcdma/wcdma.h"
 #include "support/decoded.h"
 

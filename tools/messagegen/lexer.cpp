@@ -16,6 +16,9 @@ bool isWordStart(char c) {
 bool isWordPart(char c) {
   return isWordStart(c) || isDigit(c);
 }
+bool isControl(char c) {
+  return std::iscntrl(static_cast<unsigned char>(c)) != 0 && c != '\t';
+}
 /// A name may be qualified, and is one token then.
 bool isNamePart(char c) {
   return isWordPart(c) || c == '.';
@@ -61,6 +64,11 @@ std::string Lexer::takeLineComment() {
   const std::size_t end = std::min(source_.find('\n', offset_), source_.size());
   std::string_view text = source_.substr(offset_ + 2, end - offset_ - 2);
   if (text.starts_with(' ')) text.remove_prefix(1);
+  if (text.ends_with('\r')) text.remove_suffix(1);
+  // It becomes a comment of the generated code, and must end there where it ends here.
+  if (std::any_of(text.begin(), text.end(), isControl)) fail(position_, "a comment with a control character");
+  if (text.substr(0, text.find_last_not_of(" \t") + 1).ends_with('\\'))
+    fail(position_, "a comment that ends in a backslash");
   advance(end - offset_);
   return std::string(text);
 }

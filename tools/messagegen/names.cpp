@@ -1,10 +1,28 @@
 #include "names.h"
 
+#include <algorithm>
 #include <cctype>
+#include <set>
 
 namespace messagegen {
 
 namespace {
+
+const std::set<std::string_view> kKeywords{
+    "alignas",     "alignof",  "and",        "and_eq",    "asm",       "auto",         "bitand",
+    "bitor",       "bool",     "break",      "case",      "catch",     "char",         "char16_t",
+    "char32_t",    "char8_t",  "class",      "co_await",  "co_return", "co_yield",     "compl",
+    "concept",     "const",    "const_cast", "consteval", "constexpr", "constinit",    "continue",
+    "decltype",    "default",  "delete",     "do",        "double",    "dynamic_cast", "else",
+    "enum",        "explicit", "export",     "extern",    "false",     "float",        "for",
+    "friend",      "goto",     "if",         "inline",    "int",       "long",         "mutable",
+    "namespace",   "new",      "noexcept",   "not",       "not_eq",    "nullptr",      "operator",
+    "or",          "or_eq",    "private",    "protected", "public",    "register",     "reinterpret_cast",
+    "requires",    "return",   "short",      "signed",    "sizeof",    "static",       "static_assert",
+    "static_cast", "struct",   "switch",     "template",  "this",      "thread_local", "throw",
+    "true",        "try",      "typedef",    "typeid",    "typename",  "union",        "unsigned",
+    "using",       "virtual",  "void",       "volatile",  "wchar_t",   "while",        "xor",
+    "xor_eq"};
 
 char raised(char c) {
   return static_cast<char>(std::toupper(static_cast<unsigned char>(c)));
@@ -14,6 +32,16 @@ char lowered(char c) {
 }
 
 }  // namespace
+
+bool isKeyword(std::string_view name) {
+  return kKeywords.contains(name);
+}
+
+bool isIdentifier(std::string_view name) {
+  const auto isDigit = [](char c) { return std::isdigit(static_cast<unsigned char>(c)) != 0; };
+  const auto isPart = [](char c) { return std::isalnum(static_cast<unsigned char>(c)) != 0 || c == '_'; };
+  return !name.empty() && !isDigit(name.front()) && std::all_of(name.begin(), name.end(), isPart);
+}
 
 std::string capitalized(std::string_view name) {
   std::string result(name);

@@ -15,4 +15,9 @@ namespace messagegen {
 /// With its first letter raised.
 [[nodiscard]] std::string capitalized(std::string_view name);
 
+/// Whether C++ keeps the word for itself.
+[[nodiscard]] bool isKeyword(std::string_view name);
+/// Whether C++ takes it for a word at all.
+[[nodiscard]] bool isIdentifier(std::string_view name);
+
 }  // namespace messagegen

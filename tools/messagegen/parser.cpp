@@ -7,6 +7,7 @@
 #include <set>
 
 #include "lexer.h"
+#include "names.h"
 
 namespace messagegen {
 
@@ -62,10 +63,18 @@ class Parser {
     return std::string(token.text);
   }
 
+  /// A name that the generated code has as it stands.
+  std::string takeNewName(const std::string& expected) {
+    const Position position = token_.position;
+    std::string name = takeName(expected);
+    if (isKeyword(name)) lexer_.fail(position, "'" + name + "' is a keyword of C++");
+    return name;
+  }
+
   /// The name of a type that its owner, a message or the file itself, has not declared yet.
   std::string takeTypeName(const std::string& owner, const std::string& expected) {
     const Position position = token_.position;
-    std::string name = takeName(expected);
+    std::string name = takeNewName(expected);
     if (!typeNames_.insert(owner + '.' + name).second) lexer_.fail(position, "'" + name + "' is declared already");
     return name;
   }
@@ -100,7 +109,7 @@ class Parser {
   void parseStatement() {
     if (isNext("package")) {
       take();
-      file_.package = takeName("the package's name");
+      file_.package = takeNewName("the package's name");
       expect(";");
     } else if (isNext("import")) {
       take();
@@ -124,7 +133,7 @@ class Parser {
     expect("{");
     while (!isNext("}")) {
       const Position position = token_.position;
-      Enumerator value{takeName("a value's name or '}'"), 0};
+      Enumerator value{takeNewName("a value's name or '}'"), 0};
       expect("=");
       value.number = static_cast<std::int32_t>(
           takeInteger("a value", std::numeric_limits<std::int32_t>::min(), std::numeric_limits<std::int32_t>::max()));

@@ -19,19 +19,6 @@ const std::map<std::string_view, FieldType> kScalars{
     {"bytes", FieldType::bytes},
 };
 
-/// The language's own words, as far as an accessor could have their form.
-const std::set<std::string_view> kKeywords{
-    "alignas",   "alignof",  "and",      "asm",       "auto",      "bitand",   "bitor",    "bool",      "break",
-    "case",      "catch",    "char",     "class",     "compl",     "concept",  "const",    "consteval", "constexpr",
-    "constinit", "continue", "decltype", "default",   "delete",    "do",       "double",   "else",      "enum",
-    "explicit",  "export",   "extern",   "false",     "float",     "for",      "friend",   "goto",      "if",
-    "inline",    "int",      "long",     "mutable",   "namespace", "new",      "noexcept", "not",       "nullptr",
-    "operator",  "or",       "private",  "protected", "public",    "register", "requires", "return",    "short",
-    "signed",    "sizeof",   "static",   "struct",    "switch",    "template", "this",     "throw",     "true",
-    "try",       "typedef",  "typeid",   "typename",  "union",     "unsigned", "using",    "virtual",   "void",
-    "volatile",  "while",    "xor",
-};
-
 /// What every message has from its base.
 const std::set<std::string_view> kOperations{
     "assign",
@@ -72,6 +59,8 @@ std::vector<std::string> accessorsOf(const Field& field) {
 }
 
 constexpr std::size_t kMostPresenceBits = 64;
+/// The decoder's stack grows with the depth to which messages nest.
+constexpr std::size_t kDeepestMessage = 32;
 
 class Resolver {
  public:
@@ -84,7 +73,7 @@ class Resolver {
     for (const auto& [import, position] : file_.imports) {
       const std::optional<std::string> imported = readSource(import);
       if (!imported) fail(position, "import \"" + import + "\" cannot be read");
-      addTypes(parseProto(import, *imported));
+      addImport(parseProto(import, *imported), position);
     }
   }
 
@@ -108,6 +97,20 @@ class Resolver {
       messages_.insert(message.name);
     for (const Enumeration& enumeration : file.enumerations)
       enumerations_[enumeration.name] = enumeration;
+  }
+
+  /// The generated code names every type as it stands, in the one namespace of the package.
+  void addImport(const ProtoFile& imported, Position position) {
+    if (imported.package != file_.package) fail(position, "import \"" + imported.path + "\" is of another package");
+    const auto checkIsNew = [&](const std::string& name) {
+      if (!messages_.contains(name) && !enumerations_.contains(name)) return;
+      fail(position, "import \"" + imported.path + "\" declares '" + name + "', which is declared already");
+    };
+    for (const MessageType& message : imported.messages)
+      checkIsNew(message.name);
+    for (const Enumeration& enumeration : imported.enumerations)
+      checkIsNew(enumeration.name);
+    addTypes(imported);
   }
 
   [[nodiscard]] const Enumeration* findEnumeration(const MessageType& message, const std::string& name) const {
@@ -136,11 +139,14 @@ class Resolver {
   }
 
   void checkAccessors(const MessageType& message) const {
-    std::set<std::string> taken;
+    std::set<std::string> taken{message.name};
+    for (const Enumeration& enumeration : message.enumerations)
+      taken.insert(enumeration.name);
     std::size_t presenceBits = 0;
     for (const Field& field : message.fields) {
       for (const std::string& accessor : accessorsOf(field)) {
-        if (kKeywords.contains(accessor) || kOperations.contains(accessor) || !taken.insert(accessor).second) {
+        if (!isIdentifier(accessor)) fail(field.position, "the accessor '" + accessor + "' is no name");
+        if (isKeyword(accessor) || kOperations.contains(accessor) || !taken.insert(accessor).second) {
           fail(field.position, "the accessor '" + accessor + "' has its name from something else already");
         }
       }
@@ -153,6 +159,9 @@ class Resolver {
   /// C++ wants a class declared before it is used; a .proto file does not. A message that contains itself is
   /// refused: the schema's depth is what bounds the decoder's stack.
   void orderByUse() {
+    std::map<std::string, const MessageType*> declared;
+    for (const MessageType& message : file_.messages)
+      declared[message.name] = &message;
     std::vector<MessageType> ordered;
     std::set<std::string> placed;
     std::set<std::string> open;
@@ -160,10 +169,12 @@ class Resolver {
       if (placed.contains(message.name)) return;
       open.insert(message.name);
       for (const Field& field : message.fields) {
+        if (!field.isMessage()) continue;
         if (open.contains(field.typeName)) fail(field.typePosition, "'" + field.typeName + "' contains itself");
-        for (const MessageType& used : file_.messages) {
-          if (used.name == field.typeName) place(used);
-        }
+        const auto used = declared.find(field.typeName);
+        if (used == declared.end()) continue;
+        if (open.size() == kDeepestMessage) fail(field.typePosition, "messages nest more than 32 deep");
+        place(*used->second);
       }
       open.erase(message.name);
       placed.insert(message.name);
