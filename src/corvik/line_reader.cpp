@@ -30,7 +30,7 @@ LineReader::LineReader(vesk::FileDescriptor descriptor, std::size_t padding, std
     : descriptor_(std::move(descriptor)),
       padding_(padding),
       longestLine_(longestLine),
-      buffer_(std::make_unique<char[]>(std::min(kUsualCapacity, longestLine + 1) + padding)),
+      buffer_(std::make_unique_for_overwrite<char[]>(std::min(kUsualCapacity, longestLine + 1) + padding)),
       capacity_(std::min(kUsualCapacity, longestLine + 1)) {}
 
 LineReader::Found LineReader::next() {
@@ -85,7 +85,7 @@ void LineReader::makeRoom() {
     end_ = 0;
   } else if (end_ == capacity_) {
     const std::size_t capacity = std::min(2 * capacity_, longestLine_ + 1);
-    auto grown = std::make_unique<char[]>(capacity + padding_);
+    auto grown = std::make_unique_for_overwrite<char[]>(capacity + padding_);
     std::memcpy(grown.get(), buffer_.get(), end_);
     buffer_ = std::move(grown);
     capacity_ = capacity;

@@ -33,6 +33,10 @@ std::optional<std::string> whyUnreadable(const vesk::FileDescriptor& descriptor,
   return std::nullopt;
 }
 
+std::string_view asText(std::span<char> line) {
+  return {line.data(), line.size()};
+}
+
 bool isBlank(std::string_view line) {
   return line.find_first_not_of(" \t\r") == std::string_view::npos;
 }
@@ -61,11 +65,11 @@ RecordingReader::Step RecordingReader::next() {
       case LineReader::Found::line:
         break;
     }
-    std::string_view line = lines_.line();
-    if (lines_.lineNumber() == 1 && line.starts_with(kByteOrderMark)) {
-      line.remove_prefix(kByteOrderMark.size());
+    std::span<char> line = lines_.line();
+    if (lines_.lineNumber() == 1 && asText(line).starts_with(kByteOrderMark)) {
+      line = line.subspan(kByteOrderMark.size());
     }
-    if (isBlank(line)) continue;
+    if (isBlank(asText(line))) continue;
     if (const std::optional<RecordedEvent> event = parser_.parse(line)) return *event;
     return badLine(parser_.reason());
   }
@@ -82,12 +86,12 @@ std::optional<double> RecordingReader::duration() const {
   tail.resize(size + RecordedEventParser::kPadding);
 
   RecordedEventParser parser;
-  std::string_view rest(tail.data(), size);
+  std::span<char> rest(tail.data(), size);
   while (!rest.empty()) {
-    const std::size_t lineFeed = rest.rfind('\n');
+    const std::size_t lineFeed = asText(rest).rfind('\n');
     const std::size_t lineStart = lineFeed == std::string_view::npos ? 0 : lineFeed + 1;
-    if (const auto event = parser.parse(rest.substr(lineStart))) return event->at;
-    rest = rest.substr(0, lineStart == 0 ? 0 : lineFeed);
+    if (const auto event = parser.parse(rest.subspan(lineStart))) return event->at;
+    rest = rest.first(lineStart == 0 ? 0 : lineFeed);
   }
   return std::nullopt;
 }
