@@ -140,6 +140,22 @@ TEST(RecordingReader, RefusesControlCharactersWhereverTheyStandInAText) {
     EXPECT_TRUE(line.ends_with(": a text holds a control character")) << line;
 }
 
+TEST(RecordingReader, TellsDigitsFromAllOtherCharactersWhereverTheyStandInAPayload) {
+  const std::string head = R"({"at": 1, "metric": 2, "payload": ")";
+  const std::string allDigits = "0123456789abcdefABCDEF";
+  EXPECT_EQ(readAll(head + allDigits + "\"}"), std::vector<std::string>{"1.0 2 0123456789abcdefabcdef"});
+  for (std::size_t place = 0; place < allDigits.size(); ++place) {
+    for (char character = ' '; character < 0x7F; ++character) {
+      if (character == '"' || character == '\\') continue;
+      std::string digits = allDigits;
+      digits[place] = character;
+      const bool isDigit = allDigits.find(character) != std::string::npos;
+      const std::string read = readAll(head + digits + "\"}").front();
+      EXPECT_EQ(read.ends_with("character " + std::to_string(place + 1) + " is no hex digit"), !isDigit) << read;
+    }
+  }
+}
+
 TEST(RecordingReader, NumbersLinesPassesOverBlankOnesAndGoesOnBehindBadOnes) {
   const std::string event = R"({"at": 1, "metric": 2, "payload": "01"})";
   EXPECT_EQ(readAll("\n \t\r\n" + event + "\nbad\n\n" + event),
