@@ -8,7 +8,7 @@ package_table='
 build     cmake               cmake
 build     ninja-build         ninja
 build     g++                 g++
-build     libsimdjson-dev     /usr/include/simdjson.h
+build     rapidjson-dev       /usr/include/rapidjson/reader.h
 build     libcli11-dev        /usr/include/CLI/CLI.hpp
 build     libncurses-dev      /usr/include/ncursesw/curses.h
 test      libgtest-dev        /usr/include/gtest/gtest.h

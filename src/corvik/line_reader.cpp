@@ -30,7 +30,7 @@ LineReader::LineReader(vesk::FileDescriptor descriptor, std::size_t padding, std
     : descriptor_(std::move(descriptor)),
       padding_(padding),
       longestLine_(longestLine),
-      buffer_(std::make_unique<char[]>(std::min(kUsualCapacity, longestLine + 1) + padding)),
+      buffer_(std::make_unique_for_overwrite<char[]>(std::min(kUsualCapacity, longestLine + 1) + padding)),
       capacity_(std::min(kUsualCapacity, longestLine + 1)) {}
 
 LineReader::Found LineReader::next() {
@@ -45,8 +45,6 @@ LineReader::Found LineReader::next() {
       case Input::more:
         break;
       case Input::end:
-        // There is room: it was made for the read that brought nothing.
-        buffer_[end_] = '\n';
         if (begin_ < end_ || isPassingOver_) return take(end_, end_);
         return Found::end;
       case Input::failure:
@@ -87,7 +85,7 @@ void LineReader::makeRoom() {
     end_ = 0;
   } else if (end_ == capacity_) {
     const std::size_t capacity = std::min(2 * capacity_, longestLine_ + 1);
-    auto grown = std::make_unique<char[]>(capacity + padding_);
+    auto grown = std::make_unique_for_overwrite<char[]>(capacity + padding_);
     std::memcpy(grown.get(), buffer_.get(), end_);
     buffer_ = std::move(grown);
     capacity_ = capacity;

@@ -3,7 +3,7 @@
 #include <cstddef>
 #include <functional>
 #include <memory>
-#include <string_view>
+#include <span>
 #include <utility>
 
 #include "platform/file_descriptor.h"
@@ -20,7 +20,7 @@ class LineReader {
 
   static constexpr std::size_t kLongestLine = std::size_t{8} << 20;
 
-  /// `padding` bytes behind every line may be read, whatever they hold.
+  /// `padding` bytes behind every line may be read, whatever they hold, and the first be overwritten.
   LineReader(vesk::FileDescriptor descriptor, std::size_t padding, std::size_t longestLine = kLongestLine);
 
   void setBeforeRead(BeforeRead beforeRead) { beforeRead_ = std::move(beforeRead); }
@@ -28,9 +28,8 @@ class LineReader {
   /// Finds the next line. One beyond the longest is passed over without being kept. After a failure errno
   /// tells why, and so it stays.
   [[nodiscard]] Found next();
-  /// The line found, without its line feed; valid until the next call. A line feed follows it, also behind a last line
-  /// that came without.
-  [[nodiscard]] std::string_view line() const { return line_; }
+  /// The line found, without its line feed; valid, and to do with as one likes, until the next call.
+  [[nodiscard]] std::span<char> line() const { return line_; }
   /// Its number, from 1.
   [[nodiscard]] std::size_t lineNumber() const { return lineNumber_; }
 
@@ -57,7 +56,7 @@ class LineReader {
   std::size_t end_ = 0;      ///< of what was read
   bool isPassingOver_ = false;
 
-  std::string_view line_;
+  std::span<char> line_;
   std::size_t lineNumber_ = 0;
 };
 

@@ -1,46 +1,64 @@
 #include "corvik/recorded_event.h"
 
-#include <array>
+#include <algorithm>
 #include <charconv>
-#include <simdjson.h>
+#include <cstring>
 
 #include "corvik/hex.h"
 #include "platform/text_form.h"
+#include "platform/utf8.h"
+
+#ifdef __SSE2__
+#define RAPIDJSON_SSE2
+#endif
+#include <rapidjson/reader.h>
 
 namespace corvik {
 
 namespace {
 
-namespace ondemand = simdjson::ondemand;
+constexpr const char* kNotJson = "not valid JSON";
+constexpr const char* kControlCharacter = "a text holds a control character";
+constexpr const char* kNotClosed = "does not end with the object's closing brace: is the line cut off?";
+constexpr std::string_view kBlanks = " \t\r";
+/// Payloads of longer lines make the parser grow.
+constexpr std::size_t kUsualPayload = 8192;
+/// How deep the values of other keys may be nested. The reader calls itself for each level.
+constexpr int kDeepest = 500;
 
-static_assert(RecordedEventParser::kPadding >= simdjson::SIMDJSON_PADDING);
+constexpr unsigned kReading =
+    rapidjson::kParseInsituFlag | rapidjson::kParseStopWhenDoneFlag | rapidjson::kParseNumbersAsStringsFlag;
 
-/// Longer lines make the parser grow.
-constexpr std::size_t kUsualLine = 16384;
+/// Whether all characters are known to be printable ASCII; they are looked at by eights, the last eight at their end.
+bool isPlain(std::string_view line) {
+  constexpr std::size_t kStep = 8;
+  constexpr std::uint64_t kEach = 0x0101010101010101;
+  if (line.size() < kStep) return false;
+  std::uint64_t seen = 0;
+  const auto look = [&seen](const char* place) {
+    std::uint64_t eight = 0;
+    std::memcpy(&eight, place, kStep);
+    // Less 0x20, the lowest control character comes to 0xE0 or more.
+    seen |= eight | (eight - kEach * 0x20);
+  };
+  const char* const last = line.data() + line.size() - kStep;
+  for (const char* place = line.data(); place < last; place += kStep)
+    look(place);
+  look(last);
+  return (seen & kEach * 0x80) == 0;
+}
 
-std::string_view inWords(simdjson::error_code error) {
-  switch (error) {
-    case simdjson::UNCLOSED_STRING:
-      return "a text has no closing quote: is the line cut off?";
-    case simdjson::INCOMPLETE_ARRAY_OR_OBJECT:
-      return "does not end with the object's closing brace: is the line cut off?";
-    case simdjson::UNESCAPED_CHARS:
-      return "a text holds a control character";
-    case simdjson::UTF8_ERROR:
-      return "not valid UTF-8";
-    default:
-      return "not valid JSON";
+/// Why no JSON text can hold these characters; null when one can. The reader leaves it unchecked whether texts are
+/// UTF-8 and, where it looks at sixteen characters at once, some of the control characters.
+const char* whyNoJson(std::string_view line) {
+  while (!line.empty()) {
+    const auto byte = static_cast<std::uint8_t>(line.front());
+    if (byte < 0x20 && kBlanks.find(line.front()) == std::string_view::npos) return kControlCharacter;
+    const std::size_t size = byte < 0x80 ? 1 : vesk::utf8CharacterSize(line);
+    if (size == 0) return "not valid UTF-8";
+    line.remove_prefix(size);
   }
-}
-
-/// The characters between the quotes of a string token, escapes as written.
-std::string_view betweenQuotes(std::string_view token) {
-  const std::size_t end = token.rfind('"');
-  return end == 0 || end == std::string_view::npos ? std::string_view{} : token.substr(1, end - 1);
-}
-
-bool isText(std::string_view token) {
-  return token.starts_with('"');
+  return nullptr;
 }
 
 /// A positive number in "0x…" text.
@@ -57,14 +75,91 @@ std::optional<std::int64_t> parseHexNumber(std::string_view text) {
 
 }  // namespace
 
-struct RecordedEventParser::Json {
-  ondemand::parser parser;
-};
+/// Takes what the reader finds in a line, piece by piece. The functions that it calls go by its names; false ends
+/// the reading, and the parser's reason is set.
+class RecordedEventParser::Fields : public rapidjson::BaseReaderHandler<rapidjson::UTF8<>, Fields> {
+ public:
+  explicit Fields(RecordedEventParser& parser) : parser_(parser) {}
 
-struct RecordedEventParser::Fields {
   std::optional<double> at;
   std::optional<std::int64_t> metricId;
   bool hasPayload = false;
+
+  bool Key(const char* text, rapidjson::SizeType length, bool /*copy*/) {
+    if (depth_ > 1) return true;
+    const std::string_view name(text, length);
+    key_ = name == "at" ? Name::at : name == "metric" ? Name::metric : name == "payload" ? Name::payload : Name::other;
+    const bool isGiven =
+        (key_ == Name::at && at) || (key_ == Name::metric && metricId) || (key_ == Name::payload && hasPayload);
+    return !isGiven || parser_.fail('"' + std::string(name) + "\": given twice");
+  }
+
+  bool String(const char* text, rapidjson::SizeType length, bool /*copy*/) {
+    if (key_ == Name::metric) {
+      metricId = parseHexNumber({text, length});
+      return metricId || Default();
+    }
+    if (key_ == Name::payload) return hasPayload = parser_.decodePayload({text, length});
+    return Default();
+  }
+
+  bool RawNumber(const char* text, rapidjson::SizeType length, bool /*copy*/) {
+    if (key_ == Name::at) {
+      at = number<double>({text, length});
+      if (!at) return Default();
+      return *at >= 0 || parser_.fail("\"at\": expected seconds that are not negative");
+    }
+    if (key_ == Name::metric) {
+      metricId = number<std::int64_t>({text, length});
+      return metricId || Default();
+    }
+    return Default();
+  }
+
+  bool StartObject() { return depth_ == 0 ? ++depth_ != 0 : enter(); }
+  bool StartArray() { return enter(); }
+  bool EndObject(rapidjson::SizeType /*count*/) { return leave(); }
+  bool EndArray(rapidjson::SizeType /*count*/) { return leave(); }
+
+  /// A value of a kind that is not expected here.
+  bool Default() {
+    switch (key_) {
+      case Name::at:
+        return parser_.fail("\"at\": expected seconds, a number");
+      case Name::metric:
+        return parser_.fail("\"metric\": expected an integer or \"0x…\" text, at most 64 bits");
+      case Name::payload:
+        return parser_.fail("\"payload\": expected hex text");
+      case Name::other:
+        break;
+    }
+    return true;
+  }
+
+ private:
+  enum class Name { at, metric, payload, other };
+
+  template <class Number>
+  static std::optional<Number> number(std::string_view text) {
+    Number number{};
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+    if (error != std::errc{} || end != text.data() + text.size()) return std::nullopt;
+    return number;
+  }
+
+  bool enter() {
+    if (!Default()) return false;
+    return ++depth_ <= kDeepest || parser_.fail("nested too deeply");
+  }
+  bool leave() {
+    --depth_;
+    return true;
+  }
+
+  RecordedEventParser& parser_;
+  int depth_ = 0;
+  /// Whose value comes next; `other` within the values of other keys.
+  Name key_ = Name::other;
 };
 
 void appendMetricId(std::string& out, std::int64_t metricId) {
@@ -87,13 +182,8 @@ void appendRecordedEvent(std::string& out, const RecordedEvent& event) {
   out += "\"}\n";
 }
 
-RecordedEventParser::RecordedEventParser() : json_(std::make_unique<Json>()) {}
-RecordedEventParser::RecordedEventParser(RecordedEventParser&&) noexcept = default;
-RecordedEventParser& RecordedEventParser::operator=(RecordedEventParser&&) noexcept = default;
-RecordedEventParser::~RecordedEventParser() = default;
-
-std::optional<RecordedEvent> RecordedEventParser::parse(std::string_view line) {
-  Fields fields;
+std::optional<RecordedEvent> RecordedEventParser::parse(std::span<char> line) {
+  Fields fields(*this);
   if (!readFields(line, fields)) return std::nullopt;
   if (!fields.at) {
     fail("\"at\": missing");
@@ -107,57 +197,40 @@ std::optional<RecordedEvent> RecordedEventParser::parse(std::string_view line) {
   return std::nullopt;
 }
 
-bool RecordedEventParser::readFields(std::string_view line, Fields& fields) {
-  const std::size_t first = line.find_first_not_of(" \t\r");
-  if (first == std::string_view::npos || line[first] != '{') return fail("no JSON object");
-
-  ondemand::parser& parser = json_->parser;
-  if (parser.capacity() < line.size() && parser.allocate(std::max(kUsualLine, line.size() * 2)) != simdjson::SUCCESS) {
-    return fail("too long for the memory there is");
+bool RecordedEventParser::readFields(std::span<char> line, Fields& fields) {
+  std::string_view text(line.data(), line.size());
+  const std::size_t first = text.find_first_not_of(kBlanks);
+  if (first == std::string_view::npos || text[first] != '{') return fail("no JSON object");
+  text = text.substr(0, text.find_last_not_of(kBlanks) + 1);
+  if (!isPlain(text)) {
+    if (const char* reason = whyNoJson(text)) return fail(reason);
   }
-  ondemand::document document;
-  ondemand::object object;
-  simdjson::error_code error = parser.iterate(line.data(), line.size(), line.size() + kPadding).get(document);
-  if (error == simdjson::SUCCESS) error = document.get_object().get(object);
-  if (error != simdjson::SUCCESS) return fail(std::string(inWords(error)));
+  const bool isClosed = text.back() == '}';
+  line.data()[text.size()] = '\0';
 
-  for (auto entry : object) {
-    ondemand::field field;
-    std::string_view key;
-    if ((error = std::move(entry).get(field)) || (error = field.unescaped_key().get(key))) {
-      return fail(std::string(inWords(error)));
-    }
-    ondemand::value& value = field.value();
-    const std::string_view token = value.raw_json_token();
-    if (key == "at") {
-      double at = 0;
-      if (fields.at) return fail("\"at\": given twice");
-      if (value.get_double().get(at) != simdjson::SUCCESS) return fail("\"at\": expected seconds, a number");
-      if (at < 0) return fail("\"at\": expected seconds that are not negative");
-      fields.at = at;
-    } else if (key == "metric") {
-      if (fields.metricId) return fail("\"metric\": given twice");
-      std::int64_t number = 0;
-      if (isText(token)) {
-        fields.metricId = parseHexNumber(betweenQuotes(token));
-      } else if (value.get_int64().get(number) == simdjson::SUCCESS) {
-        fields.metricId = number;
-      }
-      if (!fields.metricId) return fail("\"metric\": expected an integer or \"0x…\" text, at most 64 bits");
-    } else if (key == "payload") {
-      if (fields.hasPayload) return fail("\"payload\": given twice");
-      if (!isText(token)) return fail("\"payload\": expected hex text");
-      if (!decodePayload(betweenQuotes(token))) return false;
-      fields.hasPayload = true;
-    }
+  rapidjson::InsituStringStream stream(line.data());
+  rapidjson::Reader reader;
+  const rapidjson::ParseResult result = reader.Parse<kReading>(stream, fields);
+  switch (result.Code()) {
+    case rapidjson::kParseErrorNone:
+      if (stream.Tell() == text.size()) return true;
+      return fail(isClosed ? "more than one object" : kNotClosed);
+    case rapidjson::kParseErrorTermination:
+      return false;
+    case rapidjson::kParseErrorStringEscapeInvalid:
+      return fail(text[result.Offset()] == '\\' ? kNotJson : kControlCharacter);
+    case rapidjson::kParseErrorStringMissQuotationMark:
+      return fail("a text has no closing quote: is the line cut off?");
+    case rapidjson::kParseErrorNumberTooBig:
+      return fields.Default() && fail("a number is beyond all bounds");
+    default:
+      return fail(isClosed && result.Offset() < text.size() ? kNotJson : kNotClosed);
   }
-  const bool isAtEnd = document.current_location().error() == simdjson::OUT_OF_BOUNDS;
-  return isAtEnd || fail("more than one object");
 }
 
 bool RecordedEventParser::decodePayload(std::string_view digits) {
   payloadSize_ = digits.size() / 2;
-  if (payload_.size() < payloadSize_) payload_.resize(std::max(kUsualLine, digits.size()));
+  if (payload_.size() < payloadSize_) payload_.resize(std::max(kUsualPayload, payloadSize_));
   if (digits.size() % 2 == 0 && decodeHex(digits, payload_.data())) return true;
 
   for (std::size_t index = 0; index < digits.size(); ++index) {

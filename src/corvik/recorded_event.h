@@ -2,7 +2,6 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <memory>
 #include <optional>
 #include <span>
 #include <string>
@@ -27,32 +26,26 @@ void appendMetricId(std::string& out, std::int64_t metricId);
 void appendRecordedEvent(std::string& out, const RecordedEvent& event);
 
 /// Reads such lines: a JSON object with "at" (a number), "metric" (an integer or "0x…" text) and "payload"
-/// (hex text) in any order. Other keys are ignored, and what stands under
-/// them is not looked at. The hex text is taken as it stands, without escapes.
+/// (hex text) in any order. Other keys are ignored; what stands under them must be JSON, of numbers that a double can
+/// hold and nested no deeper than anyone needs.
 class RecordedEventParser {
  public:
-  /// A line must be followed by this many bytes that may be read, whatever they hold.
-  static constexpr std::size_t kPadding = 64;
+  /// A line must be followed by this many bytes that may be read; the first is overwritten.
+  static constexpr std::size_t kPadding = 16;
 
-  RecordedEventParser();
-  RecordedEventParser(RecordedEventParser&&) noexcept;
-  RecordedEventParser& operator=(RecordedEventParser&&) noexcept;
-  ~RecordedEventParser();
-
-  /// The event; its payload is valid until the next call. Absent when `line` holds none: see reason().
-  [[nodiscard]] std::optional<RecordedEvent> parse(std::string_view line);
+  /// The event; its payload is valid until the next call. Absent when `line` holds none: see reason(). Texts are
+  /// read in their place, and the line is of no use afterwards.
+  [[nodiscard]] std::optional<RecordedEvent> parse(std::span<char> line);
   /// What was wrong with the last line, in words for the person who wrote it.
   [[nodiscard]] const std::string& reason() const { return reason_; }
 
  private:
-  struct Json;
-  struct Fields;
+  class Fields;
 
-  [[nodiscard]] bool readFields(std::string_view line, Fields& fields);
+  [[nodiscard]] bool readFields(std::span<char> line, Fields& fields);
   [[nodiscard]] bool decodePayload(std::string_view digits);
   bool fail(std::string reason);
 
-  std::unique_ptr<Json> json_;
   std::vector<std::uint8_t> payload_;
   std::size_t payloadSize_ = 0;
   std::string reason_;

@@ -33,10 +33,13 @@ std::optional<std::string> whyUnreadable(const vesk::FileDescriptor& descriptor,
   return std::nullopt;
 }
 
+std::string_view asText(std::span<char> line) {
+  return {line.data(), line.size()};
+}
+
 /// What a recording starts with is no part of its first line.
-std::string_view withoutByteOrderMark(std::string_view line) {
-  if (line.starts_with(kByteOrderMark)) line.remove_prefix(kByteOrderMark.size());
-  return line;
+std::span<char> withoutByteOrderMark(std::span<char> line) {
+  return asText(line).starts_with(kByteOrderMark) ? line.subspan(kByteOrderMark.size()) : line;
 }
 
 bool isBlank(std::string_view line) {
@@ -67,9 +70,9 @@ RecordingReader::Step RecordingReader::next() {
       case LineReader::Found::line:
         break;
     }
-    std::string_view line = lines_.line();
+    std::span<char> line = lines_.line();
     if (lines_.lineNumber() == 1) line = withoutByteOrderMark(line);
-    if (isBlank(line)) continue;
+    if (isBlank(asText(line))) continue;
     if (const std::optional<RecordedEvent> event = parser_.parse(line)) return *event;
     return badLine(parser_.reason());
   }
@@ -86,13 +89,13 @@ std::optional<double> RecordingReader::duration() const {
   tail.resize(size + RecordedEventParser::kPadding);
 
   RecordedEventParser parser;
-  std::string_view rest(tail.data(), size);
+  std::span<char> rest(tail.data(), size);
   if (start == 0) rest = withoutByteOrderMark(rest);
   while (!rest.empty()) {
-    const std::size_t lineFeed = rest.rfind('\n');
+    const std::size_t lineFeed = asText(rest).rfind('\n');
     const std::size_t lineStart = lineFeed == std::string_view::npos ? 0 : lineFeed + 1;
-    if (const auto event = parser.parse(rest.substr(lineStart))) return event->at;
-    rest = rest.substr(0, lineStart == 0 ? 0 : lineFeed);
+    if (const auto event = parser.parse(rest.subspan(lineStart))) return event->at;
+    rest = rest.first(lineStart == 0 ? 0 : lineFeed);
   }
   return std::nullopt;
 }

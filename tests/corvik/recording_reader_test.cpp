@@ -43,6 +43,11 @@ std::vector<std::string> readAll(std::string_view content, std::size_t longestLi
   return steps;
 }
 
+/// So many arrays, each in the one before.
+std::string nested(std::size_t depth) {
+  return std::string(depth, '[') + std::string(depth, ']');
+}
+
 TEST(RecordingReader, ReadsOrRefusesALine) {
   using namespace std::string_literals;
   struct Case {
@@ -59,6 +64,9 @@ TEST(RecordingReader, ReadsOrRefusesALine) {
       {R"({"at": 1, "metric": -9223372036854775808, "payload": ""})", "1.0 -9223372036854775808 "},
       {R"({"at": 1, "metric": "0x7FFFFFFFFFFFFFFF", "payload": ""})", "1.0 9223372036854775807 "},
       {R"({"\u0061t": 1, "metric": 2, "payload": ""})", "1.0 2 "},
+      {R"({"at": 1, "metric": "0x\u0032", "payload": "\u0030a"})", "1.0 2 0a"},
+      {"{\t\"at\": 1, \"metric\": 2, \"payload\": \"\", \"place\": \"K\u00F6ln, am Rheinufer\"}", "1.0 2 "},
+      {R"({"at": 1, "metric": 2, "payload": "", "deep": )" + nested(499) + "}", "1.0 2 "},
       {"\xEF\xBB\xBF{\"at\": 1, \"metric\": 2, \"payload\": \"\"}\r", "1.0 2 "},
 
       {R"([1])", "r:1: no JSON object"},
@@ -87,6 +95,10 @@ TEST(RecordingReader, ReadsOrRefusesALine) {
       {R"({"at": 1, "metric": 2, "payload": "08)", "r:1: a text has no closing quote: is the line cut off?"},
       {R"({"at": 1, "metric": 2, "payload": "08")", notClosed},
       {R"({)", notClosed},
+      {R"({"at": 1, "metric": 2, "payload": "", "more": 1e999})", "r:1: a number is beyond all bounds"},
+      {R"({"at": 1, "metric": 2, "payload": "", "deep": )" + nested(500) + "}", "r:1: nested too deeply"},
+      {R"({"deep": )" + std::string(1'000'000, '['), "r:1: nested too deeply"},
+      {R"({"at": 1, "metric": 2, "payload": "\x"})", notJson},
       {"{\"at\": 1, \"metric\": 2, \"payload\": \"\0\"}"s, "r:1: a text holds a control character"},
       {"{\"at\": 1, \"metric\": 2, \"payload\": \"\xC0\"}", "r:1: not valid UTF-8"},
   };
@@ -110,6 +122,38 @@ TEST(RecordingReader, SurvivesEveryCutAndEveryChangedByte) {
     }
   }
   EXPECT_EQ(readAll(content).size(), lines);
+}
+
+TEST(RecordingReader, RefusesControlCharactersWhereverTheyStandInAText) {
+  std::string content;
+  for (std::size_t place = 0; place < 40; ++place) {
+    for (char control = 0; control < 0x20; ++control) {
+      if (control == '\n') continue;
+      std::string text(40, 'x');
+      text[place] = control;
+      content += R"({"at": 1, "metric": 2, "payload": "", "more": ")" + text + "\"}\n";
+    }
+  }
+  const std::vector<std::string> read = readAll(content);
+  EXPECT_EQ(read.size(), 40U * 31U);
+  for (const std::string& line : read)
+    EXPECT_TRUE(line.ends_with(": a text holds a control character")) << line;
+}
+
+TEST(RecordingReader, TellsDigitsFromAllOtherCharactersWhereverTheyStandInAPayload) {
+  const std::string head = R"({"at": 1, "metric": 2, "payload": ")";
+  const std::string allDigits = "0123456789abcdefABCDEF";
+  EXPECT_EQ(readAll(head + allDigits + "\"}"), std::vector<std::string>{"1.0 2 0123456789abcdefabcdef"});
+  for (std::size_t place = 0; place < allDigits.size(); ++place) {
+    for (char character = ' '; character < 0x7F; ++character) {
+      if (character == '"' || character == '\\') continue;
+      std::string digits = allDigits;
+      digits[place] = character;
+      const bool isDigit = allDigits.find(character) != std::string::npos;
+      const std::string read = readAll(head + digits + "\"}").front();
+      EXPECT_EQ(read.ends_with("character " + std::to_string(place + 1) + " is no hex digit"), !isDigit) << read;
+    }
+  }
 }
 
 TEST(RecordingReader, NumbersLinesPassesOverBlankOnesAndGoesOnBehindBadOnes) {
