@@ -30,7 +30,8 @@ constexpr Kind kind() {
 // Each side calls the message by the same name, in its own namespace.
 #define KIND(Message) kind<vesk::metrics::Message, ::metrics::Message, visits::visit##Message>()
 
-const std::array kKinds{
+/// In the order of their identifiers.
+constexpr std::array kKinds{
     KIND(KCellularSimCardFiles),
     KIND(KCellularGsmScellInfo),
     KIND(KCellularWcdmaCellInfo),
@@ -64,12 +65,17 @@ const std::array kKinds{
 };
 #undef KIND
 
+constexpr bool isBefore(const Kind& a, const Kind& b) {
+  return a.metricId < b.metricId;
+}
+static_assert(std::is_sorted(kKinds.begin(), kKinds.end(), isBefore));
+
 }  // namespace
 
 const Kind* findKind(std::int64_t metricId) {
-  const auto* found =
-      std::find_if(kKinds.begin(), kKinds.end(), [&](const Kind& each) { return each.metricId == metricId; });
-  return found == kKinds.end() ? nullptr : found;
+  const auto* found = std::lower_bound(kKinds.begin(), kKinds.end(), metricId,
+                                       [](const Kind& each, std::int64_t id) { return each.metricId < id; });
+  return found != kKinds.end() && found->metricId == metricId ? found : nullptr;
 }
 
 }  // namespace vesk::bench
