@@ -88,8 +88,9 @@ bool isSameObject(const std::string& a, const std::string& b) {
 void requireSameJson(const Event& event) {
   std::string ours;
   std::string theirs;
+  ReflectionWalk walk;
   if (!event.kind->ours.readIntoJson(event.payload, ours)) disagree(event, "vesk does not read it");
-  if (!event.kind->libprotobuf.readIntoJsonByReflection(event.payload, theirs))
+  if (!event.kind->libprotobuf.readIntoJsonByReflection(event.payload, walk, theirs))
     disagree(event, "libprotobuf does not read it");
   if (ours != theirs && !isSameObject(ours, theirs)) disagree(event, "vesk reads " + ours + ", libprotobuf " + theirs);
   std::string byUtility;

@@ -9,8 +9,8 @@
 #include <string_view>
 
 #include "messages/codec/proto_codable.h"
+#include "peers/reflection_json.h"
 #include "platform/data.h"
-#include "platform/value.h"
 
 namespace vesk::bench {
 
@@ -32,7 +32,7 @@ struct OurOperations {
 struct LibprotobufOperations {
   bool (*readOnHeap)(Payload payload);
   bool (*readInArena)(Payload payload, google::protobuf::Arena& arena);
-  bool (*readIntoJsonByReflection)(Payload payload, std::string& json);
+  bool (*readIntoJsonByReflection)(Payload payload, ReflectionWalk& walk, std::string& json);
   bool (*readIntoJsonByUtility)(Payload payload, std::string& json);
   std::unique_ptr<LibprotobufMessage> (*make)(Payload payload);
   std::string (*write)(const LibprotobufMessage& message);

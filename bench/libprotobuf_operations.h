@@ -4,7 +4,6 @@
 #include <google/protobuf/util/json_util.h>
 
 #include "kinds.h"
-#include "peers/reflection_json.h"
 
 namespace vesk::bench {
 
@@ -38,10 +37,10 @@ constexpr LibprotobufOperations libprotobufOperations() {
             return parse(*message, payload);
           },
       .readIntoJsonByReflection =
-          [](Payload payload, std::string& json) {
+          [](Payload payload, ReflectionWalk& walk, std::string& json) {
             const auto message = std::make_unique<Message>();
             if (!parse(*message, payload)) return false;
-            appendReflectedJson(json, *message);
+            walk.appendJson(json, *message);
             return true;
           },
       .readIntoJsonByUtility = readIntoJsonByUtility<Message>,

@@ -96,11 +96,11 @@ std::vector<Row> rowsOver(const Corpus& corpus) {
       {"dictionary/vesk-json",
        eachIntoJson(corpus,
                     [](const Event& event, std::string& json) { event.kind->ours.readIntoJson(event.payload, json); })},
-      {"dictionary/libprotobuf-walk", eachIntoJson(corpus,
-                                                   [](const Event& event, std::string& json) {
-                                                     event.kind->libprotobuf.readIntoJsonByReflection(event.payload,
-                                                                                                      json);
-                                                   })},
+      {"dictionary/libprotobuf-walk",
+       eachIntoJson(corpus,
+                    [walk = ReflectionWalk()](const Event& event, std::string& json) mutable {
+                      event.kind->libprotobuf.readIntoJsonByReflection(event.payload, walk, json);
+                    })},
       {"dictionary/libprotobuf-utility", eachIntoJson(corpus,
                                                       [](const Event& event, std::string& json) {
                                                         event.kind->libprotobuf.readIntoJsonByUtility(event.payload,

@@ -15,23 +15,23 @@
 namespace vesk::bench {
 namespace {
 
-void appendDecoded(std::string& out, const Kind& kind, std::span<const std::uint8_t> payload) {
+void appendDecoded(std::string& out, ReflectionWalk& walk, const Kind& kind, std::span<const std::uint8_t> payload) {
   appendJson(out, kind.name);
   const std::size_t end = out.size();
   out += R"(,"status":"decoded","fields":)";
-  if (kind.libprotobuf.readIntoJsonByReflection(payload, out)) return;
+  if (kind.libprotobuf.readIntoJsonByReflection(payload, walk, out)) return;
   out.resize(end);
   out += R"(,"status":"undecodable","fields":null)";
 }
 
-void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
+void appendDecodedEvent(std::string& out, ReflectionWalk& walk, const corvik::RecordedEvent& event) {
   out += "{\"at\":";
   appendDecimal(out, event.at);
   out += ",\"metric\":";
   corvik::appendMetricId(out, event.metricId);
   out += ",\"class\":";
   if (const Kind* kind = findKind(event.metricId)) {
-    appendDecoded(out, *kind, event.payload);
+    appendDecoded(out, walk, *kind, event.payload);
   } else {
     out += R"(null,"status":"ignored","fields":null)";
   }
@@ -42,11 +42,12 @@ Outcome decode(const std::string& path) {
   corvik::RecordingReader reader(path);
   DataOutput output;
   std::string line;
+  ReflectionWalk walk;
   for (auto step = reader.next(); !std::holds_alternative<corvik::EndOfRecording>(step); step = reader.next()) {
     if (const auto* failure = std::get_if<corvik::ReadFailure>(&step)) stop(failure->message);
     if (const auto* bad = std::get_if<corvik::BadLine>(&step)) stop(bad->message);
     line.clear();
-    appendDecodedEvent(line, std::get<corvik::RecordedEvent>(step));
+    appendDecodedEvent(line, walk, std::get<corvik::RecordedEvent>(step));
     output.writeLine(line);
   }
   return output.finish(Outcome::done);
