@@ -1,9 +1,11 @@
-// time_programs PROGRAMS RECORDING...: runs the programs in the folder PROGRAMS over each recording and over none, in
-// turn, and writes what the least disturbed runs took.
+// time_programs RECORDING... -- ROW PROGRAM ARGUMENT... [-- ROW PROGRAM ARGUMENT...]...: runs each program over each
+// recording, given as its last argument, and over none, in turn. Writes what the least disturbed runs took, as the
+// figures of ROW: the wall time of a start, the processor time of an event beyond that, and the most memory.
 
 #include <algorithm>
 #include <fstream>
 #include <iostream>
+#include <iterator>
 #include <limits>
 #include <random>
 #include <string>
@@ -15,25 +17,24 @@
 namespace vesk::bench {
 namespace {
 
-/// A run of a few milliseconds is disturbed more easily.
-constexpr int kShortRounds = 100;
-constexpr int kLongRounds = 20;
-constexpr std::size_t kLongestShort = 10'000;
-/// Of a longer recording than this only the memory is of interest.
+/// Runs of a few milliseconds are disturbed easily.
+constexpr int kStartRounds = 100;
+constexpr int kTimedRounds = 20;
+/// Of a longer recording only the memory is of interest, and of one that is shorter than the longest timed.
 constexpr std::size_t kLongestTimed = 100'000;
 constexpr int kMemoryRounds = 2;
 
-int roundsFor(std::size_t events) {
-  if (events > kLongestTimed) return kMemoryRounds;
-  return events > kLongestShort ? kLongRounds : kShortRounds;
-}
+struct Recording {
+  std::string path;
+  std::size_t events;
+  int rounds;
+};
 
-/// A command over a recording, and the best of its runs.
+/// A program over a recording, and the best of its runs.
 struct Task {
   std::string row;
-  std::size_t events;
   std::vector<std::string> command;
-  int rounds;
+  const Recording* recording;
   double processorSeconds = std::numeric_limits<double>::infinity();
   double wallSeconds = std::numeric_limits<double>::infinity();
   long peakKib = 0;
@@ -52,50 +53,57 @@ std::size_t lineCount(const std::string& path) {
       std::count(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>(), '\n'));
 }
 
-std::vector<Task> tasksFor(const std::string& programs, const std::vector<std::string>& recordings) {
-  const std::string vesk = programs + "/vesk";
-  std::vector<Task> tasks{{"empty", 0, {programs + "/empty_program"}, kShortRounds}};
-  const auto addEach = [&](const std::string& path) {
-    const std::size_t events = lineCount(path);
-    const int rounds = roundsFor(events);
-    tasks.push_back({"decode/vesk", events, {vesk, "decode", path}, rounds});
-    tasks.push_back({"decode/libprotobuf", events, {programs + "/decode_with_libprotobuf", path}, rounds});
-    tasks.push_back({"stores/vesk", events, {vesk, "stores", path}, rounds});
-  };
-  addEach("/dev/null");
-  for (const std::string& path : recordings)
-    addEach(path);
-  return tasks;
+/// The empty recording first.
+std::vector<Recording> recordingsAt(const std::vector<std::string>& paths) {
+  std::vector<Recording> recordings{{"/dev/null", 0, kStartRounds}};
+  for (const std::string& path : paths)
+    recordings.push_back({path, lineCount(path), kMemoryRounds});
+  Recording* longest = nullptr;
+  for (Recording& each : recordings) {
+    if (each.events <= kLongestTimed && (longest == nullptr || each.events > longest->events)) longest = &each;
+  }
+  if (longest->events > 0) longest->rounds = kTimedRounds;
+  return recordings;
 }
 
-/// Every round runs in an order of its own, so that no program always follows the same one.
+/// Every round comes at a place of its own, so that no program always follows the same one.
 void runInterleaved(std::vector<Task>& tasks) {
-  std::mt19937 random(1);
   std::vector<Task*> order;
   for (Task& task : tasks)
-    order.insert(order.end(), static_cast<std::size_t>(task.rounds), &task);
-  std::shuffle(order.begin(), order.end(), random);
+    order.insert(order.end(), static_cast<std::size_t>(task.recording->rounds), &task);
+  std::shuffle(order.begin(), order.end(), std::mt19937(1));
   for (Task* task : order)
     task->run();
 }
 
-double processorSecondsOfStart(const std::vector<Task>& tasks, const std::string& row) {
-  const auto start =
-      std::find_if(tasks.begin(), tasks.end(), [&](const Task& task) { return task.row == row && task.events == 0; });
-  return start->processorSeconds;
+/// The tasks of a row follow one another, from the empty recording on.
+void report(const std::vector<Task>& tasks) {
+  double startSeconds = 0;
+  for (const Task& task : tasks) {
+    const auto& [path, events, rounds] = *task.recording;
+    if (events == 0) {
+      startSeconds = task.processorSeconds;
+      writeFact(task.row, 0, "ms", task.wallSeconds * 1e3);
+    } else {
+      writeFact(task.row, events, "MiB", static_cast<double>(task.peakKib) / 1024);
+    }
+    if (events > 0 && rounds == kTimedRounds) {
+      writeFact(task.row, events, "ns", (task.processorSeconds - startSeconds) * 1e9 / static_cast<double>(events));
+    }
+  }
 }
 
-void report(const std::vector<Task>& tasks) {
-  for (const Task& task : tasks) {
-    if (task.events == 0) {
-      writeFact(task.row, 0, "ms", task.wallSeconds * 1e3);
-      continue;
+/// What stands between the "--".
+std::vector<std::vector<std::string>> groupsOf(const std::vector<std::string>& arguments) {
+  std::vector<std::vector<std::string>> groups(1);
+  for (const std::string& argument : arguments) {
+    if (argument == "--") {
+      groups.emplace_back();
+    } else {
+      groups.back().push_back(argument);
     }
-    writeFact(task.row, task.events, "MiB", static_cast<double>(task.peakKib) / 1024);
-    if (task.events > kLongestTimed) continue;
-    const double beyondStart = task.processorSeconds - processorSecondsOfStart(tasks, task.row);
-    writeFact(task.row, task.events, "ns", beyondStart * 1e9 / static_cast<double>(task.events));
   }
+  return groups;
 }
 
 }  // namespace
@@ -103,11 +111,21 @@ void report(const std::vector<Task>& tasks) {
 
 int main(int argc, char** argv) {
   using namespace vesk::bench;
-  if (argc < 3) {
-    std::cerr << "usage: time_programs PROGRAMS RECORDING...\n";
+  const auto groups = groupsOf({argv + 1, argv + argc});
+  const bool isComplete =
+      std::all_of(groups.begin() + 1, groups.end(), [](const auto& group) { return group.size() >= 2; });
+  if (groups.size() < 2 || !isComplete) {
+    std::cerr << "usage: time_programs RECORDING... -- ROW PROGRAM ARGUMENT... [-- ROW PROGRAM ARGUMENT...]...\n";
     return 2;
   }
-  std::vector<Task> tasks = tasksFor(argv[1], {argv + 2, argv + argc});
+  const std::vector<Recording> recordings = recordingsAt(groups.front());
+  std::vector<Task> tasks;
+  for (auto group = groups.begin() + 1; group != groups.end(); ++group) {
+    for (const Recording& recording : recordings) {
+      Task& task = tasks.emplace_back(Task{group->front(), {group->begin() + 1, group->end()}, &recording});
+      task.command.push_back(recording.path);
+    }
+  }
   runInterleaved(tasks);
   report(tasks);
 }
