@@ -4,12 +4,14 @@
 #include <new>
 #include <stdexcept>
 
+#include "platform/recycled_memory.h"
+
 namespace vesk {
 
 SharedBytes SharedBytes::copy(std::string_view bytes) {
   if (bytes.empty()) return {};
   if (bytes.size() > UINT32_MAX) throw std::length_error("text or data beyond 4 GiB");
-  void* storage = ::operator new(sizeof(Block) + bytes.size());
+  void* storage = RecycledMemory::allocate(sizeof(Block) + bytes.size());
   char* content = static_cast<char*>(storage) + sizeof(Block);
   std::memcpy(content, bytes.data(), bytes.size());
   return SharedBytes(new (storage) Block{content, static_cast<std::uint32_t>(bytes.size()), 1});
@@ -19,8 +21,9 @@ void SharedBytes::release() noexcept {
   // The only owner need not pay for a locked decrement: nobody else can take a count any more.
   if (block_->owners.load(std::memory_order_acquire) == 1 ||
       block_->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
+    const std::size_t size = sizeof(Block) + block_->size;
     block_->~Block();
-    ::operator delete(block_);
+    RecycledMemory::release(block_, size);
   }
 }
 

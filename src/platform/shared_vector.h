@@ -5,9 +5,10 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
-#include <new>
 #include <span>
 #include <utility>
+
+#include "platform/recycled_memory.h"
 
 namespace vesk {
 
@@ -86,13 +87,14 @@ class SharedVector {
 
     explicit Block(std::size_t room) : capacity(room) {}
     static constexpr std::size_t itemsOffset() { return (sizeof(Block) + alignof(T) - 1) / alignof(T) * alignof(T); }
+    static constexpr std::size_t bytesFor(std::size_t capacity) { return itemsOffset() + capacity * sizeof(T); }
     T* items() { return reinterpret_cast<T*>(reinterpret_cast<std::byte*>(this) + itemsOffset()); }
   };
 
   [[nodiscard]] bool isOnlyOwner() const { return block_->owners.load(std::memory_order_acquire) == 1; }
 
   void reallocate(std::size_t capacity) {
-    void* storage = ::operator new(Block::itemsOffset() + capacity * sizeof(T));
+    void* storage = RecycledMemory::allocate(Block::bytesFor(capacity));
     auto* block = new (storage) Block(capacity);
     if (block_ != nullptr) {
       if (isOnlyOwner()) {
@@ -110,8 +112,9 @@ class SharedVector {
     if (block_ == nullptr) return;
     if (isOnlyOwner() || block_->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
       std::destroy_n(block_->items(), block_->size);
+      const std::size_t capacity = block_->capacity;
       block_->~Block();
-      ::operator delete(block_);
+      RecycledMemory::release(block_, Block::bytesFor(capacity));
     }
   }
 

@@ -1,7 +1,9 @@
 #include "messages/codec/proto_reader.h"
 
 #include <gtest/gtest.h>
+#include <vector>
 
+#include "messages/codec/field_cursor.h"
 #include "support/bytes.h"
 
 namespace vesk {
@@ -11,14 +13,15 @@ constexpr auto kMax64 = std::numeric_limits<std::uint64_t>::max();
 constexpr auto kMin32 = std::numeric_limits<std::int32_t>::min();
 constexpr auto kMax32 = std::numeric_limits<std::int32_t>::max();
 
-TEST(ProtoReader, ReadsVarints) {
-  struct Case {
-    std::string input;
-    std::uint64_t value;
-    std::uint64_t pos;
-    bool error = false;
-  };
-  const Case cases[] = {
+struct VarintCase {
+  std::string input;
+  std::uint64_t value;
+  std::uint64_t pos;
+  bool error = false;
+};
+
+const std::vector<VarintCase>& varintCases() {
+  static const std::vector<VarintCase> kCases{
       {"00", 0, 1},
       {"7F", 127, 1},
       {"80 01", 128, 2},
@@ -41,13 +44,69 @@ TEST(ProtoReader, ReadsVarints) {
       {"FF", 0, 1, true},
       {"FF FF FF FF FF FF FF FF FF", 0, 9, true},
   };
-  for (const Case& row : cases) {
+  return kCases;
+}
+
+template <auto read>
+auto readWith(const Bytes& input) {
+  ProtoReader reader(input);
+  FieldCursor cursor(reader);
+  return (cursor.*read)();
+}
+
+TEST(ProtoReader, ReadsVarints) {
+  for (const VarintCase& row : varintCases()) {
     const Bytes input = bytesOf(row.input);
     ProtoReader reader(input);
     EXPECT_EQ(reader.readVarint(), row.value) << row.input;
     EXPECT_EQ(reader.pos, row.pos) << row.input;
     EXPECT_EQ(reader.error, row.error) << row.input;
   }
+}
+
+// The cursor looks at eight bytes at a time: what stands around a number, in its section or beyond, must not matter.
+TEST(FieldCursor, ReadsVarintsWhateverStandsAroundThem) {
+  for (const VarintCase& row : varintCases()) {
+    for (std::size_t before = 0; before <= 8; ++before) {
+      for (std::size_t behind = 0; behind <= 10; ++behind) {
+        Bytes input(before, 0xFF);
+        const Bytes number = bytesOf(row.input);
+        input.insert(input.end(), number.begin(), number.end());
+        input.insert(input.end(), behind, 0x01);
+        ProtoReader reader(input);
+        reader.pos = before;
+        reader.length = before + number.size();
+        FieldCursor cursor(reader);
+        EXPECT_EQ(cursor.readUInt64(), row.value)
+            << row.input << " with " << before << " before, " << behind << " behind";
+        EXPECT_EQ(cursor.finish(), !row.error) << row.input;
+        EXPECT_EQ(reader.pos, before + row.pos) << row.input;
+      }
+    }
+  }
+}
+
+TEST(FieldCursor, ReadsTheNextKeyOnlyIfItIsTheOneAskedFor) {
+  const auto isRead = [](const std::string& bytes, auto readKeyIf) {
+    const Bytes input = bytesOf(bytes);
+    ProtoReader reader(input);
+    FieldCursor cursor(reader);
+    const bool wasRead = readKeyIf(cursor);
+    EXPECT_TRUE(cursor.finish());
+    EXPECT_EQ(reader.pos, wasRead ? (input[0] < 0x80 ? 1U : 2U) : 0U) << bytes;
+    return wasRead;
+  };
+  const auto field2 = [](FieldCursor& cursor) { return cursor.readKeyIf<2, WireType::varint>(); };
+  EXPECT_TRUE(isRead("10 05", field2));
+  for (const char* other : {"", "08 05", "12 05", "90 00 05", "90 01 05"})
+    EXPECT_FALSE(isRead(other, field2)) << other;
+  const auto field300 = [](FieldCursor& cursor) { return cursor.readKeyIf<300, WireType::lengthDelimited>(); };
+  EXPECT_TRUE(isRead("E2 12 00", field300));
+  for (const char* other : {"", "E2", "E2 13", "E0 12", "E2 92 00", "62 12"})
+    EXPECT_FALSE(isRead(other, field300)) << other;
+  // Keys of three bytes are left to the ordinary way.
+  const auto field65535 = [](FieldCursor& cursor) { return cursor.readKeyIf<65535, WireType::varint>(); };
+  EXPECT_FALSE(isRead("F8 FF 1F 00", field65535));
 }
 
 TEST(ProtoReader, KeepsAFieldNumberTo16Bits) {
@@ -62,13 +121,13 @@ TEST(ProtoReader, KeepsAFieldNumberTo16Bits) {
   };
   for (const Case& row : cases) {
     const Bytes input = bytesOf(row.input);
-    const FieldKey key = ProtoReader(input).readKey();
+    const FieldKey key = FieldKey::of(ProtoReader(input).readVarint());
     EXPECT_EQ(key.number, row.number) << row.input;
     EXPECT_EQ(static_cast<unsigned>(key.wireType), row.wireType) << row.input;
   }
 }
 
-TEST(ProtoReader, MakesEveryScalarFromTheSameVarint) {
+TEST(FieldCursor, MakesEveryScalarFromTheSameVarint) {
   struct Case {
     std::string input;
     std::uint64_t uint64;
@@ -93,11 +152,11 @@ TEST(ProtoReader, MakesEveryScalarFromTheSameVarint) {
   };
   for (const Case& row : cases) {
     const Bytes input = bytesOf(row.input);
-    EXPECT_EQ(ProtoReader(input).readUInt64(), row.uint64) << row.input;
-    EXPECT_EQ(ProtoReader(input).readUInt32(), row.uint32) << row.input;
-    EXPECT_EQ(ProtoReader(input).readInt32(), row.int32) << row.input;
-    EXPECT_EQ(ProtoReader(input).readSInt32(), row.sint32) << row.input;
-    EXPECT_EQ(ProtoReader(input).readBool(), row.boolean) << row.input;
+    EXPECT_EQ(readWith<&FieldCursor::readUInt64>(input), row.uint64) << row.input;
+    EXPECT_EQ(readWith<&FieldCursor::readUInt32>(input), row.uint32) << row.input;
+    EXPECT_EQ(readWith<&FieldCursor::readInt32>(input), row.int32) << row.input;
+    EXPECT_EQ(readWith<&FieldCursor::readSInt32>(input), row.sint32) << row.input;
+    EXPECT_EQ(readWith<&FieldCursor::readBool>(input), row.boolean) << row.input;
   }
 }
 

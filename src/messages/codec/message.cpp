@@ -20,7 +20,7 @@ bool readUndeclaredField(FieldKey key, std::string_view messageClass, ProtoReade
   if (!KBBMetricUtility::isValidMetricIdTag(key.number, messageClass)) {
     return reader.skipField(key.number, key.wireType);
   }
-  const std::uint32_t value = reader.readUInt32();
+  const auto value = static_cast<std::uint32_t>(reader.readVarint());
   SystemLog::write("Unknown tag: %x:%u", key.number, value);
   return true;
 }

@@ -9,15 +9,23 @@
 #include <typeinfo>
 #include <vector>
 
+#include "messages/codec/field_cursor.h"
 #include "messages/codec/proto_codable.h"
 #include "messages/codec/repeated_scalar.h"
+#include "platform/recycled_memory.h"
 
 /// What every generated message class is made of: the pieces that do not depend on its fields.
 namespace vesk {
 
 /// The elements of a repeated message field; absent until the first one is added or a list is set.
 template <class Element>
-using MessageList = std::optional<std::vector<std::shared_ptr<Element>>>;
+using MessageList = std::optional<std::vector<std::shared_ptr<Element>, RecyclingAllocator<std::shared_ptr<Element>>>>;
+
+/// An empty message.
+template <class Element>
+[[nodiscard]] std::shared_ptr<Element> makeMessage() {
+  return std::allocate_shared<Element>(RecyclingAllocator<Element>());
+}
 
 /// Base of the generated classes. A class has its own readFrom(), hasEqualFields() and kClassName; `Word` is
 /// the smallest unsigned type with one bit for each of its optional scalar fields.
@@ -28,7 +36,7 @@ class Message : public ProtoCodable {
 
   /// The message encoded in `payload`, or null when it is no encoding of one. No bytes make an empty message.
   [[nodiscard]] static std::shared_ptr<Derived> initWithData(std::span<const std::uint8_t> payload) {
-    auto message = std::make_shared<Derived>();
+    auto message = makeMessage<Derived>();
     ProtoReader reader(payload);
     return message->readFrom(reader) ? message : nullptr;
   }
@@ -71,18 +79,6 @@ class Message : public ProtoCodable {
     return has(field) ? static_cast<std::uint64_t>(value) * 0x9E3779B1 : 0;
   }
 
-  /// Reads keys up to the reader's end and gives each to `readField`, which reads the value and answers
-  /// whether it could. False when it could not, or the bytes ended in the middle.
-  template <class ReadField>
-  [[nodiscard]] bool readFields(ProtoReader& reader, ReadField readField) {
-    while (reader.pos < reader.length && !reader.error) {
-      const FieldKey key = reader.readKey();
-      if (reader.error || key.wireType == WireType::endGroup) break;
-      if (!readField(key)) return false;
-    }
-    return !reader.error;
-  }
-
  private:
   Word presence_ = 0;
 };
@@ -92,24 +88,25 @@ class Message : public ProtoCodable {
 /// the message.
 [[nodiscard]] bool readUndeclaredField(FieldKey key, std::string_view messageClass, ProtoReader& reader);
 
-template <class Element>
-[[nodiscard]] bool readSection(Element& message, ProtoReader& reader) {
-  ReaderMark mark{};
-  if (!reader.enterSection(mark) || !message.readFrom(reader)) return false;
-  reader.leaveSection(mark);
-  return true;
+[[nodiscard, gnu::always_inline]] inline bool readUndeclaredField(std::string_view messageClass, FieldCursor& cursor) {
+  return cursor.withReader([key = cursor.key(), messageClass](ProtoReader& reader) {
+    return readUndeclaredField(key, messageClass, reader);
+  });
 }
 
 /// Reads into a fresh object, which takes the place of the one held.
 template <class Element>
-[[nodiscard]] bool readObject(std::shared_ptr<Element>& object, ProtoReader& reader) {
-  object = std::make_shared<Element>();
-  return readSection(*object, reader);
+[[nodiscard, gnu::always_inline]] inline bool readObject(std::shared_ptr<Element>& object, FieldCursor& cursor) {
+  object = makeMessage<Element>();
+  return cursor.readSection([&](ProtoReader& section) { return object->readFrom(section); });
 }
+
+/// Room for so many elements is made at once.
+inline constexpr std::size_t kLeastElements = 4;
 
 template <class Element>
 void addElement(MessageList<Element>& list, std::shared_ptr<Element> element) {
-  if (!list) list.emplace();
+  if (!list) list.emplace().reserve(kLeastElements);
   list->push_back(std::move(element));
 }
 
@@ -119,32 +116,40 @@ void clearElements(MessageList<Element>& list) {
 }
 
 template <class Element>
-[[nodiscard]] bool readElement(MessageList<Element>& list, ProtoReader& reader) {
-  addElement(list, std::make_shared<Element>());
-  return readSection(*list->back(), reader);
+[[nodiscard, gnu::always_inline]] inline bool readElement(MessageList<Element>& list, FieldCursor& cursor) {
+  addElement(list, makeMessage<Element>());
+  return cursor.readSection([&](ProtoReader& section) { return list->back()->readFrom(section); });
 }
 
-/// Adds the values of one key: a section of them, or a single one. `read` is the reader's operation for one
+/// Adds the values of one key: a section of them, or a single one. `read` is the cursor's operation for one
 /// value.
 template <auto read, class Number>
-[[nodiscard]] bool readRepeated(RepeatedScalar<Number>& values, WireType wireType, ProtoReader& reader) {
-  if (wireType != WireType::lengthDelimited) {
-    values.add((reader.*read)());
+[[nodiscard, gnu::always_inline]] inline bool readRepeated(RepeatedScalar<Number>& values, FieldCursor& cursor) {
+  if (cursor.key().wireType != WireType::lengthDelimited) {
+    values.add((cursor.*read)());
     return true;
   }
-  ReaderMark mark{};
-  if (!reader.enterSection(mark)) return false;
-  while (reader.pos < reader.length && !reader.error)
-    values.add((reader.*read)());
-  reader.leaveSection(mark);
-  return true;
+  return cursor.readSection([&](ProtoReader& section) {
+    FieldCursor numbers(section);
+    while (numbers.hasMore())
+      values.add((numbers.*read)());
+    return true;
+  });
+}
+
+template <class Element>
+void writeElement(const Element& element, std::uint32_t fieldNumber, ProtoWriter& writer) {
+  WriterMark mark{};
+  writer.beginSection(mark, fieldNumber);
+  element.writeTo(writer);
+  writer.endSection(mark);
 }
 
 template <class Element>
 void writeElements(const MessageList<Element>& list, std::uint32_t fieldNumber, ProtoWriter& writer) {
   if (!list) return;
   for (const auto& element : *list)
-    writer.writeMessage(*element, fieldNumber);
+    writeElement(*element, fieldNumber, writer);
 }
 
 /// Writes all values in one section, and nothing when there are none. `write` is the writer's operation for
@@ -168,8 +173,8 @@ template <class Element>
 /// Throws std::out_of_range for an index that is not below the count.
 template <class Element>
 [[nodiscard]] const std::shared_ptr<Element>& elementAt(const MessageList<Element>& list, std::size_t index) {
-  static const std::vector<std::shared_ptr<Element>> kNone;
-  return (list ? *list : kNone).at(index);
+  static const MessageList<Element> kNone(std::in_place);
+  return (list ? list : kNone)->at(index);
 }
 
 /// The dictionary forms of the elements, in their order.

@@ -1,8 +1,39 @@
 #include "messages/codec/proto_reader.h"
 
+#include <algorithm>
 #include <array>
 
 namespace vesk {
+
+std::uint8_t ProtoReader::readByte() {
+  if (pos >= length || error) {
+    error = true;
+    return 0;
+  }
+  return bytes[pos++];
+}
+
+std::uint64_t ProtoReader::readVarint() {
+  std::uint64_t value = 0;
+  for (unsigned count = 0; count < kLongestVarint; ++count) {
+    const std::uint8_t byte = readByte();
+    value |= std::uint64_t{byte & 0x7FU} << (7 * count);
+    if (byte < 0x80) return error ? 0 : value;
+  }
+  return 0;
+}
+
+std::uint64_t ProtoReader::lastWord(std::uint64_t place) const {
+  const std::size_t left = inputSize_ - place;
+  std::uint64_t word = 0;
+  if (inputSize_ < sizeof word) {
+    std::copy_n(bytes + place, left, reinterpret_cast<std::uint8_t*>(&word));
+  } else if (left > 0) {
+    std::memcpy(&word, bytes + inputSize_ - sizeof word, sizeof word);
+    word >>= 8 * (sizeof word - left);
+  }
+  return word;
+}
 
 Text ProtoReader::readString() {
   const std::span<const std::uint8_t> content = readLengthDelimited();
@@ -53,7 +84,7 @@ bool ProtoReader::skipGroup(std::uint32_t fieldNumber) {
   std::size_t depth = 0;
   open[depth++] = fieldNumber;
   while (depth > 0) {
-    const FieldKey key = readKey();
+    const FieldKey key = FieldKey::of(readVarint());
     if (error) return false;
     if (key.wireType == WireType::startGroup) {
       if (depth == open.size()) return false;
@@ -64,14 +95,6 @@ bool ProtoReader::skipGroup(std::uint32_t fieldNumber) {
       return false;
     }
   }
-  return true;
-}
-
-bool ProtoReader::enterSection(ReaderMark& mark) {
-  const std::uint64_t size = readVarint();
-  if (error || size > length - pos) return false;
-  mark.length = length;
-  length = pos + size;
   return true;
 }
 

@@ -1,7 +1,8 @@
 #pragma once
 
+#include <bit>
 #include <cstdint>
-#include <limits>
+#include <cstring>
 #include <span>
 
 #include "platform/data.h"
@@ -19,10 +20,15 @@ enum class WireType : std::uint8_t {
   fixed32 = 5,
 };
 
-/// What stands before every value: which field, and how its value is laid out.
+/// What stands before every value: which field, and how its value is laid out. The number is kept to 16 bits:
+/// 65537 is 1.
 struct FieldKey {
   std::uint32_t number;
   WireType wireType;
+
+  static constexpr FieldKey of(std::uint64_t varint) {
+    return {static_cast<std::uint32_t>(varint >> 3) & 0xFFFFU, static_cast<WireType>(varint & 7)};
+  }
 };
 
 /// What leaveSection() needs to give back: the end that was in force before a section was entered.
@@ -40,44 +46,22 @@ class ProtoReader {
   std::uint64_t length;
   bool error = false;
 
-  explicit ProtoReader(std::span<const std::uint8_t> input) : bytes(input.data()), length(input.size()) {}
+  explicit ProtoReader(std::span<const std::uint8_t> input)
+      : bytes(input.data()), length(input.size()), inputSize_(input.size()) {}
 
-  std::uint8_t readByte() {
-    if (pos >= length || error) {
-      error = true;
-      return 0;
-    }
-    return bytes[pos++];
-  }
+  std::uint8_t readByte();
 
   /// A base-128 number. Ten bytes that all announce another one read as 0 and are no error.
-  [[gnu::always_inline]] std::uint64_t readVarint() {
-    std::uint64_t value = 0;
-    for (unsigned count = 0; count < kLongestVarint; ++count) {
-      const std::uint8_t byte = readByte();
-      value |= std::uint64_t{byte & 0x7FU} << (7 * count);
-      if (byte < 0x80) return error ? 0 : value;
-    }
-    return 0;
-  }
+  std::uint64_t readVarint();
 
-  /// The field number is kept to 16 bits: 65537 reads as 1.
-  FieldKey readKey() {
-    const std::uint64_t key = readVarint();
-    return {static_cast<std::uint32_t>(key >> 3) & 0xFFFFU, static_cast<WireType>(key & 7)};
-  }
-
-  std::uint32_t readUInt32() { return static_cast<std::uint32_t>(readVarint()); }
-  std::int32_t readInt32() { return static_cast<std::int32_t>(readUInt32()); }
-  std::int32_t readSInt32() {
-    const std::uint32_t zigZag = readUInt32();
-    return static_cast<std::int32_t>((zigZag >> 1) ^ (0U - (zigZag & 1)));
-  }
-  std::uint64_t readUInt64() { return readVarint(); }
-  bool readBool() { return readVarint() != 0; }
-  template <class Enumeration>
-  Enumeration readEnumeration() {
-    return static_cast<Enumeration>(readInt32());
+  /// The next eight bytes, the first one lowest, whatever section they are in; zeros beyond the end of the input.
+  [[nodiscard, gnu::always_inline]] std::uint64_t nextWord(std::uint64_t place) const {
+    static_assert(std::endian::native == std::endian::little);
+    std::uint64_t word = 0;
+    if (inputSize_ - place < sizeof word) [[unlikely]]
+      return lastWord(place);
+    std::memcpy(&word, bytes + place, sizeof word);
+    return word;
   }
 
   /// A length and that many bytes; empty, with `error` set, when they are not all there.
@@ -90,7 +74,14 @@ class ProtoReader {
 
   /// Reads the length of a section and makes its end the end of the readable range. False when `error` is set
   /// or the section is longer than what is left.
-  [[nodiscard]] bool enterSection(ReaderMark& mark);
+  [[nodiscard]] bool enterSection(ReaderMark& mark) { return enterSection(mark, readVarint()); }
+  /// The same of a section whose length was read already.
+  [[nodiscard]] bool enterSection(ReaderMark& mark, std::uint64_t size) {
+    if (error || size > length - pos) return false;
+    mark.length = length;
+    length = pos + size;
+    return true;
+  }
   /// Goes to the end of the section, read or not, and makes the former end valid again.
   void leaveSection(const ReaderMark& mark) {
     pos = length;
@@ -101,9 +92,13 @@ class ProtoReader {
   static constexpr unsigned kDeepestGroup = 100;
 
  private:
+  [[nodiscard]] std::uint64_t lastWord(std::uint64_t place) const;
   [[nodiscard]] bool skipBytes(std::uint64_t count);
   [[nodiscard]] bool skipGroup(std::uint32_t fieldNumber);
   std::span<const std::uint8_t> readLengthDelimited();
+
+  /// Of the whole input, whatever section is being read.
+  std::uint64_t inputSize_;
 };
 
 }  // namespace vesk

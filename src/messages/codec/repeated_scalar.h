@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "platform/recycled_memory.h"
 #include "platform/value.h"
 
 namespace vesk {
@@ -25,11 +26,14 @@ class RepeatedScalar {
     return values_[index];
   }
 
-  void add(Number value) { values_.push_back(value); }
+  void add(Number value) {
+    if (values_.capacity() == 0) values_.reserve(kLeastCapacity);
+    values_.push_back(value);
+  }
   /// Takes the values out and gives their storage back.
-  void clear() { std::vector<Number>().swap(values_); }
+  void clear() { Values().swap(values_); }
   /// Replaces the values by a copy of `count` others, which may be some of those held.
-  void set(const Number* values, std::size_t count) { values_ = std::vector<Number>(values, values + count); }
+  void set(const Number* values, std::size_t count) { values_ = Values(values, values + count); }
   void append(const RepeatedScalar& other) {
     const std::size_t added = other.count();
     values_.reserve(count() + added);
@@ -54,7 +58,11 @@ class RepeatedScalar {
   }
 
  private:
-  std::vector<Number> values_;
+  using Values = std::vector<Number, RecyclingAllocator<Number>>;
+  /// As much as the smallest recycled block holds.
+  static constexpr std::size_t kLeastCapacity = 8;
+
+  Values values_;
 };
 
 using RepeatedInt32 = RepeatedScalar<std::int32_t>;

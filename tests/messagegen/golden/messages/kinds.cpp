@@ -22,15 +22,17 @@ Text nameOf(Kinds::Nested value) {
 }
 
 bool Part::readFrom(ProtoReader& reader) {
-  return readFields(reader, [&](FieldKey key) {
-    switch (key.number) {
+  FieldCursor cursor(reader);
+  while (cursor.readKey()) {
+    switch (cursor.fieldNumber()) {
       case 1:
-        assign(kANameSoLongThatStatementsTakeTwo, aNameSoLongThatStatementsTakeTwo_, reader.readUInt32());
-        return true;
+        assign(kANameSoLongThatStatementsTakeTwo, aNameSoLongThatStatementsTakeTwo_, cursor.readUInt32());
+        break;
       default:
-        return readUndeclaredField(key, kClassName, reader);
+        if (!readUndeclaredField(kClassName, cursor)) return false;
     }
-  });
+  }
+  return cursor.finish();
 }
 
 void Part::writeTo(ProtoWriter& writer) const {
@@ -70,51 +72,77 @@ std::uint64_t Part::hash() const {
 }
 
 bool Kinds::readFrom(ProtoReader& reader) {
-  return readFields(reader, [&](FieldKey key) {
-    switch (key.number) {
+  FieldCursor cursor(reader);
+  while (cursor.readKey()) {
+    switch (cursor.fieldNumber()) {
       case 1:
-        assign(kTimestamp, timestamp_, reader.readUInt64());
-        return true;
+        assign(kTimestamp, timestamp_, cursor.readUInt64());
+        if (!cursor.readKeyIf<2, WireType::varint>()) break;
+        [[fallthrough]];
       case 2:
-        assign(kQRxlevMin, qRxlevMin_, reader.readUInt32());
-        return true;
+        assign(kQRxlevMin, qRxlevMin_, cursor.readUInt32());
+        if (!cursor.readKeyIf<3, WireType::varint>()) break;
+        [[fallthrough]];
       case 3:
-        assign(kPlain, plain_, reader.readInt32());
-        return true;
+        assign(kPlain, plain_, cursor.readInt32());
+        if (!cursor.readKeyIf<4, WireType::varint>()) break;
+        [[fallthrough]];
       case 4:
-        assign(kZigZag, zigZag_, reader.readSInt32());
-        return true;
+        assign(kZigZag, zigZag_, cursor.readSInt32());
+        if (!cursor.readKeyIf<5, WireType::varint>()) break;
+        [[fallthrough]];
       case 5:
-        assign(kIsSet, isSet_, reader.readBool());
-        return true;
+        assign(kIsSet, isSet_, cursor.readBool());
+        if (!cursor.readKeyIf<6, WireType::varint>()) break;
+        [[fallthrough]];
       case 6:
-        assign(kNested, nested_, reader.readEnumeration<Nested>());
-        return true;
+        assign(kNested, nested_, cursor.readEnumeration<Nested>());
+        if (!cursor.readKeyIf<7, WireType::varint>()) break;
+        [[fallthrough]];
       case 7:
-        assign(kMode, mode_, reader.readEnumeration<Mode>());
-        return true;
+        assign(kMode, mode_, cursor.readEnumeration<Mode>());
+        if (!cursor.readKeyIf<9, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 9:
-        content_ = reader.readBytes();
-        return true;
+        content_ = cursor.readBytes();
+        if (!cursor.readKeyIf<10, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 10:
-        return readObject(part_, reader);
+        if (!readObject(part_, cursor)) return false;
+        if (!cursor.readKeyIf<11, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 11:
-        return readElement(partLists_, reader);
+        do {
+          if (!readElement(partLists_, cursor)) return false;
+        } while (cursor.readKeyIf<11, WireType::lengthDelimited>());
+        if (!cursor.readKeyIf<12, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 12:
-        return readElement(instValues_, reader);
+        do {
+          if (!readElement(instValues_, cursor)) return false;
+        } while (cursor.readKeyIf<12, WireType::lengthDelimited>());
+        if (!cursor.readKeyIf<13, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 13:
-        return readRepeated<&ProtoReader::readUInt32>(multiBandInfos_, key.wireType, reader);
+        if (!readRepeated<&FieldCursor::readUInt32>(multiBandInfos_, cursor)) return false;
+        if (!cursor.readKeyIf<14, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 14:
-        return readRepeated<&ProtoReader::readSInt32>(csTxPwrs_, key.wireType, reader);
+        if (!readRepeated<&FieldCursor::readSInt32>(csTxPwrs_, cursor)) return false;
+        if (!cursor.readKeyIf<15, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 15:
-        return readRepeated<&ProtoReader::readInt32>(codes_, key.wireType, reader);
+        if (!readRepeated<&FieldCursor::readInt32>(codes_, cursor)) return false;
+        if (!cursor.readKeyIf<65535, WireType::lengthDelimited>()) break;
+        [[fallthrough]];
       case 65535:
-        apn_ = reader.readString();
-        return true;
+        apn_ = cursor.readString();
+        break;
       default:
-        return readUndeclaredField(key, kClassName, reader);
+        if (!readUndeclaredField(kClassName, cursor)) return false;
     }
-  });
+  }
+  return cursor.finish();
 }
 
 void Kinds::writeTo(ProtoWriter& writer) const {

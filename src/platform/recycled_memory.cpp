@@ -1,0 +1,47 @@
+#include "platform/recycled_memory.h"
+
+#include <utility>
+
+namespace vesk {
+
+namespace {
+
+#if defined(__SANITIZE_ADDRESS__)
+constexpr bool kIsRecycling = false;
+#elif defined(__has_feature)
+#if __has_feature(address_sanitizer)
+constexpr bool kIsRecycling = false;
+#else
+constexpr bool kIsRecycling = true;
+#endif
+#else
+constexpr bool kIsRecycling = true;
+#endif
+
+}  // namespace
+
+/// Opens the lists of its thread, and empties and closes them when the thread ends.
+struct RecycledMemory::Keeper {
+  Keeper() {
+    for (FreeList& list : lists_)
+      list.room = kIsRecycling ? kMostKept : 0;
+  }
+  ~Keeper() {
+    for (FreeList& list : lists_) {
+      list.room = 0;
+      for (Block* block = std::exchange(list.first, nullptr); block != nullptr;) {
+        ::operator delete(std::exchange(block, block->next));
+      }
+    }
+  }
+  Keeper(const Keeper&) = delete;
+  Keeper& operator=(const Keeper&) = delete;
+};
+
+void RecycledMemory::releaseToHeap(void* memory) noexcept {
+  // The first block of a thread comes here too, and is the only one to be lost for recycling.
+  static thread_local const Keeper keeper;
+  ::operator delete(memory);
+}
+
+}  // namespace vesk
