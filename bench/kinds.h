@@ -9,7 +9,7 @@
 #include <string_view>
 
 #include "messages/codec/proto_codable.h"
-#include "peers/reflection_json.h"
+#include "peers/reflection_walk.h"
 #include "platform/data.h"
 
 namespace vesk::bench {
