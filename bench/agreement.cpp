@@ -1,4 +1,4 @@
-#include "agreement.h"
+#include "bench/agreement.h"
 
 #include <algorithm>
 #include <google/protobuf/descriptor.h>
@@ -6,9 +6,9 @@
 #include <google/protobuf/util/json_util.h>
 #include <google/protobuf/util/message_differencer.h>
 
+#include "bench/stop.h"
 #include "messages/codec/proto_writer.h"
 #include "platform/text_form.h"
-#include "stop.h"
 
 namespace vesk::bench {
 

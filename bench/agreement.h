@@ -1,6 +1,6 @@
 #pragma once
 
-#include "corpus.h"
+#include "bench/corpus.h"
 
 namespace vesk::bench {
 

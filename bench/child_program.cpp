@@ -1,4 +1,4 @@
-#include "child_program.h"
+#include "bench/child_program.h"
 
 #include <chrono>
 #include <cstring>
@@ -8,7 +8,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-#include "stop.h"
+#include "bench/stop.h"
 
 namespace vesk::bench {
 

@@ -1,13 +1,13 @@
-#include "corpus.h"
+#include "bench/corpus.h"
 
 #include <algorithm>
 #include <random>
 #include <variant>
 
+#include "bench/stop.h"
 #include "corvik/recording_reader.h"
 #include "handset/handset.h"
 #include "intake/metric_table.h"
-#include "stop.h"
 
 namespace vesk::bench {
 

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "kinds.h"
+#include "bench/kinds.h"
 
 namespace vesk::bench {
 

@@ -5,7 +5,7 @@
 #include <string>
 #include <valgrind/callgrind.h>
 
-#include "rows.h"
+#include "bench/rows.h"
 
 int main(int argc, char** argv) {
   using namespace vesk::bench;

@@ -1,14 +1,14 @@
-#include "kinds.h"
+#include "bench/kinds.h"
 
 #include <algorithm>
 #include <array>
 
+#include "bench/libprotobuf_operations.h"
+#include "bench/our_operations.h"
 #include "gsm/gsm.pb.h"
-#include "libprotobuf_operations.h"
 #include "lte/lte.pb.h"
 #include "messages/registry/metric_of_message.h"
 #include "nas/nas.pb.h"
-#include "our_operations.h"
 #include "visits.h"
 #include "wcdma/wcdma.pb.h"
 

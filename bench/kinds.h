@@ -8,8 +8,8 @@
 #include <string>
 #include <string_view>
 
+#include "bench/peers/reflection_walk.h"
 #include "messages/codec/proto_codable.h"
-#include "peers/reflection_walk.h"
 #include "platform/data.h"
 
 namespace vesk::bench {

@@ -3,7 +3,7 @@
 #include <benchmark/benchmark.h>
 #include <google/protobuf/util/json_util.h>
 
-#include "kinds.h"
+#include "bench/kinds.h"
 
 namespace vesk::bench {
 

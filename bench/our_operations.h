@@ -3,7 +3,7 @@
 #include <benchmark/benchmark.h>
 
 #include "app/json_form.h"
-#include "kinds.h"
+#include "bench/kinds.h"
 
 namespace vesk::bench {
 

@@ -1,4 +1,4 @@
-#include "rows.h"
+#include "bench/rows.h"
 
 #include <array>
 #include <benchmark/benchmark.h>

@@ -4,7 +4,7 @@
 #include <string_view>
 #include <vector>
 
-#include "corpus.h"
+#include "bench/corpus.h"
 
 namespace vesk::bench {
 

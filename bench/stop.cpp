@@ -1,4 +1,4 @@
-#include "stop.h"
+#include "bench/stop.h"
 
 #include <cstdlib>
 #include <string>

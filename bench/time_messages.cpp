@@ -9,9 +9,9 @@
 #include <string>
 #include <vector>
 
-#include "agreement.h"
-#include "fact.h"
-#include "rows.h"
+#include "bench/agreement.h"
+#include "bench/fact.h"
+#include "bench/rows.h"
 
 namespace vesk::bench {
 namespace {

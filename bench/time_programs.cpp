@@ -11,8 +11,8 @@
 #include <string>
 #include <vector>
 
-#include "child_program.h"
-#include "fact.h"
+#include "bench/child_program.h"
+#include "bench/fact.h"
 
 namespace vesk::bench {
 namespace {

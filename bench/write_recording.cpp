@@ -5,9 +5,9 @@
 #include <cstring>
 #include <string>
 
-#include "corpus.h"
+#include "bench/corpus.h"
+#include "bench/stop.h"
 #include "corvik/recorded_event.h"
-#include "stop.h"
 
 int main(int argc, char** argv) {
   using namespace vesk::bench;

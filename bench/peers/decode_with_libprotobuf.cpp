@@ -7,10 +7,10 @@
 
 #include "app/data_output.h"
 #include "app/json_form.h"
+#include "bench/kinds.h"
+#include "bench/stop.h"
 #include "corvik/recording_reader.h"
-#include "kinds.h"
 #include "platform/text_form.h"
-#include "stop.h"
 
 namespace vesk::bench {
 namespace {

@@ -1,4 +1,4 @@
-#include "peers/reflection_walk.h"
+#include "bench/peers/reflection_walk.h"
 
 #include <cstdint>
 #include <google/protobuf/descriptor.h>
