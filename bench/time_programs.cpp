@@ -18,7 +18,7 @@ namespace vesk::bench {
 namespace {
 
 /// Runs of a few milliseconds are disturbed easily.
-constexpr int kStartRounds = 100;
+constexpr int kStartRounds = 200;
 constexpr int kTimedRounds = 20;
 /// Of a longer recording only the memory is of interest, and of one that is shorter than the longest timed.
 constexpr std::size_t kLongestTimed = 100'000;
