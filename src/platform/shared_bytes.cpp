@@ -18,12 +18,13 @@ SharedBytes SharedBytes::copy(std::string_view bytes) {
 }
 
 void SharedBytes::release() noexcept {
+  Block* const released = block();
   // The only owner need not pay for a locked decrement: nobody else can take a count any more.
-  if (block_->owners.load(std::memory_order_acquire) == 1 ||
-      block_->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
-    const std::size_t size = sizeof(Block) + block_->size;
-    block_->~Block();
-    RecycledMemory::release(block_, size);
+  if (released->owners.load(std::memory_order_acquire) == 1 ||
+      released->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
+    const std::size_t size = sizeof(Block) + released->size;
+    released->~Block();
+    RecycledMemory::release(released, size);
   }
 }
 

@@ -12,25 +12,29 @@ namespace vesk {
 /// used from several threads at once. An empty one owns nothing.
 class SharedBytes {
  public:
-  /// The owner of the bytes. A block of static storage is immortal: it is never counted and never freed.
+  /// The owner of the bytes.
   struct Block {
-    static constexpr std::uint32_t kImmortal = UINT32_MAX;
-
     const char* bytes;
     std::uint32_t size;
     std::atomic<std::uint32_t> owners;
   };
 
-  constexpr SharedBytes() = default;
-  /// Takes over one count of `block`, or an immortal block.
-  constexpr explicit SharedBytes(Block* block) : block_(block) {}
+  SharedBytes() = default;
+  /// Takes over one count of `block`.
+  explicit SharedBytes(Block* block) : block_(reinterpret_cast<std::uintptr_t>(block)) {}
+  /// Bytes over a block of static storage, which is never counted and never freed.
+  static SharedBytes ofImmortal(Block* block) {
+    SharedBytes bytes(block);
+    bytes.block_ |= kImmortalBit;
+    return bytes;
+  }
   /// A copy of `bytes`, at most 4 GiB; throws std::length_error beyond that.
   static SharedBytes copy(std::string_view bytes);
 
   SharedBytes(const SharedBytes& other) noexcept : block_(other.block_) {
-    if (isCounted()) block_->owners.fetch_add(1, std::memory_order_relaxed);
+    if (isCounted()) block()->owners.fetch_add(1, std::memory_order_relaxed);
   }
-  SharedBytes(SharedBytes&& other) noexcept : block_(std::exchange(other.block_, nullptr)) {}
+  SharedBytes(SharedBytes&& other) noexcept : block_(std::exchange(other.block_, 0)) {}
   SharedBytes& operator=(SharedBytes other) noexcept {
     std::swap(block_, other.block_);
     return *this;
@@ -40,7 +44,7 @@ class SharedBytes {
   }
 
   [[nodiscard]] std::string_view view() const {
-    return block_ == nullptr ? std::string_view{} : std::string_view{block_->bytes, block_->size};
+    return block_ == 0 ? std::string_view{} : std::string_view{block()->bytes, block()->size};
   }
 
   friend bool operator==(const SharedBytes& a, const SharedBytes& b) {
@@ -48,12 +52,16 @@ class SharedBytes {
   }
 
  private:
-  [[nodiscard]] bool isCounted() const {
-    return block_ != nullptr && block_->owners.load(std::memory_order_acquire) != Block::kImmortal;
-  }
+  /// Whether a block is immortal is known without a look at it.
+  static constexpr std::uintptr_t kImmortalBit = 1;
+  static_assert(alignof(Block) > kImmortalBit);
+
+  [[nodiscard]] Block* block() const { return reinterpret_cast<Block*>(block_ & ~kImmortalBit); }
+  [[nodiscard]] bool isCounted() const { return block_ != 0 && (block_ & kImmortalBit) == 0; }
   void release() noexcept;
 
-  Block* block_ = nullptr;
+  /// The block's address, with kImmortalBit.
+  std::uintptr_t block_ = 0;
 };
 
 }  // namespace vesk

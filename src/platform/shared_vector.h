@@ -49,14 +49,17 @@ class SharedVector {
     }
   }
 
-  T& append(T item) {
+  /// Adds an item at the end, made of `parts`.
+  template <class... Parts>
+  T& append(Parts&&... parts) {
     const std::size_t count = size();
-    if (block_ == nullptr || !isOnlyOwner() || count == block_->capacity) {
+    if (block_ == nullptr || count == block_->capacity || !isOnlyOwner()) [[unlikely]] {
+      // Made first: the parts may be of this very sequence.
+      T item{std::forward<Parts>(parts)...};
       reallocate(std::max<std::size_t>({kLeastCapacity, count + 1, count * 2}));
+      return *place(count, std::move(item));
     }
-    T* place = new (block_->items() + count) T(std::move(item));
-    ++block_->size;
-    return *place;
+    return *place(count, std::forward<Parts>(parts)...);
   }
 
   /// Takes the item out; the order of the others stays.
@@ -92,6 +95,13 @@ class SharedVector {
   };
 
   [[nodiscard]] bool isOnlyOwner() const { return block_->owners.load(std::memory_order_acquire) == 1; }
+
+  template <class... Parts>
+  T* place(std::size_t index, Parts&&... parts) {
+    T* item = new (block_->items() + index) T{std::forward<Parts>(parts)...};
+    ++block_->size;
+    return item;
+  }
 
   void reallocate(std::size_t capacity) {
     void* storage = RecycledMemory::allocate(Block::bytesFor(capacity));

@@ -17,7 +17,7 @@ class Text {
   Text() = default;
   static Text copy(std::string_view text) { return Text(SharedBytes::copy(text)); }
   /// A text over an immortal block of static storage.
-  static Text ofLiteral(SharedBytes::Block* block) { return Text(SharedBytes(block)); }
+  static Text ofLiteral(SharedBytes::Block* block) { return Text(SharedBytes::ofImmortal(block)); }
 
   [[nodiscard]] std::string_view view() const { return bytes_.view(); }
   [[nodiscard]] bool empty() const { return view().empty(); }
@@ -44,8 +44,7 @@ template <LiteralCharacters literal>
 inline constexpr LiteralCharacters kLiteral = literal;
 
 template <LiteralCharacters literal>
-inline constinit SharedBytes::Block literalBlock{kLiteral<literal>.characters, sizeof(literal.characters) - 1,
-                                                 SharedBytes::Block::kImmortal};
+inline constinit SharedBytes::Block literalBlock{kLiteral<literal>.characters, sizeof(literal.characters) - 1, 1};
 
 }  // namespace detail
 

@@ -6,6 +6,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <utility>
 #include <variant>
 
@@ -31,7 +32,9 @@ class Array {
   [[nodiscard]] const Value& operator[](std::size_t index) const;
 
   void reserve(std::size_t capacity);
-  void append(Value value);
+  /// Adds a value, or whatever makes one.
+  template <class Held>
+  void append(Held&& value);
 
   friend bool operator==(const Array& a, const Array& b);
 
@@ -62,8 +65,10 @@ class Dictionary {
   void reserve(std::size_t capacity);
   /// Replaces the value in its place, or adds the entry at the end.
   void set(Text key, Value value);
-  /// Adds an entry under a key that the dictionary does not hold yet, without looking.
-  void append(Text key, Value value);
+  /// Adds an entry under a key that the dictionary does not hold yet, without looking; `value` is a value, or
+  /// whatever makes one.
+  template <class Held>
+  void append(Text key, Held&& value);
   /// Takes the entry out, if there is one.
   void erase(std::string_view key);
   void clear() { entries_.clear(); }
@@ -85,16 +90,27 @@ class Value {
   /// equally.
   using Held = std::variant<bool, std::int64_t, std::uint64_t, float, Text, Data, Array, Dictionary>;
 
+  Value(const Value& other) : held_(other.held_) {}
+  Value(Value&& other) noexcept : held_(std::move(other.held_)) {}
+  Value& operator=(const Value& other) {
+    held_ = other.held_;
+    return *this;
+  }
+  Value& operator=(Value&& other) noexcept {
+    held_ = std::move(other.held_);
+    return *this;
+  }
+  ~Value() {
+    // Most values are numbers, and have nothing to give back.
+    if (held_.index() >= kFirstOwner) held_.~Held();
+  }
+
   Value(std::same_as<bool> auto value) : held_(value) {}
   Value(std::signed_integral auto value) : held_(std::int64_t{value}) {}
   template <std::unsigned_integral Number>
-  requires(!std::same_as<Number, bool>) Value(Number value) {
-    if (std::in_range<std::int64_t>(value)) {
-      held_ = static_cast<std::int64_t>(value);
-    } else {
-      held_ = std::uint64_t{value};
-    }
-  }
+  requires(!std::same_as<Number, bool>) Value(Number value)
+      : held_(std::in_range<std::int64_t>(value) ? Held(static_cast<std::int64_t>(value))
+                                                 : Held(std::uint64_t{value})) {}
   Value(std::same_as<float> auto value) : held_(value) {}
   Value(Text value) : held_(std::move(value)) {}
   Value(Data value) : held_(std::move(value)) {}
@@ -121,7 +137,13 @@ class Value {
   friend bool operator==(const Value& a, const Value& b);
 
  private:
-  Held held_;
+  /// The alternatives before this one are plain.
+  static constexpr std::size_t kFirstOwner = 4;
+  static_assert(std::is_same_v<std::variant_alternative_t<kFirstOwner, Held>, Text>);
+
+  union {
+    Held held_;
+  };
 };
 
 struct Dictionary::Entry {
@@ -143,8 +165,9 @@ inline const Value& Array::operator[](std::size_t index) const {
 inline void Array::reserve(std::size_t capacity) {
   values_.reserve(capacity);
 }
-inline void Array::append(Value value) {
-  values_.append(std::move(value));
+template <class Held>
+void Array::append(Held&& value) {
+  values_.append(std::forward<Held>(value));
 }
 
 inline const Dictionary::Entry* Dictionary::begin() const {
@@ -156,8 +179,9 @@ inline const Dictionary::Entry* Dictionary::end() const {
 inline void Dictionary::reserve(std::size_t capacity) {
   entries_.reserve(capacity);
 }
-inline void Dictionary::append(Text key, Value value) {
-  entries_.append(Entry{std::move(key), std::move(value)});
+template <class Held>
+void Dictionary::append(Text key, Held&& value) {
+  entries_.append(std::move(key), std::forward<Held>(value));
 }
 
 }  // namespace vesk

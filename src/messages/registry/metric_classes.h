@@ -5,6 +5,7 @@
 #include <span>
 #include <string_view>
 
+#include "messages/codec/proto_reader.h"
 #include "platform/value.h"
 
 namespace vesk {
@@ -14,9 +15,10 @@ using DecodePayload = std::optional<Dictionary> (*)(std::span<const std::uint8_t
 
 template <class MetricMessage>
 std::optional<Dictionary> decodePayload(std::span<const std::uint8_t> payload) {
-  const auto message = MetricMessage::initWithData(payload);
-  if (message == nullptr) return std::nullopt;
-  return message->dictionaryRepresentation();
+  MetricMessage message;
+  ProtoReader reader(payload);
+  if (!message.readFrom(reader)) return std::nullopt;
+  return message.dictionaryRepresentation();
 }
 
 /// A kind of metric and the class that decodes it.
