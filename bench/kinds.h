@@ -22,6 +22,7 @@ using LibprotobufMessage = google::protobuf::Message;
 struct OurOperations {
   /// Makes the object and frees it.
   bool (*read)(Payload payload);
+  /// These two over a local object, as the program does it.
   bool (*readIntoDictionary)(Payload payload);
   bool (*readIntoJson)(Payload payload, std::string& json);
   std::shared_ptr<ProtoCodable> (*make)(Payload payload);
@@ -32,6 +33,7 @@ struct OurOperations {
 struct LibprotobufOperations {
   bool (*readOnHeap)(Payload payload);
   bool (*readInArena)(Payload payload, google::protobuf::Arena& arena);
+  /// These two over a local object, as well.
   bool (*readIntoJsonByReflection)(Payload payload, ReflectionWalk& walk, std::string& json);
   bool (*readIntoJsonByUtility)(Payload payload, std::string& json);
   std::unique_ptr<LibprotobufMessage> (*make)(Payload payload);

@@ -14,11 +14,11 @@ bool parse(Message& message, Payload payload) {
 
 template <class Message>
 bool readIntoJsonByUtility(Payload payload, std::string& json) {
-  const auto message = std::make_unique<Message>();
-  if (!parse(*message, payload)) return false;
+  Message message;
+  if (!parse(message, payload)) return false;
   google::protobuf::util::JsonPrintOptions options;
   options.preserve_proto_field_names = true;
-  return google::protobuf::util::MessageToJsonString(*message, &json, options).ok();
+  return google::protobuf::util::MessageToJsonString(message, &json, options).ok();
 }
 
 template <class Message>
@@ -38,9 +38,9 @@ constexpr LibprotobufOperations libprotobufOperations() {
           },
       .readIntoJsonByReflection =
           [](Payload payload, ReflectionWalk& walk, std::string& json) {
-            const auto message = std::make_unique<Message>();
-            if (!parse(*message, payload)) return false;
-            walk.appendJson(json, *message);
+            Message message;
+            if (!parse(message, payload)) return false;
+            walk.appendJson(json, message);
             return true;
           },
       .readIntoJsonByUtility = readIntoJsonByUtility<Message>,

@@ -4,6 +4,7 @@
 
 #include "app/json_form.h"
 #include "bench/kinds.h"
+#include "messages/registry/metric_classes.h"
 
 namespace vesk::bench {
 
@@ -18,18 +19,15 @@ constexpr OurOperations ourOperations() {
           },
       .readIntoDictionary =
           [](Payload payload) {
-            const auto message = Message::initWithData(payload);
-            if (message == nullptr) return false;
-            const Dictionary dictionary = message->dictionaryRepresentation();
-            benchmark::DoNotOptimize(dictionary.begin());
-            return true;
+            const std::optional<Dictionary> dictionary = decodePayload<Message>(payload);
+            benchmark::DoNotOptimize(dictionary);
+            return dictionary.has_value();
           },
       .readIntoJson =
           [](Payload payload, std::string& json) {
-            const auto message = Message::initWithData(payload);
-            if (message == nullptr) return false;
-            appendJson(json, message->dictionaryRepresentation());
-            return true;
+            const std::optional<Dictionary> dictionary = decodePayload<Message>(payload);
+            if (dictionary) appendJson(json, *dictionary);
+            return dictionary.has_value();
           },
       .make = [](Payload payload) -> std::shared_ptr<ProtoCodable> { return Message::initWithData(payload); },
       .write =
