@@ -14,6 +14,11 @@ build     libncurses-dev      /usr/include/ncursesw/curses.h
 test      libgtest-dev        /usr/include/gtest/gtest.h
 test      protobuf-compiler   protoc
 test      libprotobuf-dev     /usr/include/google/protobuf/message.h
+bench     libbenchmark-dev    /usr/include/benchmark/benchmark.h
+bench     libprotobuf-dev     /usr/include/google/protobuf/message.h
+bench     protobuf-compiler   protoc
+bench     libprotozero-dev    /usr/include/protozero/pbf_reader.hpp
+bench     valgrind            valgrind
 clang     clang               clang++
 fuzz      libclang-rt-14-dev  /usr/lib/llvm-14/lib/clang/14.0.6/include/fuzzer/FuzzedDataProvider.h
 format    clang-format        clang-format

@@ -1,0 +1,15 @@
+#include "bench/stop.h"
+
+#include <cstdlib>
+#include <string>
+
+#include "app/outcome.h"
+
+namespace vesk::bench {
+
+void stop(std::string_view reason) {
+  tellUser("bench: " + std::string(reason));
+  std::exit(EXIT_FAILURE);
+}
+
+}  // namespace vesk::bench
