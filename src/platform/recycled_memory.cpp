@@ -8,7 +8,7 @@ namespace vesk {
 struct RecycledMemory::Keeper {
   Keeper() {
     for (FreeList& list : lists_)
-      list.room = kHasAddressSanitizer ? 0 : kMostKept;
+      list.room = kIsSanitized ? 0 : kMostKept;
   }
   ~Keeper() {
     for (FreeList& list : lists_) {

@@ -7,23 +7,23 @@
 
 namespace vesk {
 
-#if defined(__SANITIZE_ADDRESS__)
-inline constexpr bool kHasAddressSanitizer = true;
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+inline constexpr bool kIsSanitized = true;
 #elif defined(__has_feature)
-inline constexpr bool kHasAddressSanitizer = __has_feature(address_sanitizer);
+inline constexpr bool kIsSanitized = __has_feature(address_sanitizer) || __has_feature(thread_sanitizer);
 #else
-inline constexpr bool kHasAddressSanitizer = false;
+inline constexpr bool kIsSanitized = false;
 #endif
 
 /// Memory for the many small objects that an event is made of and that live no longer than it does: what a thread gives
 /// back is kept, within bounds, for its next request of about that size. A block may be released by another thread than
-/// the one that allocated it. Under AddressSanitizer every block comes from the heap, in the size that was asked for,
-/// so that its checks see them all.
+/// the one that allocated it. Under a sanitizer of memory or threads every block comes from the heap, in the size that
+/// was asked for, so that its checks see them all.
 class RecycledMemory {
  public:
   /// `size` bytes, aligned for every ordinary type; throws std::bad_alloc.
   [[nodiscard]] static void* allocate(std::size_t size) {
-    if constexpr (kHasAddressSanitizer) return ::operator new(size);
+    if constexpr (kIsSanitized) return ::operator new(size);
     const std::size_t index = listIndex(size);
     if (index < kLists) [[likely]] {
       FreeList& list = lists_[index];
