@@ -49,9 +49,11 @@ class SharedVector {
     }
   }
 
+  T& append(T item) { return emplace(std::move(item)); }
+
   /// Adds an item at the end, made of `parts`.
   template <class... Parts>
-  T& append(Parts&&... parts) {
+  T& emplace(Parts&&... parts) {
     const std::size_t count = size();
     if (block_ == nullptr || count == block_->capacity || !isOnlyOwner()) [[unlikely]] {
       // Made first: the parts may be of this very sequence.

@@ -170,7 +170,7 @@ inline void Array::reserve(std::size_t capacity) {
 }
 template <class Held>
 void Array::append(Held&& value) {
-  values_.append(std::forward<Held>(value));
+  values_.emplace(std::forward<Held>(value));
 }
 
 inline const Dictionary::Entry* Dictionary::begin() const {
@@ -184,7 +184,7 @@ inline void Dictionary::reserve(std::size_t capacity) {
 }
 template <class Held>
 void Dictionary::append(Text key, Held&& value) {
-  entries_.append(std::move(key), std::forward<Held>(value));
+  entries_.emplace(std::move(key), std::forward<Held>(value));
 }
 
 }  // namespace vesk
