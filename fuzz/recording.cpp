@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <fcntl.h>
+#include <span>
 #include <string>
 #include <sys/mman.h>
 #include <unistd.h>
@@ -99,7 +100,7 @@ std::string outcomeOf(std::string_view line, std::size_t number) {
   while (padded.size() < line.size() + RecordedEventParser::kPadding)
     padded += "7\"}, ";
   RecordedEventParser parser;
-  const auto event = parser.parse(std::string_view(padded).substr(0, line.size()));
+  const auto event = parser.parse(std::span(padded).first(line.size()));
   if (!event) return complaint(number, parser.reason());
 
   std::string written;

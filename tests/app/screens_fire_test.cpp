@@ -54,7 +54,7 @@ void shrinkStores(MetricValidator& intake) {
       if (list.size() > 0) operator()({}, list[0]);
     }
     void operator()(std::string_view, const Record& record) const {
-      if (!record.empty()) const_cast<Record&>(record).erase((record.end() - 1)->key.view());
+      if (!record.empty()) const_cast<Record&>(record).erase((record.end() - 1)->key);
     }
     void operator()(std::string_view, const Value&) const {}
   };
