@@ -59,6 +59,7 @@ class SharedBytes {
   static constexpr std::uintptr_t kImmortalBit = 1;
   static_assert(alignof(Block) > kImmortalBit);
 
+  // NOLINTNEXTLINE(performance-no-int-to-ptr): the address and the bit share one word, so that a look tells both
   [[nodiscard]] Block* block() const { return reinterpret_cast<Block*>(block_ & ~kImmortalBit); }
   [[nodiscard]] bool isCounted() const { return block_ != 0 && (block_ & kImmortalBit) == 0; }
   void release() noexcept;

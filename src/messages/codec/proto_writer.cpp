@@ -25,7 +25,7 @@ void ProtoWriter::grow(std::size_t more) {
 }
 
 void ProtoWriter::writeContent(std::span<const std::uint8_t> content, std::uint32_t fieldNumber) {
-  std::uint8_t* place = roomFor(2 * ProtoReader::kLongestVarint + content.size());
+  std::uint8_t* place = roomFor(kLongestScalar + content.size());
   place = putVarint(place, keyOf(fieldNumber, WireType::lengthDelimited));
   place = putVarint(place, content.size());
   finishAt(std::copy(content.begin(), content.end(), place));

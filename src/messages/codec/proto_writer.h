@@ -41,7 +41,7 @@ class ProtoWriter {
     writeUInt64(shifted ^ static_cast<std::uint32_t>(value >> 31), fieldNumber);
   }
   [[gnu::always_inline]] void writeUInt64(std::uint64_t value, std::uint32_t fieldNumber) {
-    std::uint8_t* place = roomFor(2 * ProtoReader::kLongestVarint);
+    std::uint8_t* place = roomFor(kLongestScalar);
     if (fieldNumber != kNoKey) place = putVarint(place, keyOf(fieldNumber, WireType::varint));
     finishAt(putVarint(place, value));
   }
@@ -67,6 +67,9 @@ class ProtoWriter {
   void clear() { size_ = 0; }
 
  private:
+  /// A key and a number.
+  static constexpr std::size_t kLongestScalar = std::size_t{2} * ProtoReader::kLongestVarint;
+
   static constexpr std::uint64_t keyOf(std::uint32_t fieldNumber, WireType wireType) {
     return std::uint64_t{fieldNumber} << 3 | static_cast<std::uint64_t>(wireType);
   }
