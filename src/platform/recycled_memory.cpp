@@ -23,7 +23,7 @@ struct RecycledMemory::Keeper {
 };
 
 void RecycledMemory::releaseToHeap(void* memory) noexcept {
-  // The first block of a thread comes here too, and is the only one to be lost for recycling.
+  // The first release of a thread comes here too, and opens its lists.
   static thread_local const Keeper keeper;
   ::operator delete(memory);
 }

@@ -44,7 +44,7 @@ class TerminalDevice {
   TerminalDevice(const TerminalDevice&) = delete;
   TerminalDevice& operator=(const TerminalDevice&) = delete;
 
-  /// Readable whenever `receive` has something to tell, or the time given to `wakeAt` has come.
+  /// Readable whenever `receive` has something to tell, or the time given to `wakeAfter` has come.
   [[nodiscard]] int descriptor() const { return events_.get(); }
   [[nodiscard]] Arrived receive();
   /// Replaces the time at which the descriptor becomes readable next; absent for never.
