@@ -58,10 +58,9 @@ void writeStores(JsonWriter& json, const MetricValidator& intake) {
 
 std::string storesAsJson(const MetricValidator& intake) {
   std::string out;
-  {
-    JsonWriter json(out);
-    writeStores(json, intake);
-  }
+  JsonWriter json(out);
+  writeStores(json, intake);
+  json.finish();
   return out;
 }
 

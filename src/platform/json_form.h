@@ -14,13 +14,14 @@ namespace vesk {
 
 /// Appends JSON to a text: numbers and booleans as such, bytes as "0x…" text, invalid UTF-8 as U+FFFD. Control
 /// characters are escaped, those beyond ASCII too, so that a terminal may show what comes out. Small pieces are
-/// gathered; all is in the text once the writer is gone.
+/// gathered: all is in the text after finish().
 class JsonWriter {
  public:
   explicit JsonWriter(std::string& out) : out_(out) {}
   JsonWriter(const JsonWriter&) = delete;
   JsonWriter& operator=(const JsonWriter&) = delete;
-  ~JsonWriter() { flush(); }
+
+  void finish() { flush(); }
 
   void write(std::same_as<bool> auto value) { put(value ? "true" : "false"); }
   template <std::integral Number>
@@ -128,7 +129,9 @@ void writeJsonArray(JsonWriter& json, const Range& range, Write write) {
 
 template <class Written>
 void appendJson(std::string& out, const Written& value) {
-  JsonWriter(out).write(value);
+  JsonWriter json(out);
+  json.write(value);
+  json.finish();
 }
 
 }  // namespace vesk

@@ -34,6 +34,7 @@ bool appendPayloadJson(std::string& out, std::span<const std::uint8_t> payload) 
   if (!message.readFrom(reader)) return false;
   JsonWriter json(out);
   message.writeJson(json);
+  json.finish();
   return true;
 }
 
