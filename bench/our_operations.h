@@ -2,7 +2,6 @@
 
 #include <benchmark/benchmark.h>
 
-#include "app/json_form.h"
 #include "bench/kinds.h"
 #include "messages/registry/metric_classes.h"
 
@@ -23,12 +22,7 @@ constexpr OurOperations ourOperations() {
             benchmark::DoNotOptimize(dictionary);
             return dictionary.has_value();
           },
-      .readIntoJson =
-          [](Payload payload, std::string& json) {
-            const std::optional<Dictionary> dictionary = decodePayload<Message>(payload);
-            if (dictionary) appendJson(json, *dictionary);
-            return dictionary.has_value();
-          },
+      .readIntoJson = [](Payload payload, std::string& json) { return appendPayloadJson<Message>(json, payload); },
       .make = [](Payload payload) -> std::shared_ptr<ProtoCodable> { return Message::initWithData(payload); },
       .write =
           [](const ProtoCodable& message, ProtoWriter& writer) {

@@ -8,9 +8,9 @@
 #include <vector>
 
 #include "app/connected_program.h"
-#include "app/json_form.h"
 #include "intake/metric_table.h"
 #include "messages/wire_model.h"
+#include "platform/json_form.h"
 #include "property.h"
 #include "screens/vesk_view_items.h"
 #include "shown.h"

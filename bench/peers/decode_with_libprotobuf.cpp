@@ -6,10 +6,10 @@
 #include <variant>
 
 #include "app/data_output.h"
-#include "app/json_form.h"
 #include "bench/kinds.h"
 #include "bench/stop.h"
 #include "corvik/recording_reader.h"
+#include "platform/json_form.h"
 #include "platform/text_form.h"
 
 namespace vesk::bench {

@@ -5,7 +5,7 @@
 #include <span>
 #include <string_view>
 
-#include "app/json_form.h"
+#include "platform/json_form.h"
 #include "platform/text_form.h"
 
 namespace vesk::bench {

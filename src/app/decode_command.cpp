@@ -5,7 +5,6 @@
 #include <variant>
 
 #include "app/data_output.h"
-#include "app/json_form.h"
 #include "app/progress.h"
 #include "app/recording_hint.h"
 #include "corvik/recording_reader.h"
@@ -18,28 +17,24 @@ namespace {
 
 void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
   const MetricClass* metricClass = findMetricClass(event.metricId);
-  std::optional<Dictionary> fields;
-  if (metricClass != nullptr) fields = metricClass->decode(event.payload);
-
   out += "{\"at\":";
   appendDecimal(out, event.at);
   out += ",\"metric\":";
   corvik::appendMetricId(out, event.metricId);
-  out += ",\"class\":";
   if (metricClass == nullptr) {
-    out += "null";
-  } else {
-    appendJson(out, metricClass->name);
+    out += R"(,"class":null,"status":"ignored","fields":null})";
+    return;
   }
-  out += ",\"status\":\"";
-  out += fields ? "decoded" : metricClass == nullptr ? "ignored" : "undecodable";
-  out += "\",\"fields\":";
-  if (fields) {
-    appendJson(out, *fields);
+  out += ",\"class\":\"";
+  out += metricClass->name;
+  const std::size_t beforeStatus = out.size();
+  out += R"(","status":"decoded","fields":)";
+  if (metricClass->appendJson(out, event.payload)) {
+    out += '}';
   } else {
-    out += "null";
+    out.resize(beforeStatus);
+    out += R"(","status":"undecodable","fields":null})";
   }
-  out += '}';
 }
 
 /// Decodes a recording step by step; each step answers whether to go on.

@@ -5,9 +5,9 @@
 #include <vector>
 
 #include "app/data_output.h"
-#include "app/json_form.h"
 #include "app/road.h"
 #include "app/suggestion.h"
+#include "platform/json_form.h"
 #include "platform/visible_text.h"
 #include "screens/vesk_view_items.h"
 #include "toolkit/interface_layout.h"

@@ -1,81 +1,66 @@
 #include "app/stores_command.h"
 
 #include "app/data_output.h"
-#include "app/json_form.h"
 #include "app/road.h"
 #include "intake/metric_validator.h"
+#include "platform/json_form.h"
 
 namespace vesk {
 
 namespace {
 
-void appendJson(std::string& out, const RecordList& list) {
-  char separator = '[';
-  for (const Record& record : list) {
-    out += separator;
-    appendJson(out, record);
-    separator = ',';
-  }
-  if (list.size() == 0) out += '[';
-  out += ']';
+template <class Field>
+void write(JsonWriter& json, const Field& field) {
+  json.write(field);
 }
 
-/// Writes the fields of one JSON object, one after another.
-class ObjectFields {
- public:
-  explicit ObjectFields(std::string& out) : out_(out) {}
-
-  /// Starts a field, whose value follows.
-  void name(std::string_view name) {
-    out_ += separator_;
-    separator_ = ',';
-    vesk::appendJson(out_, name);
-    out_ += ':';
-  }
-  void end() { out_ += '}'; }
-
- private:
-  std::string& out_;
-  char separator_ = '{';
-};
+void write(JsonWriter& json, const RecordList& list) {
+  writeJsonArray(json, list, [&](const Record& record) { json.write(record); });
+}
 
 template <class Store>
-void appendStore(std::string& out, const Store& store) {
-  ObjectFields fields(out);
+void writeStore(JsonWriter& json, const Store& store) {
+  JsonObject fields(json);
   visitFields(store, [&](std::string_view name, const auto& field) {
-    fields.name(name);
-    appendJson(out, field);
+    fields.key(name);
+    write(json, field);
   });
   fields.end();
 }
 
-void appendLatestRecords(std::string& out, const MetricValidator& intake) {
-  ObjectFields fields(out);
+void writeLatestRecords(JsonWriter& json, const MetricValidator& intake) {
+  JsonObject fields(json);
   for (const auto& [name, member] : kLatestRecords) {
-    fields.name(name);
+    fields.key(name);
     if (const auto& record = intake.*member) {
-      vesk::appendJson(out, *record);
+      json.write(*record);
     } else {
-      out += "null";
+      json.writeNull();
     }
   }
   fields.end();
 }
 
+void writeStores(JsonWriter& json, const MetricValidator& intake) {
+  JsonObject fields(json);
+  fields.key("dictionaries");
+  writeLatestRecords(json, intake);
+  fields.key("LTE");
+  writeStore(json, intake.myLTE);
+  fields.key("UMTS");
+  writeStore(json, intake.myUMTS);
+  fields.key("GSM");
+  writeStore(json, intake.myGSM);
+  fields.key("Common");
+  writeStore(json, intake.myCommon);
+  fields.end();
+}
+
 std::string storesAsJson(const MetricValidator& intake) {
   std::string out;
-  ObjectFields fields(out);
-  fields.name("dictionaries");
-  appendLatestRecords(out, intake);
-  fields.name("LTE");
-  appendStore(out, intake.myLTE);
-  fields.name("UMTS");
-  appendStore(out, intake.myUMTS);
-  fields.name("GSM");
-  appendStore(out, intake.myGSM);
-  fields.name("Common");
-  appendStore(out, intake.myCommon);
-  fields.end();
+  JsonWriter json(out);
+  writeStores(json, intake);
+  json.finish();
   return out;
 }
 

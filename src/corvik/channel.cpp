@@ -12,7 +12,7 @@ namespace {
 /// seldom wait for each other, for waking one costs as much as some ten events.
 constexpr std::size_t kMostWaiting = 1024;
 /// And after a large one: so little that events of megabytes still fit.
-constexpr std::size_t kMostWaitingBehindLarge = 64;
+constexpr std::size_t kMostWaitingBehindLarge = 8;
 /// Bytes of payload.
 constexpr std::size_t kLarge = 512;
 
@@ -54,12 +54,12 @@ bool Channel::waitUntilWanted(const std::stop_token& stop) {
     std::unique_lock lock(mutex_);
     if (!wanted_.wait(lock, stop, [this] { return isWanted(); })) return false;
   }
-  const std::size_t most = wasLarge_ ? kMostWaitingBehindLarge : kMostWaiting;
+  const std::size_t most = isLargeAhead_ && isLargeAhead_.exchange(false) ? kMostWaitingBehindLarge : kMostWaiting;
   return backlog_.waitUntilFewerThan(most, stop) && vesk::MainQueue::shared().waitUntilFewerThan(most, stop);
 }
 
 void Channel::raise(const vesk::Text& event, vesk::InterProcessDictionary message) {
-  wasLarge_ = isLarge(message);
+  if (isLarge(message)) isLargeAhead_ = true;
   add(Event{event, std::move(message)});
 }
 

@@ -61,8 +61,8 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
   std::condition_variable_any wanted_;
   std::shared_ptr<const Handlers> handlers_ = std::make_shared<const Handlers>();
 
-  /// Whether the event raised last was a large one.
-  std::atomic<bool> wasLarge_ = false;
+  /// Whether a large event was raised since a source last waited until few were ahead.
+  std::atomic<bool> isLargeAhead_ = false;
   vesk::Backlog<Delivery> backlog_;
   /// What was taken from the backlog, and how much of it is done: left alone while events are off.
   std::vector<Delivery> batch_;

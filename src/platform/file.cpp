@@ -6,8 +6,6 @@
 #include <unistd.h>
 #include <vector>
 
-#include "platform/file_descriptor.h"
-
 namespace vesk {
 
 namespace {
@@ -33,6 +31,12 @@ std::optional<Data> readFile(const std::string& path) {
       return std::nullopt;
     }
   }
+}
+
+FileDescriptor openUnblocked(int descriptor) {
+  if (isatty(descriptor) != 1) return {};
+  const std::string path = "/proc/self/fd/" + std::to_string(descriptor);
+  return FileDescriptor(open(path.c_str(), O_WRONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
 }
 
 }  // namespace vesk

@@ -11,6 +11,7 @@
 #include <unistd.h>
 #include <utility>
 
+#include "platform/file.h"
 #include "platform/visible_text.h"
 
 namespace vesk {
@@ -36,6 +37,7 @@ DescriptorSink::DescriptorSink(int descriptor, std::string name)
     : descriptor_(descriptor),
       name_(std::move(name)),
       isTerminal_(isatty(descriptor) == 1),
+      terminal_(openUnblocked(descriptor)),
       chunk_(chunkOf(descriptor)) {
   std::signal(SIGPIPE, SIG_IGN);
 }
@@ -57,7 +59,7 @@ void DescriptorSink::flush() {
       fail("nobody reads it");
       break;
     }
-    const ssize_t written = ::write(descriptor_, rest.data(), mayBlock ? rest.size() : std::min(rest.size(), chunk_));
+    const ssize_t written = mayBlock ? ::write(descriptor_, rest.data(), rest.size()) : writeWhatFits(rest);
     if (written >= 0) {
       rest.remove_prefix(static_cast<std::size_t>(written));
     } else if (errno != EINTR && errno != EAGAIN) {
@@ -65,6 +67,11 @@ void DescriptorSink::flush() {
     }
   }
   buffer_.clear();
+}
+
+ssize_t DescriptorSink::writeWhatFits(std::string_view bytes) const {
+  const int descriptor = terminal_.isOpen() ? terminal_.get() : descriptor_;
+  return ::write(descriptor, bytes.data(), std::min(bytes.size(), chunk_));
 }
 
 DescriptorSink::Room DescriptorSink::waitForRoom() const {

@@ -8,6 +8,7 @@
 #include <string>
 #include <string_view>
 
+#include "platform/file_descriptor.h"
 #include "platform/wake_up.h"
 
 namespace vesk {
@@ -55,6 +56,8 @@ class DescriptorSink : public OutputSink {
   enum class Room { some, interrupted, neverAgain };
 
   [[nodiscard]] Room waitForRoom() const;
+  /// write(2), of some of the bytes, where there is room.
+  [[nodiscard]] ssize_t writeWhatFits(std::string_view bytes) const;
   /// Milliseconds in poll(2)'s manner.
   [[nodiscard]] int longestWait() const;
   void fail(const char* reason);
@@ -62,6 +65,8 @@ class DescriptorSink : public OutputSink {
   int descriptor_;
   std::string name_;
   bool isTerminal_;
+  /// The terminal, where writing does not block; not open where the descriptor is none.
+  FileDescriptor terminal_;
   /// The most that is written at once where it may not block; a pipe that has room at all has room for this.
   std::size_t chunk_;
   const WakeUp* interrupt_ = nullptr;

@@ -4,13 +4,24 @@
 
 namespace vesk {
 
-/// Opens the lists of its thread, and empties and closes them when the thread ends.
+namespace {
+
+enum class Lists : std::uint8_t { notYetOpen, open, closed };
+
+/// Whether the lists of this thread take blocks: they are opened by its first release and closed at its end, after
+/// which blocks may still be released.
+constinit thread_local Lists lists = Lists::notYetOpen;
+
+}  // namespace
+
 struct RecycledMemory::Keeper {
   Keeper() {
+    lists = Lists::open;
     for (FreeList& list : lists_)
-      list.room = kIsSanitized ? 0 : kMostKept;
+      list.room = kMostKept;
   }
   ~Keeper() {
+    lists = Lists::closed;
     for (FreeList& list : lists_) {
       list.room = 0;
       for (Block* block = std::exchange(list.first, nullptr); block != nullptr;) {
@@ -23,8 +34,9 @@ struct RecycledMemory::Keeper {
 };
 
 void RecycledMemory::releaseToHeap(void* memory) noexcept {
-  // The first release of a thread comes here too, and opens its lists.
-  static thread_local const Keeper keeper;
+  if (!kIsSanitized && lists == Lists::notYetOpen) {
+    static thread_local const Keeper keeper;
+  }
   ::operator delete(memory);
 }
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <atomic>
 #include <cerrno>
+#include <chrono>
 #include <climits>
 #include <cstdarg>
 #include <cstdio>
@@ -13,7 +14,7 @@
 #include <unistd.h>
 #include <utility>
 
-#include "platform/file_descriptor.h"
+#include "platform/file.h"
 #include "platform/visible_text.h"
 
 namespace vesk {
@@ -33,7 +34,11 @@ class SyslogSink : public LogSink {
 class DescriptorLogSink : public LogSink {
  public:
   DescriptorLogSink(FileDescriptor descriptor, std::chrono::milliseconds patience)
-      : descriptor_(std::move(descriptor)), patience_(static_cast<int>(patience.count())) {}
+      : descriptor_(std::move(descriptor)), patience_(patience) {
+    if (FileDescriptor unblocked = openUnblocked(descriptor_.get()); unblocked.isOpen()) {
+      descriptor_ = std::move(unblocked);
+    }
+  }
 
   void write(std::string_view line) override {
     std::string whole;
@@ -56,10 +61,15 @@ class DescriptorLogSink : public LogSink {
  private:
   /// How many bytes the reader does not take. It is waited for once; when it has let that pass, no more until it reads.
   std::size_t leftOf(std::string_view bytes) {
+    using std::chrono::steady_clock;
+    const auto deadline = steady_clock::now() + (dropped_ > 0 ? std::chrono::milliseconds(0) : patience_);
     while (!bytes.empty()) {
+      const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - steady_clock::now());
       pollfd polled{descriptor_.get(), POLLOUT, 0};
-      const int ready = poll(&polled, 1, dropped_ > 0 ? 0 : patience_);
+      const int ready = poll(&polled, 1, static_cast<int>(std::max<std::int64_t>(0, left.count())));
       if (ready == 0) break;
+      // A signal is none of the reader's doing.
+      if (ready < 0) continue;
       const ssize_t written = ::write(descriptor_.get(), bytes.data(), std::min<std::size_t>(bytes.size(), PIPE_BUF));
       if (written >= 0) {
         bytes.remove_prefix(static_cast<std::size_t>(written));
@@ -71,7 +81,7 @@ class DescriptorLogSink : public LogSink {
   }
 
   FileDescriptor descriptor_;
-  int patience_;
+  std::chrono::milliseconds patience_;
   /// Lines since the reader last took one, and whether the first of them was written in part.
   std::size_t dropped_ = 0;
   bool isCut_ = false;

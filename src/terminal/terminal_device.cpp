@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <cerrno>
+#include <chrono>
 #include <fcntl.h>
 #include <poll.h>
 #include <sys/epoll.h>
@@ -18,7 +19,7 @@ namespace vesk {
 namespace {
 
 /// How long the program waits for a terminal that takes nothing before it leaves it as it is.
-constexpr int kPatienceMs = 1000;
+constexpr std::chrono::milliseconds kPatience{1000};
 
 /// Keys come one by one and unseen; the keys for interrupting and stopping go on working, but cut off nothing that
 /// was written before; those for holding the output do not.
@@ -156,9 +157,12 @@ void TerminalDevice::writeOn() {
 
 /// Until it has taken everything, or is given up.
 void TerminalDevice::waitForTerminal() {
+  using std::chrono::steady_clock;
+  const steady_clock::time_point deadline = steady_clock::now() + kPatience;
   while (isBehind()) {
+    const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - steady_clock::now());
     pollfd polled{terminal_.get(), POLLOUT, 0};
-    if (poll(&polled, 1, kPatienceMs) == 0) unwritten_.clear();
+    if (left.count() <= 0 || poll(&polled, 1, static_cast<int>(left.count())) == 0) unwritten_.clear();
     writeOn();
   }
 }

@@ -48,8 +48,9 @@ class Fire {
                      std::vector<std::string>{"--log", "none", "--speed", "max", "--loop", "--replay", recording},
                      terminal_.openForProgram());
     // Until then the terminal itself echoes what is typed.
-    while (!hasBegun_ && isFaultless())
-      read(10000);
+    const Clock::time_point deadline = Clock::now() + 30s;
+    while (!hasBegun_ && isFaultless() && Clock::now() < deadline)
+      read(100);
   }
 
   Fire(const Fire&) = delete;
@@ -58,6 +59,7 @@ class Fire {
 
   /// One volley. False, and it is told why, when the program sent what it may not.
   bool shoot() {
+    if (!hasBegun_) return fail("it does not begin");
     for (int count = pick(4); count >= 0; --count)
       terminal_.type(input());
     if (pick(3) == 0) resize();
@@ -76,6 +78,8 @@ class Fire {
   bool end(int how) {
     const Clock::time_point deadline = Clock::now() + 20s;
     // The first bytes end whatever sequence was begun, the next one the typing of a filter.
+    read(0);
+    if (isOver()) return fail("it ended by itself");
     constexpr std::string_view kLead = "\x18\x18\x18\x18\r";
     if (how == 2) kill(process_->id(), SIGTERM);
     while (!isOver()) {

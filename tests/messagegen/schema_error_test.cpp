@@ -107,16 +107,22 @@ TEST(Schema, TellsOfFilesThatCannotBeRead) {
             "a.proto:1:38: import \"b.proto\" is of another package" + shown);
 }
 
-TEST(Schema, RefusesMessagesThatNestWithoutBound) {
-  std::string source = "syntax = \"proto2\"; package p;\n";
+TEST(Schema, RefusesMessagesThatNestWithoutBoundWhicheverIsDeclaredFirst) {
+  const std::string start = "syntax = \"proto2\"; package p;\n";
+  const auto link = [](int outer, int inner) {
+    return "message M" + std::to_string(outer) + " { optional M" + std::to_string(inner) + " m = 1; }\n";
+  };
+  std::string outermostFirst = start;
+  std::string innermostFirst = start + "message M0 {}\n";
   for (int depth = 0; depth < 1'000; ++depth) {
-    const std::string name = "M" + std::to_string(depth);
-    source += "message " + name + " { optional M" + std::to_string(depth + 1) + " m = 1; }\n";
+    outermostFirst += link(depth, depth + 1);
+    innermostFirst += link(depth + 1, depth);
   }
-  source += "message M1000 {}\n";
-  EXPECT_EQ(errorOf({{"a.proto", source}}, "a.proto"),
-            "a.proto:33:24: messages nest more than 32 deep\nmessage M31 { optional M32 m = 1; }\n" +
-                std::string(23, ' ') + "^\n");
+  outermostFirst += "message M1000 {}\n";
+  const std::string reason = ":24: messages nest more than 32 deep\n";
+  const std::string mark = std::string(23, ' ') + "^\n";
+  EXPECT_EQ(errorOf({{"a.proto", outermostFirst}}, "a.proto"), "a.proto:33" + reason + link(31, 32) + mark);
+  EXPECT_EQ(errorOf({{"a.proto", innermostFirst}}, "a.proto"), "a.proto:34" + reason + link(32, 31) + mark);
 }
 
 TEST(Schema, OrdersMessagesByUseAndFindsImportedTypes) {

@@ -1,6 +1,7 @@
 #include "platform/output_lines.h"
 
 #include <chrono>
+#include <cstdlib>
 #include <fcntl.h>
 #include <gtest/gtest.h>
 #include <string>
@@ -102,6 +103,21 @@ TEST(DescriptorSink, DoesNotWaitForABlockedReaderOnceInterrupted) {
   sink.flush();
   EXPECT_FALSE(sink.hasFailed());
   EXPECT_FALSE(readSome(pipe.reading).empty());
+}
+
+TEST(DescriptorSink, GivesATerminalUpThatHasStoppedReading) {
+  const FileDescriptor user(posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC));
+  ASSERT_EQ(grantpt(user.get()), 0);
+  ASSERT_EQ(unlockpt(user.get()), 0);
+  const FileDescriptor blocking(open(ptsname(user.get()), O_WRONLY | O_NOCTTY | O_CLOEXEC));
+  std::vector<std::string> reasons;
+  DescriptorSink sink(blocking.get(), "terminal");
+  sink.setFailureHandler([&](const std::string& reason) { reasons.push_back(reason); });
+  sink.setDeadline(std::chrono::steady_clock::now() - std::chrono::hours(1), std::chrono::milliseconds(0));
+  const std::string line(1500, 'x');
+  for (int number = 0; number < 1000; ++number)
+    sink.write(line);
+  EXPECT_EQ(reasons, std::vector<std::string>{"terminal: nobody reads it"});
 }
 
 TEST(DescriptorSink, GivesABlockedReaderUpWhenTheTimeIsOver) {

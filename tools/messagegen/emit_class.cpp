@@ -68,6 +68,7 @@ $head$
   [[nodiscard]] bool readFrom(ProtoReader& reader) override;
   void writeTo(ProtoWriter& writer) const override;
   [[nodiscard]] Dictionary dictionaryRepresentation() const override;
+  void writeJson(JsonWriter& json) const override;
 
   /// Sets in `other` what is present here; objects are shared, not copied.
   void copyTo(Self& other) const;
@@ -80,6 +81,10 @@ $head$
   [[nodiscard]] std::uint64_t hash() const override;
 
  private:
+  /// Gives the fields that are present to `fields`, with their names.
+  template <class Fields>
+  void giveTo(Fields& fields) const;
+
   $bits$
   $members$
 };

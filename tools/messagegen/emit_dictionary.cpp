@@ -11,18 +11,15 @@ std::string presenceTest(const Field& field) {
   return field.isObject() ? "$member$" : "has($bit$)";
 }
 
-std::string dictionaryValue(const Field& field) {
-  if (field.isMessageList()) return "arrayOf($member$)";
-  if (field.isRepeatedScalar()) return "$member$.toArray()";
-  if (field.isMessage()) return "$member$->dictionaryRepresentation()";
+std::string shownValue(const Field& field) {
+  if (field.isRepeatedScalar() || field.isMessage() || field.isMessageList()) return "$member$";
   if (field.isObject()) return "*$member$";
   return field.type == FieldType::enumeration ? "nameOf($member$)" : "$member$";
 }
 
 std::string appendStatement(const Field& field) {
   const Variables variables = fieldVariables(field);
-  const std::string append =
-      expandLine("dictionary.append(\"$key$\"_text, " + dictionaryValue(field) + ");", variables);
+  const std::string append = expandLine("fields.append(\"$key$\"_text, " + shownValue(field) + ");", variables);
   if (field.isRepeatedScalar()) return append + "\n";
   return conditional(expandLine(presenceTest(field), variables), append);
 }
@@ -36,11 +33,21 @@ std::string emitDictionary(const MessageType& message) {
   const auto others = std::count_if(message.fields.begin(), message.fields.end(),
                                     [](const Field& field) { return !field.isOptionalScalar(); });
   return expand(R"code(
-Dictionary $class$::dictionaryRepresentation() const {
-  Dictionary dictionary;
-  dictionary.reserve(presentScalars()$others$);
+template <class Fields>
+void $class$::giveTo(Fields& fields) const {
   $statements$
-  return dictionary;
+}
+
+Dictionary $class$::dictionaryRepresentation() const {
+  DictionaryFields fields(presentScalars()$others$);
+  giveTo(fields);
+  return fields.take();
+}
+
+void $class$::writeJson(JsonWriter& json) const {
+  JsonFields fields(json);
+  giveTo(fields);
+  fields.end();
 }
 )code",
                 {{"class", message.name},

@@ -163,22 +163,24 @@ class Resolver {
     for (const MessageType& message : file_.messages)
       declared[message.name] = &message;
     std::vector<MessageType> ordered;
-    std::set<std::string> placed;
+    std::map<std::string, std::size_t> depths;
     std::set<std::string> open;
-    const std::function<void(const MessageType&)> place = [&](const MessageType& message) {
-      if (placed.contains(message.name)) return;
+    const std::function<std::size_t(const MessageType&)> place = [&](const MessageType& message) {
+      if (const auto placed = depths.find(message.name); placed != depths.end()) return placed->second;
+      std::size_t depth = 1;
       open.insert(message.name);
       for (const Field& field : message.fields) {
         if (!field.isMessage()) continue;
         if (open.contains(field.typeName)) fail(field.typePosition, "'" + field.typeName + "' contains itself");
         const auto used = declared.find(field.typeName);
         if (used == declared.end()) continue;
-        if (open.size() == kDeepestMessage) fail(field.typePosition, "messages nest more than 32 deep");
-        place(*used->second);
+        const bool isDeepest = open.size() == kDeepestMessage;
+        if (!isDeepest) depth = std::max(depth, 1 + place(*used->second));
+        if (isDeepest || depth > kDeepestMessage) fail(field.typePosition, "messages nest more than 32 deep");
       }
       open.erase(message.name);
-      placed.insert(message.name);
       ordered.push_back(message);
+      return depths[message.name] = depth;
     };
     for (const MessageType& message : file_.messages)
       place(message);

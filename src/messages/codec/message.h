@@ -177,16 +177,76 @@ template <class Element>
   return (list ? list : kNone)->at(index);
 }
 
-/// The dictionary forms of the elements, in their order.
-template <class Element>
-[[nodiscard]] Array arrayOf(const MessageList<Element>& list) {
-  Array array;
-  if (!list) return array;
-  array.reserve(list->size());
-  for (const auto& element : *list)
-    array.append(element->dictionaryRepresentation());
-  return array;
-}
+/// Takes the fields of a message as the entries of a dictionary.
+class DictionaryFields {
+ public:
+  /// For `count` fields at most.
+  explicit DictionaryFields(std::size_t count) { dictionary_.reserve(count); }
+
+  template <class Held>
+  void append(Text key, const Held& value) {
+    dictionary_.append(std::move(key), formOf(value));
+  }
+  [[nodiscard]] Dictionary take() { return std::move(dictionary_); }
+
+ private:
+  template <class Scalar>
+  static const Scalar& formOf(const Scalar& value) {
+    return value;
+  }
+  template <class Number>
+  static Array formOf(const RepeatedScalar<Number>& values) {
+    return values.toArray();
+  }
+  template <class Element>
+  static Dictionary formOf(const std::shared_ptr<Element>& object) {
+    return object->dictionaryRepresentation();
+  }
+  template <class Element>
+  static Array formOf(const MessageList<Element>& list) {
+    Array array;
+    array.reserve(list->size());
+    for (const auto& element : *list)
+      array.append(element->dictionaryRepresentation());
+    return array;
+  }
+
+  Dictionary dictionary_;
+};
+
+/// Writes the fields of a message as those of a JSON object.
+class JsonFields {
+ public:
+  explicit JsonFields(JsonWriter& json) : json_(json), object_(json) {}
+
+  template <class Held>
+  void append(const Text& key, const Held& value) {
+    object_.plainKey(key.view());
+    write(value);
+  }
+  void end() { object_.end(); }
+
+ private:
+  template <class Scalar>
+  void write(const Scalar& value) {
+    json_.write(value);
+  }
+  template <class Number>
+  void write(const RepeatedScalar<Number>& values) {
+    writeJsonArray(json_, std::span(values.values(), values.count()), [this](Number value) { json_.write(value); });
+  }
+  template <class Element>
+  void write(const std::shared_ptr<Element>& object) {
+    object->writeJson(json_);
+  }
+  template <class Element>
+  void write(const MessageList<Element>& list) {
+    writeJsonArray(json_, *list, [this](const auto& element) { element->writeJson(json_); });
+  }
+
+  JsonWriter& json_;
+  JsonObject object_;
+};
 
 template <class Element>
 void copyElements(const MessageList<Element>& from, MessageList<Element>& to) {

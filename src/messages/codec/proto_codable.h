@@ -6,6 +6,7 @@
 
 #include "messages/codec/proto_reader.h"
 #include "messages/codec/proto_writer.h"
+#include "platform/json_form.h"
 #include "platform/value.h"
 
 namespace vesk {
@@ -27,6 +28,8 @@ class ProtoCodable {
 
   /// The fields that are present under their names, in the order of their numbers; a repeated scalar always.
   [[nodiscard]] virtual Dictionary dictionaryRepresentation() const = 0;
+  /// The same as JSON, without the dictionary.
+  virtual void writeJson(JsonWriter& json) const = 0;
   /// The class and the dictionary form, for logs.
   [[nodiscard]] std::string description() const;
 

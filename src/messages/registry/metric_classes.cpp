@@ -13,7 +13,8 @@ using namespace metrics;
 
 template <class MetricMessage>
 constexpr MetricClass row() {
-  return {kMetricId<MetricMessage>, MetricMessage::kClassName, &decodePayload<MetricMessage>};
+  return {kMetricId<MetricMessage>, MetricMessage::kClassName, &decodePayload<MetricMessage>,
+          &appendPayloadJson<MetricMessage>};
 }
 
 /// In the order of their identifiers.

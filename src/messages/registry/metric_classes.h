@@ -3,9 +3,11 @@
 #include <cstdint>
 #include <optional>
 #include <span>
+#include <string>
 #include <string_view>
 
 #include "messages/codec/proto_reader.h"
+#include "platform/json_form.h"
 #include "platform/value.h"
 
 namespace vesk {
@@ -21,12 +23,28 @@ std::optional<Dictionary> decodePayload(std::span<const std::uint8_t> payload) {
   return message.dictionaryRepresentation();
 }
 
+/// Appends the JSON form of the message in `payload`. False, with nothing appended, when the payload is no encoding of
+/// one.
+using AppendPayloadJson = bool (*)(std::string& out, std::span<const std::uint8_t> payload);
+
+template <class MetricMessage>
+bool appendPayloadJson(std::string& out, std::span<const std::uint8_t> payload) {
+  MetricMessage message;
+  ProtoReader reader(payload);
+  if (!message.readFrom(reader)) return false;
+  JsonWriter json(out);
+  message.writeJson(json);
+  json.finish();
+  return true;
+}
+
 /// A kind of metric and the class that decodes it.
 struct MetricClass {
   /// As an event carries it: 0x3C in the high byte, the registry's identifier in the low 16 bits.
   std::int64_t metricId;
   std::string_view name;
   DecodePayload decode;
+  AppendPayloadJson appendJson;
 };
 
 /// The class of a metric, or null when no class decodes it.

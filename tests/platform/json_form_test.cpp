@@ -1,4 +1,4 @@
-#include "app/json_form.h"
+#include "platform/json_form.h"
 
 #include <cstdint>
 #include <gtest/gtest.h>
