@@ -39,13 +39,23 @@ void Part::writeTo(ProtoWriter& writer) const {
   if (has(kANameSoLongThatStatementsTakeTwo)) writer.writeUInt32(aNameSoLongThatStatementsTakeTwo_, 1);
 }
 
-Dictionary Part::dictionaryRepresentation() const {
-  Dictionary dictionary;
-  dictionary.reserve(presentScalars());
+template <class Fields>
+void Part::giveTo(Fields& fields) const {
   if (has(kANameSoLongThatStatementsTakeTwo)) {
-    dictionary.append("a_name_so_long_that_statements_take_two"_text, aNameSoLongThatStatementsTakeTwo_);
+    fields.append("a_name_so_long_that_statements_take_two"_text, aNameSoLongThatStatementsTakeTwo_);
   }
-  return dictionary;
+}
+
+Dictionary Part::dictionaryRepresentation() const {
+  DictionaryFields fields(presentScalars());
+  giveTo(fields);
+  return fields.take();
+}
+
+void Part::writeJson(JsonWriter& json) const {
+  JsonFields fields(json);
+  giveTo(fields);
+  fields.end();
 }
 
 void Part::copyTo(Self& other) const {
@@ -163,25 +173,35 @@ void Kinds::writeTo(ProtoWriter& writer) const {
   if (apn_) writer.writeString(*apn_, 65535);
 }
 
+template <class Fields>
+void Kinds::giveTo(Fields& fields) const {
+  if (has(kTimestamp)) fields.append("timestamp"_text, timestamp_);
+  if (has(kQRxlevMin)) fields.append("Q_rxlev_min"_text, qRxlevMin_);
+  if (has(kPlain)) fields.append("plain"_text, plain_);
+  if (has(kZigZag)) fields.append("zig_zag"_text, zigZag_);
+  if (has(kIsSet)) fields.append("is_set"_text, isSet_);
+  if (has(kNested)) fields.append("nested"_text, nameOf(nested_));
+  if (has(kMode)) fields.append("mode"_text, nameOf(mode_));
+  if (content_) fields.append("content"_text, *content_);
+  if (part_) fields.append("part"_text, part_);
+  if (countOf(partLists_) != 0) fields.append("part_list"_text, partLists_);
+  if (countOf(instValues_) != 0) fields.append("inst_values"_text, instValues_);
+  fields.append("multi_band_info"_text, multiBandInfos_);
+  fields.append("cs_tx_pwr"_text, csTxPwrs_);
+  fields.append("code"_text, codes_);
+  if (apn_) fields.append("apn"_text, *apn_);
+}
+
 Dictionary Kinds::dictionaryRepresentation() const {
-  Dictionary dictionary;
-  dictionary.reserve(presentScalars() + 8);
-  if (has(kTimestamp)) dictionary.append("timestamp"_text, timestamp_);
-  if (has(kQRxlevMin)) dictionary.append("Q_rxlev_min"_text, qRxlevMin_);
-  if (has(kPlain)) dictionary.append("plain"_text, plain_);
-  if (has(kZigZag)) dictionary.append("zig_zag"_text, zigZag_);
-  if (has(kIsSet)) dictionary.append("is_set"_text, isSet_);
-  if (has(kNested)) dictionary.append("nested"_text, nameOf(nested_));
-  if (has(kMode)) dictionary.append("mode"_text, nameOf(mode_));
-  if (content_) dictionary.append("content"_text, *content_);
-  if (part_) dictionary.append("part"_text, part_->dictionaryRepresentation());
-  if (countOf(partLists_) != 0) dictionary.append("part_list"_text, arrayOf(partLists_));
-  if (countOf(instValues_) != 0) dictionary.append("inst_values"_text, arrayOf(instValues_));
-  dictionary.append("multi_band_info"_text, multiBandInfos_.toArray());
-  dictionary.append("cs_tx_pwr"_text, csTxPwrs_.toArray());
-  dictionary.append("code"_text, codes_.toArray());
-  if (apn_) dictionary.append("apn"_text, *apn_);
-  return dictionary;
+  DictionaryFields fields(presentScalars() + 8);
+  giveTo(fields);
+  return fields.take();
+}
+
+void Kinds::writeJson(JsonWriter& json) const {
+  JsonFields fields(json);
+  giveTo(fields);
+  fields.end();
 }
 
 void Kinds::copyTo(Self& other) const {

@@ -34,6 +34,7 @@ class Part final : public Message<Part, std::uint8_t> {
   [[nodiscard]] bool readFrom(ProtoReader& reader) override;
   void writeTo(ProtoWriter& writer) const override;
   [[nodiscard]] Dictionary dictionaryRepresentation() const override;
+  void writeJson(JsonWriter& json) const override;
 
   /// Sets in `other` what is present here; objects are shared, not copied.
   void copyTo(Self& other) const;
@@ -46,6 +47,10 @@ class Part final : public Message<Part, std::uint8_t> {
   [[nodiscard]] std::uint64_t hash() const override;
 
  private:
+  /// Gives the fields that are present to `fields`, with their names.
+  template <class Fields>
+  void giveTo(Fields& fields) const;
+
   /// Which bit of the presence word is whose.
   enum PresenceBit : unsigned {
     kANameSoLongThatStatementsTakeTwo,
@@ -151,6 +156,7 @@ class Kinds final : public Message<Kinds, std::uint8_t> {
   [[nodiscard]] bool readFrom(ProtoReader& reader) override;
   void writeTo(ProtoWriter& writer) const override;
   [[nodiscard]] Dictionary dictionaryRepresentation() const override;
+  void writeJson(JsonWriter& json) const override;
 
   /// Sets in `other` what is present here; objects are shared, not copied.
   void copyTo(Self& other) const;
@@ -163,6 +169,10 @@ class Kinds final : public Message<Kinds, std::uint8_t> {
   [[nodiscard]] std::uint64_t hash() const override;
 
  private:
+  /// Gives the fields that are present to `fields`, with their names.
+  template <class Fields>
+  void giveTo(Fields& fields) const;
+
   /// Which bit of the presence word is whose.
   enum PresenceBit : unsigned {
     kTimestamp,
