@@ -58,9 +58,25 @@ bool Channel::waitUntilWanted(const std::stop_token& stop) {
   return backlog_.waitUntilFewerThan(most, stop) && vesk::MainQueue::shared().waitUntilFewerThan(most, stop);
 }
 
-void Channel::raise(const vesk::Text& event, vesk::InterProcessDictionary message) {
+void Channel::noteSize(const vesk::InterProcessDictionary& message) {
   if (isLarge(message)) isLargeAhead_ = true;
+}
+
+void Channel::raise(const vesk::Text& event, vesk::InterProcessDictionary message) {
+  noteSize(message);
   add(Event{event, std::move(message)});
+}
+
+void Channel::deliver(const vesk::Text& event, vesk::InterProcessDictionary message) {
+  noteSize(message);
+  queue_.sync([&] {
+    Event delivered{event, std::move(message)};
+    if (deliverWaiting()) {
+      deliver(delivered);
+    } else {
+      add(std::move(delivered));
+    }
+  });
 }
 
 void Channel::afterDelivery(vesk::Task task) {
@@ -73,17 +89,26 @@ void Channel::add(Delivery delivery) {
 
 void Channel::scheduleDeliveries() {
   queue_.async([weak = weak_from_this()] {
-    if (const std::shared_ptr<Channel> self = weak.lock()) self->deliver();
+    if (const std::shared_ptr<Channel> self = weak.lock()) self->deliverWaiting();
   });
 }
 
-void Channel::deliver() {
-  while (areEventsOn_ && hasBatch())
-    deliver(batch_[delivered_++], *handlers());
+bool Channel::deliverWaiting() {
+  while (areEventsOn_) {
+    if (!hasBatch()) return true;
+    Delivery& next = batch_[delivered_++];
+    if (auto* task = std::get_if<vesk::Task>(&next)) {
+      vesk::MainQueue::shared().async(std::move(*task));
+    } else {
+      deliver(std::get<Event>(next));
+    }
+  }
+  return false;
 }
 
 bool Channel::hasBatch() {
   if (delivered_ < batch_.size()) return true;
+  if (backlog_.isEmpty()) return false;
   batch_.clear();
   delivered_ = 0;
   backlog_.take(batch_);
@@ -95,13 +120,9 @@ std::shared_ptr<const Channel::Handlers> Channel::handlers() {
   return handlers_;
 }
 
-void Channel::deliver(Delivery& delivery, const Handlers& handlers) {
-  if (auto* task = std::get_if<vesk::Task>(&delivery)) {
-    vesk::MainQueue::shared().async(std::move(*task));
-    return;
-  }
-  const auto& event = std::get<Event>(delivery);
-  const EventHandler& handler = event.name == kEventMetric ? handlers.metric : handlers.trigger;
+void Channel::deliver(const Event& event) {
+  const std::shared_ptr<const Handlers> handlers = this->handlers();
+  const EventHandler& handler = event.name == kEventMetric ? handlers->metric : handlers->trigger;
   if (handler) handler(event.message, WorkGroup{});
 }
 

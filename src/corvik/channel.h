@@ -18,7 +18,7 @@
 namespace corvik::client {
 
 /// The way of a service's events to one client: takes them in on any thread and hands them to the handlers on
-/// the client's queue, many to a task.
+/// the client's queue, or in its turn.
 class Channel final : public EventStream, public std::enable_shared_from_this<Channel> {
  public:
   explicit Channel(vesk::WorkQueue& queue) : queue_(queue) {}
@@ -28,6 +28,7 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
   void setHandler(const vesk::Text& event, EventHandler handler);
 
   void raise(const vesk::Text& event, vesk::InterProcessDictionary message) override;
+  void deliver(const vesk::Text& event, vesk::InterProcessDictionary message) override;
   void afterDelivery(vesk::Task task) override;
   [[nodiscard]] bool waitUntilWanted(const std::stop_token& stop) override;
 
@@ -47,9 +48,11 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
   [[nodiscard]] bool isWanted() const { return isConfigured_ && areEventsOn_; }
   [[nodiscard]] std::shared_ptr<const Handlers> handlers();
 
-  /// These run on the client's queue.
-  void deliver();
-  static void deliver(Delivery& delivery, const Handlers& handlers);
+  void noteSize(const vesk::InterProcessDictionary& message);
+
+  /// These run on the client's queue. False when events are off, and some may be left.
+  bool deliverWaiting();
+  void deliver(const Event& event);
   /// Whether there is something to deliver; takes the next batch once one is done.
   [[nodiscard]] bool hasBatch();
 

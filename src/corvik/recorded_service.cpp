@@ -109,7 +109,7 @@ void RecordedService::playEvent(const RecordedEvent& event, EventStream& events)
     if (state_.duration) state_.duration = std::max(*state_.duration, event.at);
     ++state_.events;
   }
-  events.raise(kEventMetric, makeMetricEvent(event.metricId, event.payload));
+  events.deliver(kEventMetric, makeMetricEvent(event.metricId, event.payload));
 }
 
 void RecordedService::tellBadLine(std::string message, EventStream& events) {

@@ -42,6 +42,9 @@ class EventStream {
  public:
   /// Hands an event on; never blocks. `event` is kEventMetric or kEventTrigger.
   virtual void raise(const vesk::Text& event, vesk::InterProcessDictionary message) = 0;
+  /// The same for a source on a thread of its own, which waits until the event has been handled, and spares it a change
+  /// of threads.
+  virtual void deliver(const vesk::Text& event, vesk::InterProcessDictionary message) = 0;
   /// Runs `task` on the main queue, behind the delivery of all events raised before.
   virtual void afterDelivery(vesk::Task task) = 0;
   /// To be called by a source, on a thread of its own, before each metric: blocks until the client wants

@@ -12,14 +12,15 @@ using ::corvik::EventStream;
 
 namespace {
 
-void raise(const HandsetEvent& event, EventStream& events) {
-  if (event.kind == HandsetEvent::Kind::metric) {
-    events.raise(::corvik::kEventMetric, ::corvik::makeMetricEvent(event.id, event.payload.bytes()));
-    return;
-  }
+const Text& nameOf(const HandsetEvent& event) {
+  return event.kind == HandsetEvent::Kind::metric ? ::corvik::kEventMetric : ::corvik::kEventTrigger;
+}
+
+InterProcessDictionary messageOf(const HandsetEvent& event) {
+  if (event.kind == HandsetEvent::Kind::metric) return ::corvik::makeMetricEvent(event.id, event.payload.bytes());
   InterProcessDictionary message;
   message.setInteger(::corvik::kKeyTriggerID, event.id);
-  events.raise(::corvik::kEventTrigger, std::move(message));
+  return message;
 }
 
 }  // namespace
@@ -44,7 +45,8 @@ void HandsetService::endThread() {
     return {::corvik::kStatusInvalidArgument, "no metric answers trigger " + std::to_string(query.triggerId)};
   }
   const std::lock_guard lock(mutex_);
-  raise(handset_.simFiles(), events);
+  const HandsetEvent files = handset_.simFiles();
+  events.raise(nameOf(files), messageOf(files));
   return {};
 }
 
@@ -54,7 +56,7 @@ void HandsetService::play(const std::stop_token& stop, EventStream& events) {
     waitUntil(event_->atMs);
     // It may have become unwanted in the meantime.
     if (!events.waitUntilWanted(stop)) return;
-    raise(*event_, events);
+    events.deliver(nameOf(*event_), messageOf(*event_));
     event_.reset();
   }
 }

@@ -93,38 +93,31 @@ void CorvikWrapper::forward(const Text& event, const char* label, Deliver delive
   client::RegisterEventHandler(
       corvikManager_, event,
       [weak = weak_from_this(), label, deliver](const InterProcessDictionary& raised, const client::WorkGroup&) {
-        if (const auto self = weak.lock()) self->forward(raised, label, deliver);
+        if (auto self = weak.lock()) forward(std::move(self), raised, label, deliver);
       });
 }
 
-void CorvikWrapper::forward(const InterProcessDictionary& event, const char* label, Deliver deliver) {
+void CorvikWrapper::forward(std::shared_ptr<CorvikWrapper> self, const InterProcessDictionary& event, const char* label,
+                            Deliver deliver) {
   std::optional<Dictionary> dictionary = event.ordinary();
   if (!dictionary) {
     SystemLog::write("%s: %s dropped: it has no ordinary form", kListenHandler, label);
-    return;
-  }
-  if (SystemLog::isOpen()) {
+  } else if (SystemLog::isOpen()) {
     SystemLog::write("%s: %s dict=%s", kListenHandler, label, textOf(*dictionary).c_str());
   }
-  if (!hasDelegate()) return;
-  MainQueue::shared().async([self = shared_from_this(), dictionary = std::move(dictionary), deliver] {
+  if (!dictionary || !self->isDelegateSet_) {
+    // Whoever is the last to let go of the wrapper waits for the source of the events, which may be running this.
+    MainQueue::shared().async([self = std::move(self)] {});
+    return;
+  }
+  MainQueue::shared().async([self = std::move(self), dictionary = std::move(dictionary), deliver] {
     if (const auto delegate = self->delegate()) ((*delegate).*deliver)(dictionary);
   });
 }
 
-bool CorvikWrapper::hasDelegate() const {
-  const std::lock_guard lock(delegateMutex_);
-  return !delegate_.expired();
-}
-
-std::shared_ptr<CorvikWrapperDelegate> CorvikWrapper::delegate() const {
-  const std::lock_guard lock(delegateMutex_);
-  return delegate_.lock();
-}
-
 void CorvikWrapper::setDelegate(std::weak_ptr<CorvikWrapperDelegate> delegate) {
-  const std::lock_guard lock(delegateMutex_);
   delegate_ = std::move(delegate);
+  isDelegateSet_ = !delegate_.expired();
 }
 
 }  // namespace vesk

@@ -1,8 +1,8 @@
 #pragma once
 
+#include <atomic>
 #include <cstdint>
 #include <memory>
-#include <mutex>
 #include <string>
 #include <string_view>
 
@@ -40,7 +40,7 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
   void listen();
 
   /// Null when there is none, or none any more.
-  [[nodiscard]] std::shared_ptr<CorvikWrapperDelegate> delegate() const;
+  [[nodiscard]] std::shared_ptr<CorvikWrapperDelegate> delegate() const { return delegate_.lock(); }
   /// Held weakly. Without a delegate events are dropped.
   void setDelegate(std::weak_ptr<CorvikWrapperDelegate> delegate);
 
@@ -50,13 +50,13 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
   bool perform(const char* operation, const Text& command, const InterProcessDictionary& message);
   /// Has the events called `event` forwarded by `deliver`; `label` is what the log calls them.
   void forward(const Text& event, const char* label, Deliver deliver);
-  void forward(const InterProcessDictionary& event, const char* label, Deliver deliver);
-  [[nodiscard]] bool hasDelegate() const;
+  static void forward(std::shared_ptr<CorvikWrapper> self, const InterProcessDictionary& event, const char* label,
+                      Deliver deliver);
 
   std::shared_ptr<corvik::client::Manager> corvikManager_;
-  /// The handlers look for the delegate from the library's queue.
-  mutable std::mutex delegateMutex_;
   std::weak_ptr<CorvikWrapperDelegate> delegate_;
+  /// What the handlers ask, on the library's queue; the delegate may have gone since.
+  std::atomic<bool> isDelegateSet_ = false;
 };
 
 }  // namespace vesk

@@ -19,7 +19,7 @@ class Backlog {
   [[nodiscard]] bool add(Item item) {
     const std::lock_guard lock(mutex_);
     items_.push_back(std::move(item));
-    count_ = items_.size();
+    count_.store(items_.size(), std::memory_order_release);
     return items_.size() == 1;
   }
 
@@ -27,7 +27,7 @@ class Backlog {
   void take(std::vector<Item>& taken) {
     const std::lock_guard lock(mutex_);
     taken.swap(items_);
-    count_ = 0;
+    count_.store(0, std::memory_order_release);
     if (waitingSources_ > 0) taken_.notify_all();
   }
 

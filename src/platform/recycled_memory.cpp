@@ -1,43 +1,95 @@
 #include "platform/recycled_memory.h"
 
-#include <utility>
+#include <algorithm>
+#include <mutex>
+#include <span>
 
 namespace vesk {
 
 namespace {
 
-enum class Lists : std::uint8_t { notYetOpen, open, closed };
+/// Blocks of one kind that no thread has.
+class Depot {
+ public:
+  /// Fills `lot`; false, and nothing done, when there are too few.
+  bool take(std::span<void*> lot) {
+    const std::lock_guard lock(mutex_);
+    if (count_ < lot.size()) return false;
+    count_ -= lot.size();
+    std::copy_n(&blocks_[count_], lot.size(), lot.begin());
+    return true;
+  }
 
-/// Whether the lists of this thread take blocks: they are opened by its first release and closed at its end, after
-/// which blocks may still be released.
-constinit thread_local Lists lists = Lists::notYetOpen;
+  /// Keeps `lot`; false, and nothing done, when there would be more than `most`.
+  bool put(std::span<void* const> lot, std::size_t most) {
+    const std::lock_guard lock(mutex_);
+    if (count_ + lot.size() > std::min(most, blocks_.size())) return false;
+    std::copy(lot.begin(), lot.end(), &blocks_[count_]);
+    count_ += lot.size();
+    return true;
+  }
+
+ private:
+  std::mutex mutex_;
+  std::size_t count_ = 0;
+  std::array<void*, 1024> blocks_{};
+};
+
+/// Of one kind, in one depot.
+constexpr std::size_t kMostBytes = 1 << 16;
+
+enum class Keeping : std::uint8_t { notYet, now, noMore };
+constinit thread_local Keeping keeping = Keeping::notYet;
 
 }  // namespace
 
 struct RecycledMemory::Keeper {
   Keeper() {
-    lists = Lists::open;
-    for (FreeList& list : lists_)
-      list.room = kMostKept;
+    keeping = Keeping::now;
+    for (Stock& stock : stocks_)
+      stock.room = static_cast<std::uint32_t>(stock.blocks.size());
   }
   ~Keeper() {
-    lists = Lists::closed;
-    for (FreeList& list : lists_) {
-      list.room = 0;
-      for (Block* block = std::exchange(list.first, nullptr); block != nullptr;) {
-        ::operator delete(std::exchange(block, block->next));
-      }
+    keeping = Keeping::noMore;
+    for (Stock& stock : stocks_) {
+      stock.room = 0;
+      while (stock.count > 0)
+        ::operator delete(stock.blocks[--stock.count]);
     }
   }
   Keeper(const Keeper&) = delete;
   Keeper& operator=(const Keeper&) = delete;
+
+  static constinit std::array<Depot, kKinds> depots;
 };
 
-void RecycledMemory::releaseToHeap(void* memory) noexcept {
-  if (!kIsSanitized && lists == Lists::notYetOpen) {
+constinit std::array<Depot, RecycledMemory::kKinds> RecycledMemory::Keeper::depots{};
+
+bool RecycledMemory::isOpen() {
+  if (keeping == Keeping::notYet) {
     static thread_local const Keeper keeper;
   }
-  ::operator delete(memory);
+  return keeping == Keeping::now;
+}
+
+void* RecycledMemory::allocateFromOutside(std::size_t kind) {
+  Stock& stock = stocks_[kind];
+  if (isOpen() && Keeper::depots[kind].take(std::span(stock.blocks).first(kLot))) {
+    stock.count = kLot - 1;
+    return stock.blocks[stock.count];
+  }
+  return ::operator new((kind + 1) * kStep);
+}
+
+void RecycledMemory::releaseToOutside(void* memory, std::size_t kind) noexcept {
+  Stock& stock = stocks_[kind];
+  const std::size_t most = kMostBytes / ((kind + 1) * kStep);
+  if (isOpen() && stock.count == stock.room && Keeper::depots[kind].put(std::span(stock.blocks).first(kLot), most)) {
+    std::copy(stock.blocks.begin() + kLot, stock.blocks.end(), stock.blocks.begin());
+    stock.count -= kLot;
+  }
+  if (stock.count == stock.room) return ::operator delete(memory);
+  stock.blocks[stock.count++] = memory;
 }
 
 }  // namespace vesk

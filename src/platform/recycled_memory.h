@@ -16,60 +16,51 @@ inline constexpr bool kIsSanitized = false;
 #endif
 
 /// Memory for the many small objects that an event is made of and that live no longer than it does: what a thread gives
-/// back is kept, within bounds, for its next request of about that size. A block may be released by another thread than
-/// the one that allocated it. Under a sanitizer of memory or threads every block comes from the heap, in the size that
-/// was asked for, so that its checks see them all.
+/// back is kept, within bounds, for its next request of about that size. An event is made by one thread and ends on
+/// another, so what one has too much of goes to those that have none, many blocks at a time. Under a sanitizer of
+/// memory or threads every block comes from the heap, in the size that was asked for, so that its checks see them all.
 class RecycledMemory {
  public:
   /// `size` bytes, aligned for every ordinary type; throws std::bad_alloc.
   [[nodiscard]] static void* allocate(std::size_t size) {
-    if constexpr (kIsSanitized) return ::operator new(size);
-    const std::size_t index = listIndex(size);
-    if (index < kLists) [[likely]] {
-      FreeList& list = lists_[index];
-      if (Block* block = list.first; block != nullptr) [[likely]] {
-        list.first = block->next;
-        ++list.room;
-        return block;
-      }
-      size = (index + 1) * kStep;
-    }
-    return ::operator new(size);
+    const std::size_t kind = kindOf(size);
+    if (kIsSanitized || kind >= kKinds) return ::operator new(size);
+    Stock& stock = stocks_[kind];
+    return stock.count > 0 ? stock.blocks[--stock.count] : allocateFromOutside(kind);
   }
 
   /// Gives back what allocate() gave for the same size.
   static void release(void* memory, std::size_t size) noexcept {
-    const std::size_t index = listIndex(size);
-    if (index < kLists && lists_[index].room > 0) [[likely]] {
-      keep(memory, lists_[index]);
-    } else {
-      releaseToHeap(memory);
-    }
+    const std::size_t kind = kindOf(size);
+    if (kIsSanitized || kind >= kKinds) return ::operator delete(memory);
+    Stock& stock = stocks_[kind];
+    if (stock.count == stock.room) return releaseToOutside(memory, kind);
+    stock.blocks[stock.count++] = memory;
   }
 
  private:
-  struct Block {
-    Block* next;
-  };
-  struct FreeList {
-    Block* first;
-    /// How many more blocks it takes; none before its thread's first release and after the thread's end.
+  /// Blocks of one kind that are a multiple of this in size.
+  static constexpr std::size_t kStep = 32;
+  static constexpr std::size_t kKinds = 32;
+  /// How many blocks go from one thread to another.
+  static constexpr std::uint32_t kLot = 32;
+
+  /// The blocks of one kind that a thread has.
+  struct Stock {
+    std::uint32_t count;
+    /// None before the thread's first use and after its end.
     std::uint32_t room;
+    std::array<void*, std::size_t{2} * kLot> blocks;
   };
   struct Keeper;
 
-  static constexpr std::size_t kStep = 32;
-  static constexpr std::size_t kLists = 32;
-  static constexpr std::uint32_t kMostKept = 64;
+  static std::size_t kindOf(std::size_t size) { return (size - 1) / kStep; }
+  static void* allocateFromOutside(std::size_t kind);
+  static void releaseToOutside(void* memory, std::size_t kind) noexcept;
+  /// Whether this thread keeps blocks.
+  static bool isOpen();
 
-  static std::size_t listIndex(std::size_t size) { return (size - 1) / kStep; }
-  static void keep(void* memory, FreeList& list) noexcept {
-    list.first = new (memory) Block{list.first};
-    --list.room;
-  }
-  static void releaseToHeap(void* memory) noexcept;
-
-  static inline constinit thread_local std::array<FreeList, kLists> lists_{};
+  static inline constinit thread_local std::array<Stock, kKinds> stocks_{};
 };
 
 /// RecycledMemory for the standard containers and std::allocate_shared.

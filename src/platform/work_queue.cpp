@@ -23,21 +23,28 @@ void WorkQueue::async(Task task) {
 }
 
 void WorkQueue::serve() {
-  std::vector<Task> batch;
   for (;;) {
     {
       std::unique_lock lock(mutex_);
       changed_.wait(lock, [this] { return isEnding_ || !pending_.empty(); });
       if (pending_.empty()) return;
-      batch.swap(pending_);
     }
-    for (Task& task : batch) {
-      task();
-      // What the task holds goes before the next one runs.
-      task = Task();
-    }
-    batch.clear();
+    const std::lock_guard turn(turn_);
+    runPending();
   }
+}
+
+void WorkQueue::runPending() {
+  {
+    const std::lock_guard lock(mutex_);
+    batch_.swap(pending_);
+  }
+  for (Task& task : batch_) {
+    task();
+    // What the task holds goes before the next one runs.
+    task = Task();
+  }
+  batch_.clear();
 }
 
 }  // namespace vesk

@@ -10,7 +10,8 @@
 
 namespace vesk {
 
-/// A serial queue: runs its tasks one after another, in the order they came, on a thread of its own.
+/// A serial queue: runs its tasks one after another, in the order they came, on a thread of its own or on one that
+/// waits for them.
 class WorkQueue {
  public:
   explicit WorkQueue(std::string label);
@@ -21,13 +22,26 @@ class WorkQueue {
 
   /// Schedules `task`; from any thread, its own tasks included.
   void async(Task task);
+  /// Runs `work` on the calling thread when its turn has come: behind the tasks that are there, beside none. Not from a
+  /// task of the queue.
+  template <class Work>
+  void sync(Work work) {
+    const std::lock_guard turn(turn_);
+    runPending();
+    work();
+  }
   /// A name for people, in reverse-domain form.
   [[nodiscard]] const std::string& label() const { return label_; }
 
  private:
   void serve();
+  void runPending();
 
   std::string label_;
+  /// Held by the thread that runs tasks.
+  std::mutex turn_;
+  /// The tasks under way, kept for its storage.
+  std::vector<Task> batch_;
   std::mutex mutex_;
   std::condition_variable changed_;
   std::vector<Task> pending_;
