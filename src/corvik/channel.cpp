@@ -17,21 +17,19 @@ constexpr std::size_t kMostWaitingBehindLarge = 8;
 constexpr std::size_t kLarge = 512;
 
 bool isLarge(const vesk::InterProcessDictionary& message) {
-  const vesk::Data* payload = message.data(kKeyPayload.view());
+  const vesk::Data* payload = message.data(kKeyPayload);
   return payload != nullptr && payload->bytes().size() > kLarge;
 }
 
 }  // namespace
 
 void Channel::setHandler(const vesk::Text& event, EventHandler handler) {
-  const std::lock_guard lock(mutex_);
-  Handlers handlers = *handlers_;
-  if (event == kEventMetric) {
-    handlers.metric = std::move(handler);
-  } else if (event == kEventTrigger) {
-    handlers.trigger = std::move(handler);
-  }
-  handlers_ = std::make_shared<const Handlers>(std::move(handlers));
+  if (event != kEventMetric && event != kEventTrigger) return;
+  queue_.async([weak = weak_from_this(), isMetric = event == kEventMetric, handler = std::move(handler)]() mutable {
+    if (const std::shared_ptr<Channel> self = weak.lock()) {
+      (isMetric ? self->metricHandler_ : self->triggerHandler_) = std::move(handler);
+    }
+  });
 }
 
 void Channel::setConfigured(bool isConfigured) {
@@ -70,11 +68,10 @@ void Channel::raise(const vesk::Text& event, vesk::InterProcessDictionary messag
 void Channel::deliver(const vesk::Text& event, vesk::InterProcessDictionary message) {
   noteSize(message);
   queue_.sync([&] {
-    Event delivered{event, std::move(message)};
     if (deliverWaiting()) {
-      deliver(delivered);
+      handle(event, message);
     } else {
-      add(std::move(delivered));
+      add(Event{event, std::move(message)});
     }
   });
 }
@@ -100,7 +97,8 @@ bool Channel::deliverWaiting() {
     if (auto* task = std::get_if<vesk::Task>(&next)) {
       vesk::MainQueue::shared().async(std::move(*task));
     } else {
-      deliver(std::get<Event>(next));
+      const auto& event = std::get<Event>(next);
+      handle(event.name, event.message);
     }
   }
   return false;
@@ -115,15 +113,9 @@ bool Channel::hasBatch() {
   return !batch_.empty();
 }
 
-std::shared_ptr<const Channel::Handlers> Channel::handlers() {
-  const std::lock_guard lock(mutex_);
-  return handlers_;
-}
-
-void Channel::deliver(const Event& event) {
-  const std::shared_ptr<const Handlers> handlers = this->handlers();
-  const EventHandler& handler = event.name == kEventMetric ? handlers->metric : handlers->trigger;
-  if (handler) handler(event.message, WorkGroup{});
+void Channel::handle(const vesk::Text& event, const vesk::InterProcessDictionary& message) const {
+  const EventHandler& handler = event == kEventMetric ? metricHandler_ : triggerHandler_;
+  if (handler) handler(message, WorkGroup{});
 }
 
 }  // namespace corvik::client

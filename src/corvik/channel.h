@@ -38,21 +38,16 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
     vesk::InterProcessDictionary message;
   };
   using Delivery = std::variant<Event, vesk::Task>;
-  struct Handlers {
-    EventHandler metric;
-    EventHandler trigger;
-  };
 
   void add(Delivery delivery);
   void scheduleDeliveries();
   [[nodiscard]] bool isWanted() const { return isConfigured_ && areEventsOn_; }
-  [[nodiscard]] std::shared_ptr<const Handlers> handlers();
 
   void noteSize(const vesk::InterProcessDictionary& message);
 
-  /// These run on the client's queue. False when events are off, and some may be left.
+  /// These run on the client's queue, or in its turn. False when events are off, and some may be left.
   bool deliverWaiting();
-  void deliver(const Event& event);
+  void handle(const vesk::Text& event, const vesk::InterProcessDictionary& message) const;
   /// Whether there is something to deliver; takes the next batch once one is done.
   [[nodiscard]] bool hasBatch();
 
@@ -62,11 +57,14 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
   std::atomic<bool> areEventsOn_ = false;
   std::mutex mutex_;
   std::condition_variable_any wanted_;
-  std::shared_ptr<const Handlers> handlers_ = std::make_shared<const Handlers>();
 
   /// Whether a large event was raised since a source last waited until few were ahead.
   std::atomic<bool> isLargeAhead_ = false;
   vesk::Backlog<Delivery> backlog_;
+
+  /// These belong to the client's queue.
+  EventHandler metricHandler_;
+  EventHandler triggerHandler_;
   /// What was taken from the backlog, and how much of it is done: left alone while events are off.
   std::vector<Delivery> batch_;
   std::size_t delivered_ = 0;

@@ -12,7 +12,7 @@ std::shared_ptr<Service>& theService() {
 }
 
 Result checkConfiguration(const vesk::InterProcessDictionary& message) {
-  const vesk::Data* payload = message.data(kKeyPayload.view());
+  const vesk::Data* payload = message.data(kKeyPayload);
   if (payload == nullptr) return {kStatusInvalidArgument, "configuration without a payload"};
   if (payload->bytes().empty()) return {kStatusInvalidArgument, "empty configuration"};
   return {};
@@ -59,7 +59,7 @@ Result Service::query(const vesk::InterProcessDictionary& message) {
       {&kKeyProfileID, &asked.profileId},   {&kKeyMetricID, &asked.metricId},
   };
   for (const auto& [key, argument] : arguments) {
-    const std::optional<std::int64_t> value = message.integer(key->view());
+    const std::optional<std::int64_t> value = message.integer(*key);
     if (!value) return {kStatusInvalidArgument, "query without " + std::string(key->view())};
     *argument = *value;
   }

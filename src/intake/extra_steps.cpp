@@ -109,13 +109,29 @@ void replaceMultiBandInfo(Record& record) {
     OutputLines::print({text->view()});
 }
 
+/// The entry under `key`, looked for from `from` on, and then before it; the end when there is none.
+const Dictionary::Entry* findFrom(const Record& record, const Dictionary::Entry* from, const Text& key) {
+  const auto isMeant = [&](const Dictionary::Entry& entry) { return entry.key == key; };
+  const auto* found = std::find_if(from, record.end(), isMeant);
+  if (found != record.end()) return found;
+  found = std::find_if(record.begin(), from, isMeant);
+  return found == from ? record.end() : found;
+}
+
 /// Refreshes every key of the store's record; what the source does not have becomes the empty text.
 void fillTemplate(Record& store, const Record& source) {
   Record filled;
   filled.reserve(store.size());
+  // Both have their keys in much the same order.
+  const auto* next = source.begin();
   for (const auto& [key, value] : store) {
-    const Value* found = source.find(key);
-    filled.append(key, found == nullptr ? Value(""_text) : *found);
+    const auto* found = findFrom(source, next, key);
+    if (found == source.end()) {
+      filled.append(key, ""_text);
+    } else {
+      filled.append(key, found->value);
+      next = found + 1;
+    }
   }
   store = std::move(filled);
 }

@@ -52,7 +52,8 @@ std::shared_ptr<MetricValidator> MetricValidator::listeningTo(std::shared_ptr<Co
 }
 
 void MetricValidator::metricsDidUpdate(const std::optional<Dictionary>& event) {
-  if (!validateMetric(event ? *event : Dictionary())) return;
+  static const Dictionary kNothing;
+  if (!validateMetric(event ? *event : kNothing)) return;
   OutputLines::print({"Received Valid Metric"});
   if (arrivalObserver_) arrivalObserver_(*metricID);
 }
@@ -64,7 +65,7 @@ void MetricValidator::eventsDidUpdate(const std::optional<Dictionary>& /*event*/
 bool MetricValidator::validateMetric(const Dictionary& event) {
   const Value* id = event.find(metricIDKey);
   metricID = id == nullptr ? std::nullopt : id->integer();
-  if (metricID) OutputLines::print({"Metric ID in Hex = ", hexadecimal(*metricID)});
+  if (metricID && OutputLines::isOpen()) OutputLines::print({"Metric ID in Hex = ", hexadecimal(*metricID)});
 
   const HandledMetric* metric = metricID ? findHandledMetric(*metricID) : nullptr;
   LatestRecord fields;

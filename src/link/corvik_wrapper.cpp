@@ -30,8 +30,16 @@ constexpr const char* kListenHandler = "-[CorvikWrapper listen]_block_invoke";
 }  // namespace
 
 std::shared_ptr<CorvikWrapper> CorvikWrapper::sharedInstance() {
-  static const auto theWrapper = std::make_shared<CorvikWrapper>();
+  static const std::shared_ptr<CorvikWrapper> theWrapper = make();
   return theWrapper;
+}
+
+std::shared_ptr<CorvikWrapper> CorvikWrapper::make() {
+  // The queue is needed to the wrapper's end, and so has to be there before it.
+  MainQueue& mainQueue = MainQueue::shared();
+  return {new CorvikWrapper, [&mainQueue](CorvikWrapper* wrapper) {
+            mainQueue.async([ended = std::unique_ptr<CorvikWrapper>(wrapper)] {});
+          }};
 }
 
 WorkQueue& CorvikWrapper::queue() {
@@ -93,25 +101,23 @@ void CorvikWrapper::forward(const Text& event, const char* label, Deliver delive
   client::RegisterEventHandler(
       corvikManager_, event,
       [weak = weak_from_this(), label, deliver](const InterProcessDictionary& raised, const client::WorkGroup&) {
-        if (auto self = weak.lock()) forward(std::move(self), raised, label, deliver);
+        if (const auto self = weak.lock()) self->forward(raised, label, deliver);
       });
 }
 
-void CorvikWrapper::forward(std::shared_ptr<CorvikWrapper> self, const InterProcessDictionary& event, const char* label,
-                            Deliver deliver) {
+void CorvikWrapper::forward(const InterProcessDictionary& event, const char* label, Deliver deliver) {
   std::optional<Dictionary> dictionary = event.ordinary();
   if (!dictionary) {
     SystemLog::write("%s: %s dropped: it has no ordinary form", kListenHandler, label);
-  } else if (SystemLog::isOpen()) {
-    SystemLog::write("%s: %s dict=%s", kListenHandler, label, textOf(*dictionary).c_str());
-  }
-  if (!dictionary || !self->isDelegateSet_) {
-    // Whoever is the last to let go of the wrapper waits for the source of the events, which may be running this.
-    MainQueue::shared().async([self = std::move(self)] {});
     return;
   }
-  MainQueue::shared().async([self = std::move(self), dictionary = std::move(dictionary), deliver] {
-    if (const auto delegate = self->delegate()) ((*delegate).*deliver)(dictionary);
+  if (SystemLog::isOpen()) {
+    SystemLog::write("%s: %s dict=%s", kListenHandler, label, textOf(*dictionary).c_str());
+  }
+  if (!isDelegateSet_) return;
+  // The wrapper is there until what it has scheduled is done.
+  MainQueue::shared().async([this, dictionary = std::move(dictionary), deliver] {
+    if (const auto delegate = this->delegate()) ((*delegate).*deliver)(dictionary);
   });
 }
 

@@ -13,7 +13,7 @@
 namespace vesk {
 
 /// The program's only connection to the baseband manager service: sends commands, and forwards each event to
-/// its delegate on the main queue. Operations are for the main queue; an object is held by a shared pointer.
+/// its delegate on the main queue. Operations are for the main queue.
 ///
 /// Commands are sent only for the application identifier "vesk", and are false at once for any other. The
 /// outcome of one that was sent goes to the system log; true means that the service accepted it.
@@ -24,7 +24,9 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
   /// The serial queue that the client library delivers events on, one for the process.
   static WorkQueue& queue();
 
-  CorvikWrapper();
+  /// One that connects to the service installed now. Once nobody holds it, it ends on the main queue, behind the events
+  /// that it has scheduled there.
+  static std::shared_ptr<CorvikWrapper> make();
   CorvikWrapper(const CorvikWrapper&) = delete;
   CorvikWrapper& operator=(const CorvikWrapper&) = delete;
 
@@ -47,11 +49,12 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
  private:
   using Deliver = void (CorvikWrapperDelegate::*)(const std::optional<Dictionary>& event);
 
+  CorvikWrapper();
+
   bool perform(const char* operation, const Text& command, const InterProcessDictionary& message);
   /// Has the events called `event` forwarded by `deliver`; `label` is what the log calls them.
   void forward(const Text& event, const char* label, Deliver deliver);
-  static void forward(std::shared_ptr<CorvikWrapper> self, const InterProcessDictionary& event, const char* label,
-                      Deliver deliver);
+  void forward(const InterProcessDictionary& event, const char* label, Deliver deliver);
 
   std::shared_ptr<corvik::client::Manager> corvikManager_;
   std::weak_ptr<CorvikWrapperDelegate> delegate_;

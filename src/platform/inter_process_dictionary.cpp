@@ -15,17 +15,17 @@ void InterProcessDictionary::setDescriptor(Text key, FileDescriptor descriptor) 
   descriptors_.push_back({std::move(key), std::make_shared<const FileDescriptor>(std::move(descriptor))});
 }
 
-std::optional<std::int64_t> InterProcessDictionary::integer(std::string_view key) const {
+std::optional<std::int64_t> InterProcessDictionary::integer(const Text& key) const {
   const Value* value = values_.find(key);
   return value == nullptr ? std::nullopt : value->integer();
 }
 
-const Data* InterProcessDictionary::data(std::string_view key) const {
+const Data* InterProcessDictionary::data(const Text& key) const {
   const Value* value = values_.find(key);
   return value == nullptr ? nullptr : value->data();
 }
 
-const FileDescriptor* InterProcessDictionary::descriptor(std::string_view key) const {
+const FileDescriptor* InterProcessDictionary::descriptor(const Text& key) const {
   const auto found =
       std::find_if(descriptors_.begin(), descriptors_.end(), [&](const Descriptor& each) { return each.key == key; });
   return found == descriptors_.end() ? nullptr : found->descriptor.get();

@@ -26,9 +26,9 @@ class InterProcessDictionary {
   [[nodiscard]] std::size_t size() const { return values_.size() + descriptors_.size(); }
   [[nodiscard]] bool empty() const { return size() == 0; }
   /// Absent also when another kind of value lies under `key`.
-  [[nodiscard]] std::optional<std::int64_t> integer(std::string_view key) const;
-  [[nodiscard]] const Data* data(std::string_view key) const;
-  [[nodiscard]] const FileDescriptor* descriptor(std::string_view key) const;
+  [[nodiscard]] std::optional<std::int64_t> integer(const Text& key) const;
+  [[nodiscard]] const Data* data(const Text& key) const;
+  [[nodiscard]] const FileDescriptor* descriptor(const Text& key) const;
 
   /// The same entries, in the order they came, as an ordinary dictionary; absent when a value has no ordinary
   /// form.

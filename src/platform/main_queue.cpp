@@ -20,13 +20,8 @@ std::size_t MainQueue::runBatch() {
   // A task that serves the queue itself finds another vector here.
   std::vector<Task> batch = std::exchange(batch_, {});
   pending_.take(batch);
-  for (Task& task : batch) {
-    task();
-    // What the task holds goes before the next one runs.
-    task = Task();
-  }
   const std::size_t count = batch.size();
-  batch.clear();
+  runAll(batch);
   batch_ = std::move(batch);
   return count;
 }

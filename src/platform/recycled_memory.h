@@ -26,7 +26,10 @@ class RecycledMemory {
     const std::size_t kind = kindOf(size);
     if (kIsSanitized || kind >= kKinds) return ::operator new(size);
     Stock& stock = stocks_[kind];
-    return stock.count > 0 ? stock.blocks[--stock.count] : allocateFromOutside(kind);
+    if (stock.count == 0) return allocateFromOutside(kind);
+    // The next one may lie where another core has it.
+    if (stock.count > 1) __builtin_prefetch(stock.blocks[stock.count - 2], 1);
+    return stock.blocks[--stock.count];
   }
 
   /// Gives back what allocate() gave for the same size.

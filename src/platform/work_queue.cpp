@@ -14,11 +14,9 @@ WorkQueue::~WorkQueue() {
 }
 
 void WorkQueue::async(Task task) {
-  {
-    const std::lock_guard lock(mutex_);
-    pending_.push_back(std::move(task));
-    if (pending_.size() > 1) return;
-  }
+  if (!pending_.add(std::move(task))) return;
+  // Whoever looks whether there is something has either seen it or is waiting by now.
+  { const std::lock_guard lock(mutex_); }
   changed_.notify_one();
 }
 
@@ -26,8 +24,8 @@ void WorkQueue::serve() {
   for (;;) {
     {
       std::unique_lock lock(mutex_);
-      changed_.wait(lock, [this] { return isEnding_ || !pending_.empty(); });
-      if (pending_.empty()) return;
+      changed_.wait(lock, [this] { return isEnding_ || !pending_.isEmpty(); });
+      if (pending_.isEmpty()) return;
     }
     const std::lock_guard turn(turn_);
     runPending();
@@ -35,16 +33,9 @@ void WorkQueue::serve() {
 }
 
 void WorkQueue::runPending() {
-  {
-    const std::lock_guard lock(mutex_);
-    batch_.swap(pending_);
-  }
-  for (Task& task : batch_) {
-    task();
-    // What the task holds goes before the next one runs.
-    task = Task();
-  }
-  batch_.clear();
+  if (pending_.isEmpty()) return;
+  pending_.take(batch_);
+  runAll(batch_);
 }
 
 }  // namespace vesk

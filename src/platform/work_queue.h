@@ -6,6 +6,7 @@
 #include <thread>
 #include <vector>
 
+#include "platform/backlog.h"
 #include "platform/task.h"
 
 namespace vesk {
@@ -42,9 +43,9 @@ class WorkQueue {
   std::mutex turn_;
   /// The tasks under way, kept for its storage.
   std::vector<Task> batch_;
+  Backlog<Task> pending_;
   std::mutex mutex_;
   std::condition_variable changed_;
-  std::vector<Task> pending_;
   bool isEnding_ = false;
   std::thread thread_;
 };

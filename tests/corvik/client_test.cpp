@@ -57,7 +57,7 @@ class ClientTest : public testing::Test {
   /// Registers a handler for metrics that notes their ids.
   void note(std::vector<std::int64_t>& ids) {
     RegisterEventHandler(manager_, kEventMetric, [&ids](const InterProcessDictionary& event, const WorkGroup&) {
-      ids.push_back(event.integer("kKeyMetricID").value_or(-1));
+      ids.push_back(event.integer("kKeyMetricID"_text).value_or(-1));
     });
   }
   void raise(std::int64_t id) { service_->events->raise(kEventMetric, makeMetricEvent(id, kBytes)); }

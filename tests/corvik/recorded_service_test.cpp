@@ -48,7 +48,7 @@ class RecordedServiceTest : public testing::Test {
     installService(nullptr);
     client::RegisterEventHandler(
         manager_, kEventMetric, [this](const vesk::InterProcessDictionary& event, const client::WorkGroup&) {
-          vesk::MainQueue::shared().async([this, id = event.integer("kKeyMetricID")] { take(id.value()); });
+          vesk::MainQueue::shared().async([this, id = event.integer("kKeyMetricID"_text)] { take(id.value()); });
         });
     client::EventsOn(manager_);
     vesk::InterProcessDictionary configuration;

@@ -31,7 +31,7 @@ class HandsetServiceTest : public testing::Test {
     ::corvik::installService(nullptr);
     client::RegisterEventHandler(manager_, ::corvik::kEventMetric,
                                  [this](const InterProcessDictionary& event, const client::WorkGroup&) {
-                                   take(event.integer("kKeyMetricID").value_or(-1));
+                                   take(event.integer("kKeyMetricID"_text).value_or(-1));
                                  });
     client::EventsOn(manager_);
   }

@@ -54,7 +54,7 @@ class CorvikWrapperTest : public testing::Test {
  protected:
   CorvikWrapperTest() {
     corvik::installService(service_);
-    wrapper_ = std::make_shared<CorvikWrapper>();
+    wrapper_ = CorvikWrapper::make();
     corvik::installService(nullptr);
   }
   void TearDown() override {
@@ -197,11 +197,10 @@ TEST_F(CorvikWrapperTest, LivesUntilItsScheduledEventsAreDeliveredAndNoLonger) {
   wrapper_->listen();
   wrapper_->setDelegate(delegate_);
   raise(corvik::kEventMetric, 1);
-  const std::weak_ptr<CorvikWrapper> watched = std::exchange(wrapper_, nullptr);
-  EXPECT_FALSE(watched.expired());
+  wrapper_.reset();
+  EXPECT_NE(service_->events, nullptr) << "still connected";
   loop_.runDue();
   EXPECT_EQ(notes_, Lines{"metric {id: 1}"});
-  EXPECT_TRUE(watched.expired());
   EXPECT_EQ(service_->events, nullptr) << "disconnected with the wrapper";
 }
 
