@@ -26,6 +26,14 @@ void requireSame(const ProtoCodable& a, const ProtoCodable& b) {
   require(isSame(a.dictionaryRepresentation(), b.dictionaryRepresentation()), "equal messages show the same");
 }
 
+void checkJson(const ProtoCodable& message) {
+  std::string direct;
+  message.appendJson(direct);
+  std::string ofDictionary;
+  appendJson(ofDictionary, message.dictionaryRepresentation());
+  require(direct == ofDictionary, "the JSON of a message is that of its dictionary");
+}
+
 Message decodeWithinBounds(const MessageClass& messageClass, Payload payload) {
   // The smallest element is two bytes of the wire, the largest object some hundred bytes of memory, and a list that
   // grows asks for its room several times over.
@@ -81,6 +89,7 @@ void checkCodec(const MessageClass& messageClass, Payload payload) {
   checkWrapping(messageClass, payload, message);
   if (message == nullptr) return;
   require(isSame(message->dictionaryRepresentation(), *modelled), "the reader reads what the rules of the wire say");
+  checkJson(*message);
   checkWriting(messageClass, *message, payload.size());
   checkCopies(messageClass, *message);
 }

@@ -23,13 +23,18 @@ bool isLarge(const vesk::InterProcessDictionary& message) {
 
 }  // namespace
 
+Channel::Channel(vesk::WorkQueue& queue)
+    : queue_(queue), handlers_(registered_.emplace_back(std::make_unique<Handlers>()).get()) {}
+
 void Channel::setHandler(const vesk::Text& event, EventHandler handler) {
-  if (event != kEventMetric && event != kEventTrigger) return;
-  queue_.async([weak = weak_from_this(), isMetric = event == kEventMetric, handler = std::move(handler)]() mutable {
-    if (const std::shared_ptr<Channel> self = weak.lock()) {
-      (isMetric ? self->metricHandler_ : self->triggerHandler_) = std::move(handler);
-    }
-  });
+  const std::lock_guard lock(mutex_);
+  auto handlers = std::make_unique<Handlers>(*handlers_);
+  if (event == kEventMetric) {
+    handlers->metric = std::move(handler);
+  } else if (event == kEventTrigger) {
+    handlers->trigger = std::move(handler);
+  }
+  handlers_ = registered_.emplace_back(std::move(handlers)).get();
 }
 
 void Channel::setConfigured(bool isConfigured) {
@@ -114,7 +119,8 @@ bool Channel::hasBatch() {
 }
 
 void Channel::handle(const vesk::Text& event, const vesk::InterProcessDictionary& message) const {
-  const EventHandler& handler = event == kEventMetric ? metricHandler_ : triggerHandler_;
+  const Handlers& handlers = *handlers_;
+  const EventHandler& handler = event == kEventMetric ? handlers.metric : handlers.trigger;
   if (handler) handler(message, WorkGroup{});
 }
 

@@ -21,7 +21,7 @@ namespace corvik::client {
 /// the client's queue, or in its turn.
 class Channel final : public EventStream, public std::enable_shared_from_this<Channel> {
  public:
-  explicit Channel(vesk::WorkQueue& queue) : queue_(queue) {}
+  explicit Channel(vesk::WorkQueue& queue);
 
   void setConfigured(bool isConfigured);
   void setEventsOn(bool isOn);
@@ -38,6 +38,10 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
     vesk::InterProcessDictionary message;
   };
   using Delivery = std::variant<Event, vesk::Task>;
+  struct Handlers {
+    EventHandler metric;
+    EventHandler trigger;
+  };
 
   void add(Delivery delivery);
   void scheduleDeliveries();
@@ -57,14 +61,13 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
   std::atomic<bool> areEventsOn_ = false;
   std::mutex mutex_;
   std::condition_variable_any wanted_;
+  /// The last of them is in force; those before stay, for they may be running.
+  std::vector<std::unique_ptr<const Handlers>> registered_;
+  std::atomic<const Handlers*> handlers_;
 
   /// Whether a large event was raised since a source last waited until few were ahead.
   std::atomic<bool> isLargeAhead_ = false;
   vesk::Backlog<Delivery> backlog_;
-
-  /// These belong to the client's queue.
-  EventHandler metricHandler_;
-  EventHandler triggerHandler_;
   /// What was taken from the backlog, and how much of it is done: left alone while events are off.
   std::vector<Delivery> batch_;
   std::size_t delivered_ = 0;

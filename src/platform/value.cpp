@@ -52,14 +52,16 @@ std::optional<std::size_t> Dictionary::indexOf(const Key& key) const {
   return static_cast<std::size_t>(entry - begin());
 }
 
-const Value* Dictionary::find(std::string_view key) const {
-  const std::optional<std::size_t> index = indexOf(key);
+const Value* Dictionary::valueAt(std::optional<std::size_t> index) const {
   return index ? &entries_[*index].value : nullptr;
 }
 
+const Value* Dictionary::find(std::string_view key) const {
+  return valueAt(indexOf(key));
+}
+
 const Value* Dictionary::find(const Text& key) const {
-  const std::optional<std::size_t> index = indexOf(key);
-  return index ? &entries_[*index].value : nullptr;
+  return valueAt(indexOf(key));
 }
 
 Value* Dictionary::findForChange(const Text& key) {

@@ -81,6 +81,7 @@ class Dictionary {
  private:
   template <class Key>
   [[nodiscard]] std::optional<std::size_t> indexOf(const Key& key) const;
+  [[nodiscard]] const Value* valueAt(std::optional<std::size_t> index) const;
 
   SharedVector<Entry> entries_;
 };

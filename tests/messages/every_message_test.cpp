@@ -44,6 +44,11 @@ TEST_P(EveryMessage, ReadsShowsAndWritesEveryField) {
     EXPECT_EQ(message->className(), GetParam().name);
     EXPECT_EQ(message->dictionaryRepresentation(), filled.dictionary);
     EXPECT_EQ(shown(*message), textOf(filled.dictionary));
+    std::string json;
+    message->appendJson(json);
+    std::string expectedJson;
+    appendJson(expectedJson, filled.dictionary);
+    EXPECT_EQ(json, expectedJson);
     EXPECT_EQ(writtenHex(*message), hexOf(filled.payload));
   }
 }

@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <array>
 #include <gtest/gtest.h>
 #include <memory>
@@ -40,6 +41,35 @@ TEST(WorkQueue, RunsInOrderAndFinishesWhatItHasBeforeItEnds) {
   for (int number = 0; number < 1000; ++number)
     ASSERT_EQ(ran[static_cast<std::size_t>(number)], number);
   EXPECT_EQ(ran.back(), -1);
+}
+
+TEST(WorkQueue, RunsWorkOnTheThreadThatWaitsForItBehindWhatWasThereAndBesideNothing) {
+  constexpr int kThreads = 4;
+  constexpr int kEach = 1000;
+  WorkQueue queue("");
+  std::vector<int> ran;
+  for (int number = 0; number < kEach; ++number)
+    queue.async([&ran, number] { ran.push_back(number); });
+  const auto caller = std::this_thread::get_id();
+  queue.sync([&] {
+    EXPECT_EQ(std::this_thread::get_id(), caller);
+    EXPECT_EQ(ran.size(), kEach);
+    EXPECT_TRUE(std::is_sorted(ran.begin(), ran.end()));
+  });
+  // Not atomic: two at once would lose some.
+  int count = 0;
+  {
+    std::vector<std::jthread> threads;
+    for (int thread = 0; thread < kThreads; ++thread) {
+      threads.emplace_back([&] {
+        for (int number = 0; number < kEach; ++number) {
+          queue.async([&count] { ++count; });
+          queue.sync([&count] { ++count; });
+        }
+      });
+    }
+  }
+  queue.sync([&] { EXPECT_EQ(count, 2 * kThreads * kEach); });
 }
 
 TEST(MainQueue, RunsABatchInOrderAndLeavesWhatItsTasksSchedule) {

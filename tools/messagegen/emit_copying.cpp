@@ -46,14 +46,14 @@ std::string emitDeepCopy(const MessageType& message) {
   if (statements.empty()) {
     return expand(R"code(
 std::shared_ptr<$class$> $class$::copyWithZone() const {
-  return std::make_shared<$class$>(*this);
+  return makeMessage<$class$>(*this);
 }
 )code",
                   variables);
   }
   return expand(R"code(
 std::shared_ptr<$class$> $class$::copyWithZone() const {
-  auto copy = std::make_shared<$class$>(*this);
+  auto copy = makeMessage<$class$>(*this);
   $statements$
   return copy;
 }

@@ -21,10 +21,10 @@ namespace vesk {
 template <class Element>
 using MessageList = std::optional<std::vector<std::shared_ptr<Element>, RecyclingAllocator<std::shared_ptr<Element>>>>;
 
-/// An empty message.
-template <class Element>
-[[nodiscard]] std::shared_ptr<Element> makeMessage() {
-  return std::allocate_shared<Element>(RecyclingAllocator<Element>());
+/// An empty message, or a copy of another.
+template <class Element, class... Original>
+[[nodiscard]] std::shared_ptr<Element> makeMessage(const Original&... original) {
+  return std::allocate_shared<Element>(RecyclingAllocator<Element>(), original...);
 }
 
 /// Base of the generated classes. A class has its own readFrom(), hasEqualFields() and kClassName; `Word` is

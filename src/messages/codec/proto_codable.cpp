@@ -4,6 +4,12 @@
 
 namespace vesk {
 
+void ProtoCodable::appendJson(std::string& out) const {
+  JsonWriter json(out);
+  writeJson(json);
+  json.finish();
+}
+
 std::string ProtoCodable::description() const {
   std::string text = "<";
   text += className();

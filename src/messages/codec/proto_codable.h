@@ -30,6 +30,7 @@ class ProtoCodable {
   [[nodiscard]] virtual Dictionary dictionaryRepresentation() const = 0;
   /// The same as JSON, without the dictionary.
   virtual void writeJson(JsonWriter& json) const = 0;
+  void appendJson(std::string& out) const;
   /// The class and the dictionary form, for logs.
   [[nodiscard]] std::string description() const;
 

@@ -36,9 +36,8 @@ class RepeatedScalar {
   void set(const Number* values, std::size_t count) { values_ = Values(values, values + count); }
   void append(const RepeatedScalar& other) {
     const std::size_t added = other.count();
-    values_.reserve(count() + added);
     for (std::size_t index = 0; index < added; ++index)
-      values_.push_back(other.values_[index]);
+      add(other.values_[index]);
   }
 
   [[nodiscard]] bool isEqual(const RepeatedScalar& other) const { return values_ == other.values_; }

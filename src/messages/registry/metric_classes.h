@@ -7,7 +7,6 @@
 #include <string_view>
 
 #include "messages/codec/proto_reader.h"
-#include "platform/json_form.h"
 #include "platform/value.h"
 
 namespace vesk {
@@ -32,9 +31,7 @@ bool appendPayloadJson(std::string& out, std::span<const std::uint8_t> payload) 
   MetricMessage message;
   ProtoReader reader(payload);
   if (!message.readFrom(reader)) return false;
-  JsonWriter json(out);
-  message.writeJson(json);
-  json.finish();
+  message.appendJson(out);
   return true;
 }
 

@@ -63,7 +63,7 @@ void Part::copyTo(Self& other) const {
 }
 
 std::shared_ptr<Part> Part::copyWithZone() const {
-  return std::make_shared<Part>(*this);
+  return makeMessage<Part>(*this);
 }
 
 void Part::mergeFrom(const Self& other) {
@@ -223,7 +223,7 @@ void Kinds::copyTo(Self& other) const {
 }
 
 std::shared_ptr<Kinds> Kinds::copyWithZone() const {
-  auto copy = std::make_shared<Kinds>(*this);
+  auto copy = makeMessage<Kinds>(*this);
   copy->part_ = deepCopy(part_);
   copy->partLists_ = deepCopy(partLists_);
   copy->instValues_ = deepCopy(instValues_);
