@@ -90,12 +90,10 @@ void liftList(const Record& source, const Text& listKey, RecordList& field, std:
 /// Replaces the value under `key` by its text when it is what `isMeant` asks for; the text, or null.
 template <class IsMeant>
 const Text* replaceByText(Record& record, const Text& key, IsMeant isMeant) {
-  const Value* present = record.find(key);
+  Value* present = record.findForChange(key);
   if (present == nullptr || !isMeant(*present)) return nullptr;
-  Value text = Text::copy(textOf(*present));
-  Value& replaced = *record.findForChange(key);
-  replaced = std::move(text);
-  return replaced.text();
+  *present = Text::copy(textOf(*present));
+  return present->text();
 }
 
 bool isIntegerList(const Value& value) {

@@ -105,12 +105,12 @@ bool MetricValidator::validateMetric(const Dictionary& event) {
 }
 
 void MetricValidator::formatTimestampOf(Record& record) {
-  const Value* timestamp = record.find("timestamp"_text);
+  Value* timestamp = record.findForChange("timestamp"_text);
   const std::optional<double> milliseconds = timestamp == nullptr ? std::nullopt : timestamp->number();
   if (!milliseconds) return;
-  std::string date;
-  dateFormat_.append(date, *milliseconds);
-  *record.findForChange("timestamp"_text) = Text::copy(date);
+  date_.clear();
+  dateFormat_.append(date_, *milliseconds);
+  *timestamp = Text::copy(date_);
 }
 
 }  // namespace vesk

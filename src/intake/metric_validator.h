@@ -92,6 +92,8 @@ class MetricValidator : public CorvikWrapperDelegate {
 
   std::shared_ptr<CorvikWrapper> mySharedCorvikInstance;
   DateFormat dateFormat_;
+  /// The date written last, kept for its storage.
+  std::string date_;
   std::function<void(std::int64_t)> arrivalObserver_;
 };
 

@@ -13,9 +13,9 @@ constexpr std::array dlbwlookup{1.4F, 3.0F, 5.0F, 10.0F, 15.0F, 20.0F};
 /// Replaces the value by `compute` of the form in which `as` gives it, when it has that form.
 template <class Number, class Compute>
 void replace(Dictionary& record, const Text& key, std::optional<Number> (Value::*as)() const, Compute compute) {
-  const Value* present = record.find(key);
+  Value* present = record.findForChange(key);
   if (present == nullptr) return;
-  if (const std::optional<Number> number = (present->*as)()) *record.findForChange(key) = compute(*number);
+  if (const std::optional<Number> number = (present->*as)()) *present = compute(*number);
 }
 
 void subtract(Dictionary& record, const Text& key, std::int64_t offset) {
@@ -61,13 +61,13 @@ void convertCentiFloat(Dictionary& record, const Text& key) {
 }
 
 void convertBandwidthCode(Dictionary& record, const Text& key) {
-  const Value* present = record.find(key);
+  Value* present = record.findForChange(key);
   const std::optional<std::int32_t> code = present == nullptr ? std::nullopt : present->integer32();
   if (!code) return;
   if (*code < 0 || static_cast<std::size_t>(*code) >= dlbwlookup.size()) {
     record.erase(key);
   } else {
-    *record.findForChange(key) = dlbwlookup[static_cast<std::size_t>(*code)];
+    *present = dlbwlookup[static_cast<std::size_t>(*code)];
   }
 }
 

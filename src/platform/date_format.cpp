@@ -14,6 +14,8 @@ namespace {
 constexpr double kMillisecondsPerSecond = 1000.0;
 constexpr int kSecondsPerMinute = 60;
 constexpr int kMinutesPerHour = 60;
+constexpr int kSecondsPerHour = kSecondsPerMinute * kMinutesPerHour;
+constexpr int kSecondsPerDay = 24 * kSecondsPerHour;
 constexpr int kFirstYear = 1900;
 /// No year within a calendar's int lies beyond this many seconds.
 constexpr double kMostSeconds = 1e17;
@@ -26,10 +28,19 @@ void appendPadded(std::string& out, long number, std::size_t width) {
   out.append(digits, size);
 }
 
+void appendTwoDigits(std::string& out, int number) {
+  out += static_cast<char>('0' + number / 10);
+  out += static_cast<char>('0' + number % 10);
+}
+
 std::optional<std::tm> localTime(std::time_t instant) {
   std::tm local{};
   if (localtime_r(&instant, &local) == nullptr) return std::nullopt;
   return local;
+}
+
+int secondOfDay(const std::tm& local) {
+  return local.tm_hour * kSecondsPerHour + local.tm_min * kSecondsPerMinute + local.tm_sec;
 }
 
 /// The year within its era: what "yyyy" asks for.
@@ -71,39 +82,49 @@ void DateFormat::append(std::string& out, double milliseconds) {
   }
   const auto instant = static_cast<std::time_t>(seconds);
   const bool isRemembered = begin_ <= instant && instant < end_;
-  if (!isRemembered && !writeMinute(instant)) {
+  if (!isRemembered && !writeDay(instant)) {
     out += "no date";
     return;
   }
-  const auto second = static_cast<int>(instant - begin_) + firstSecond_;
-  out += untilSeconds_;
-  out += static_cast<char>('0' + second / 10);
-  out += static_cast<char>('0' + second % 10);
-  out += ' ';
+  const int second = secondOfBegin_ + static_cast<int>(instant - begin_);
+  // A leap second is the 60th of its minute.
+  const int hour = std::min(second / kSecondsPerHour, 23);
+  const int minute = std::min((second - hour * kSecondsPerHour) / kSecondsPerMinute, 59);
+  out += date_;
+  appendTwoDigits(out, hour);
+  out += ':';
+  appendTwoDigits(out, minute);
+  out += ':';
+  appendTwoDigits(out, second - hour * kSecondsPerHour - minute * kSecondsPerMinute);
   out += zone_;
 }
 
-bool DateFormat::writeMinute(std::time_t instant) {
+bool DateFormat::writeDay(std::time_t instant) {
   begin_ = end_ = 0;
   const std::optional<std::tm> local = localTime(instant);
   if (!local) return false;
-  untilSeconds_.clear();
-  appendPadded(untilSeconds_, yearOf(*local), 4);
-  for (const auto& [separator, number] :
-       {std::pair{'-', local->tm_mon + 1}, {'-', local->tm_mday}, {' ', local->tm_hour}, {':', local->tm_min}}) {
-    untilSeconds_ += separator;
-    appendPadded(untilSeconds_, number, 2);
-  }
-  untilSeconds_ += ':';
-  zone_ = zoneName(*local);
+  date_.clear();
+  appendPadded(date_, yearOf(*local), 4);
+  date_ += '-';
+  appendTwoDigits(date_, local->tm_mon + 1);
+  date_ += '-';
+  appendTwoDigits(date_, local->tm_mday);
+  date_ += ' ';
+  zone_ = ' ' + zoneName(*local);
 
-  begin_ = instant;
-  firstSecond_ = local->tm_sec;
-  // Where the zone's clocks are changed within the minute, only this second is sure.
-  const std::time_t minuteEnd = instant + std::max(1, kSecondsPerMinute - local->tm_sec);
-  const std::optional<std::tm> last = localTime(minuteEnd - 1);
-  const bool isSameRule = last && last->tm_gmtoff == local->tm_gmtoff && last->tm_isdst == local->tm_isdst;
-  end_ = isSameRule ? minuteEnd : instant + 1;
+  const int second = secondOfDay(*local);
+  const auto isSoAt = [&](std::time_t other) {
+    const std::optional<std::tm> there = localTime(other);
+    return there && there->tm_gmtoff == local->tm_gmtoff && zoneName(*there) == zoneName(*local) &&
+           secondOfDay(*there) - second == other - instant;
+  };
+  // Where the zone's clocks are changed within the day it is the hour that is remembered, or only this second.
+  for (const int stretch : {kSecondsPerDay, kSecondsPerHour, 1}) {
+    secondOfBegin_ = second - second % stretch;
+    begin_ = instant - second % stretch;
+    end_ = begin_ + stretch;
+    if (isSoAt(begin_) && isSoAt(end_ - 1)) break;
+  }
   return true;
 }
 

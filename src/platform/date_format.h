@@ -7,7 +7,7 @@ namespace vesk {
 
 /// Writes instants as "yyyy-MM-dd HH:mm:ss zzz" in the process's time zone, daylight saving included: "zzz"
 /// is the zone's short name, as UTC or CET, or its distance, as GMT+5, where it has none. Remembers the
-/// minute it wrote last, for instants come in clusters. One thread at a time; takes up the zone when it is
+/// day it wrote last, for instants come in clusters. One thread at a time; takes up the zone when it is
 /// made.
 class DateFormat {
  public:
@@ -18,14 +18,15 @@ class DateFormat {
   void append(std::string& out, double milliseconds);
 
  private:
-  [[nodiscard]] bool writeMinute(std::time_t instant);
+  [[nodiscard]] bool writeDay(std::time_t instant);
 
-  /// The instants for which the texts hold: empty, or within one minute of local time.
+  /// The instants for which the texts hold: empty, or within one day of local time.
   std::time_t begin_ = 0;
   std::time_t end_ = 0;
-  /// How far into its minute begin_ lies.
-  int firstSecond_ = 0;
-  std::string untilSeconds_;
+  /// How far into its day begin_ lies.
+  int secondOfBegin_ = 0;
+  /// What stands before and behind the time of the day.
+  std::string date_;
   std::string zone_;
 };
 

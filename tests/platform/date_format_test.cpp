@@ -73,9 +73,10 @@ TEST(DateFormat, WritesInstantsInTheProcessesZone) {
   }
 }
 
-TEST(DateFormat, RemembersAMinuteButNeverAcrossAChangeOfTheClocks) {
+TEST(DateFormat, RemembersADayButNeverAcrossAChangeOfTheClocks) {
   // Clocks go forward at 01:00:30, in the middle of a minute.
   const Zone zone("AAA0BBB,M3.5.0/1:00:30,M10.5.0");
+  constexpr double kHour = 3'600'000;
   constexpr double kMinute = 1'679'792'400'000;  // 2023-03-26 01:00 UTC
   DateFormat format;
   EXPECT_EQ(written(format, kMinute + 29'000), "2023-03-26 01:00:29 AAA");
@@ -84,8 +85,19 @@ TEST(DateFormat, RemembersAMinuteButNeverAcrossAChangeOfTheClocks) {
   EXPECT_EQ(written(format, kMinute + 45'000), "2023-03-26 02:00:45 BBB");
   EXPECT_EQ(written(format, kMinute + 60'000), "2023-03-26 02:01:00 BBB");
   EXPECT_EQ(written(format, kMinute - 1), "2023-03-26 00:59:59 AAA");
+  EXPECT_EQ(written(format, kMinute + 22 * kHour - 1), "2023-03-26 23:59:59 BBB");
+  EXPECT_EQ(written(format, kMinute + 22 * kHour), "2023-03-27 00:00:00 BBB");
+  EXPECT_EQ(written(format, kMinute + 46 * kHour), "2023-03-28 00:00:00 BBB");
+  EXPECT_EQ(written(format, kMinute - 1), "2023-03-26 00:59:59 AAA");
   EXPECT_EQ(written(format, std::numeric_limits<double>::quiet_NaN()), "no date");
   EXPECT_EQ(written(format, kMinute), "2023-03-26 01:00:00 AAA");
+  // And back, from 02:00 to 01:00: 25 hours, two of them of one name.
+  constexpr double kAutumn = 1'698'537'600'000;  // 2023-10-29 00:00 UTC, 01:00 in the zone
+  EXPECT_EQ(written(format, kAutumn), "2023-10-29 01:00:00 BBB");
+  EXPECT_EQ(written(format, kAutumn + kHour - 1), "2023-10-29 01:59:59 BBB");
+  EXPECT_EQ(written(format, kAutumn + kHour), "2023-10-29 01:00:00 AAA");
+  EXPECT_EQ(written(format, kAutumn + 24 * kHour - 1), "2023-10-29 23:59:59 AAA");
+  EXPECT_EQ(written(format, kAutumn - kHour - 1), "2023-10-28 23:59:59 BBB");
 }
 
 }  // namespace
