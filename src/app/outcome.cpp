@@ -24,8 +24,9 @@ void tellUser(std::string_view line) {
   standardError().flush();
 }
 
-void interruptTellingBy(const WakeUp& interrupt) {
+void boundTelling(const WakeUp& interrupt, std::optional<std::chrono::steady_clock::time_point> deadline) {
   standardError().setInterrupt(&interrupt);
+  standardError().setDeadline(deadline);
 }
 
 }  // namespace vesk

@@ -24,7 +24,8 @@ namespace {
 class Run {
  public:
   explicit Run(const RunOptions& options) : options_(options), isHeadless_(options.isHeadless) {
-    interruptTellingBy(stopSignal_);
+    if (options_.duration) end_ = clock_.now() + *options_.duration;
+    boundTelling(stopSignal_, end_);
   }
 
   Outcome run() {
@@ -60,7 +61,7 @@ class Run {
       loop_.stop();
     });
     sink->setInterrupt(&stopSignal_);
-    if (options_.duration) sink->setDeadline(clock_.now() + *options_.duration);
+    sink->setDeadline(end_);
     OutputLines::setSink(std::move(sink));
   }
 
@@ -147,6 +148,8 @@ class Run {
   const RunOptions& options_;
   const SteadyClock clock_;
   bool isHeadless_;
+  /// When nobody is waited for any more; absent for never.
+  std::optional<Clock::Instant> end_;
   Outcome outcome_ = Outcome::done;
   std::optional<std::string> firstFault_;
   RunLoop loop_{clock_};

@@ -111,9 +111,9 @@ bool Channel::deliverWaiting() {
 
 bool Channel::hasBatch() {
   if (delivered_ < batch_.size()) return true;
-  if (backlog_.isEmpty()) return false;
   batch_.clear();
   delivered_ = 0;
+  if (backlog_.isEmpty()) return false;
   backlog_.take(batch_);
   return !batch_.empty();
 }

@@ -21,11 +21,12 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
  public:
   /// The wrapper of the process, made on first call, which connects to the service installed then.
   static std::shared_ptr<CorvikWrapper> sharedInstance();
-  /// The serial queue that the client library delivers events on, one for the process.
+  /// The serial queue in whose turn the client library delivers events, one for the process.
   static WorkQueue& queue();
 
   /// One that connects to the service installed now. Once nobody holds it, it ends on the main queue, behind the events
-  /// that it has scheduled there.
+  /// that it has scheduled there; that of the process at the queue's own end, before which the service must be shut
+  /// down.
   static std::shared_ptr<CorvikWrapper> make();
   CorvikWrapper(const CorvikWrapper&) = delete;
   CorvikWrapper& operator=(const CorvikWrapper&) = delete;
@@ -58,7 +59,7 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
 
   std::shared_ptr<corvik::client::Manager> corvikManager_;
   std::weak_ptr<CorvikWrapperDelegate> delegate_;
-  /// What the handlers ask, on the library's queue; the delegate may have gone since.
+  /// What the handlers ask, on whatever thread they run; the delegate may have gone since.
   std::atomic<bool> isDelegateSet_ = false;
 };
 

@@ -13,6 +13,7 @@ namespace {
 
 constexpr double kMillisecondsPerSecond = 1000.0;
 constexpr int kSecondsPerMinute = 60;
+constexpr int kLastSecond = 59;
 constexpr int kMinutesPerHour = 60;
 constexpr int kSecondsPerHour = kSecondsPerMinute * kMinutesPerHour;
 constexpr int kSecondsPerDay = 24 * kSecondsPerHour;
@@ -39,8 +40,9 @@ std::optional<std::tm> localTime(std::time_t instant) {
   return local;
 }
 
+/// Of a leap second that of the second before.
 int secondOfDay(const std::tm& local) {
-  return local.tm_hour * kSecondsPerHour + local.tm_min * kSecondsPerMinute + local.tm_sec;
+  return local.tm_hour * kSecondsPerHour + local.tm_min * kSecondsPerMinute + std::min(local.tm_sec, kLastSecond);
 }
 
 /// The year within its era: what "yyyy" asks for.
@@ -87,15 +89,12 @@ void DateFormat::append(std::string& out, double milliseconds) {
     return;
   }
   const int second = secondOfBegin_ + static_cast<int>(instant - begin_);
-  // A leap second is the 60th of its minute.
-  const int hour = std::min(second / kSecondsPerHour, 23);
-  const int minute = std::min((second - hour * kSecondsPerHour) / kSecondsPerMinute, 59);
   out += date_;
-  appendTwoDigits(out, hour);
+  appendTwoDigits(out, second / kSecondsPerHour);
   out += ':';
-  appendTwoDigits(out, minute);
+  appendTwoDigits(out, second / kSecondsPerMinute % kMinutesPerHour);
   out += ':';
-  appendTwoDigits(out, second - hour * kSecondsPerHour - minute * kSecondsPerMinute);
+  appendTwoDigits(out, second % kSecondsPerMinute + leap_);
   out += zone_;
 }
 
@@ -113,6 +112,7 @@ bool DateFormat::writeDay(std::time_t instant) {
   zone_ = ' ' + zoneName(*local);
 
   const int second = secondOfDay(*local);
+  leap_ = std::max(0, local->tm_sec - kLastSecond);
   const auto isSoAt = [&](std::time_t other) {
     const std::optional<std::tm> there = localTime(other);
     return there && there->tm_gmtoff == local->tm_gmtoff && zoneName(*there) == zoneName(*local) &&
@@ -123,7 +123,7 @@ bool DateFormat::writeDay(std::time_t instant) {
     secondOfBegin_ = second - second % stretch;
     begin_ = instant - second % stretch;
     end_ = begin_ + stretch;
-    if (isSoAt(begin_) && isSoAt(end_ - 1)) break;
+    if (leap_ == 0 && isSoAt(begin_) && isSoAt(end_ - 1)) break;
   }
   return true;
 }

@@ -7,8 +7,8 @@ namespace vesk {
 
 /// Writes instants as "yyyy-MM-dd HH:mm:ss zzz" in the process's time zone, daylight saving included: "zzz"
 /// is the zone's short name, as UTC or CET, or its distance, as GMT+5, where it has none. Remembers the
-/// day it wrote last, for instants come in clusters. One thread at a time; takes up the zone when it is
-/// made.
+/// day it wrote last, for instants come in clusters; of no zone are the clocks changed twice in a day. One thread at a
+/// time; takes up the zone when it is made.
 class DateFormat {
  public:
   DateFormat();
@@ -25,6 +25,8 @@ class DateFormat {
   std::time_t end_ = 0;
   /// How far into its day begin_ lies.
   int secondOfBegin_ = 0;
+  /// 1 for a leap second, which follows secondOfBegin_ in the same minute.
+  int leap_ = 0;
   /// What stands before and behind the time of the day.
   std::string date_;
   std::string zone_;

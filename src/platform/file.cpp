@@ -3,6 +3,7 @@
 #include <array>
 #include <cerrno>
 #include <fcntl.h>
+#include <sys/ioctl.h>
 #include <unistd.h>
 #include <vector>
 
@@ -34,7 +35,10 @@ std::optional<Data> readFile(const std::string& path) {
 }
 
 FileDescriptor openUnblocked(int descriptor) {
-  if (isatty(descriptor) != 1) return {};
+  // The path of the other side of a pseudo terminal opens a new one.
+  int number = 0;
+  const bool isOtherSide = ioctl(descriptor, TIOCGPTN, &number) == 0;
+  if (isatty(descriptor) != 1 || isOtherSide) return {};
   const std::string path = "/proc/self/fd/" + std::to_string(descriptor);
   return FileDescriptor(open(path.c_str(), O_WRONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC));
 }

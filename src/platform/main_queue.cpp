@@ -16,13 +16,19 @@ void MainQueue::async(Task task) {
 }
 
 std::size_t MainQueue::runBatch() {
-  if (isEmpty()) return 0;
-  // A task that serves the queue itself finds another vector here.
-  std::vector<Task> batch = std::exchange(batch_, {});
-  pending_.take(batch);
-  const std::size_t count = batch.size();
-  runAll(batch);
-  batch_ = std::move(batch);
+  // A task that serves the queue itself goes on where the queue stands.
+  if (next_ == batch_.size()) {
+    batch_.clear();
+    next_ = 0;
+    if (isEmpty()) return 0;
+    pending_.take(batch_);
+  }
+  std::size_t count = 0;
+  for (; next_ < batch_.size(); ++count) {
+    // What the task holds goes before the next one runs.
+    Task task = std::move(batch_[next_++]);
+    task();
+  }
   return count;
 }
 

@@ -30,7 +30,8 @@ class MainQueue {
     return pending_.waitUntilFewerThan(count, stop);
   }
 
-  /// Runs the tasks that wait now, but none that they schedule; on the main thread. How many there were.
+  /// Runs the tasks that wait now, but none that they schedule; on the main thread. How many there were. A task may
+  /// call it too: those behind it run then.
   std::size_t runBatch();
   [[nodiscard]] bool isEmpty() const { return pending_.isEmpty(); }
   /// Signalled whenever a task comes to an empty queue; null for nobody. Must stay alive until replaced.
@@ -38,8 +39,9 @@ class MainQueue {
 
  private:
   Backlog<Task> pending_;
-  /// The tasks under way, kept for its storage.
+  /// The tasks under way, and how many of them have begun.
   std::vector<Task> batch_;
+  std::size_t next_ = 0;
   std::mutex wakeUpMutex_;
   const WakeUp* wakeUp_ = nullptr;
 };

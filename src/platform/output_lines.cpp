@@ -31,6 +31,17 @@ std::unique_ptr<OutputSink>& sinkInForce() {
   return theSink;
 }
 
+/// Milliseconds.
+constexpr int kUntilAskedAgain = 10;
+
+/// Milliseconds in poll(2)'s manner.
+int waitUntil(std::optional<std::chrono::steady_clock::time_point> end) {
+  if (!end) return -1;
+  using std::chrono::milliseconds;
+  const auto left = std::chrono::ceil<milliseconds>(*end - std::chrono::steady_clock::now()).count();
+  return static_cast<int>(std::clamp<milliseconds::rep>(left, 0, std::numeric_limits<int>::max()));
+}
+
 }  // namespace
 
 DescriptorSink::DescriptorSink(int descriptor, std::string name)
@@ -51,17 +62,21 @@ void DescriptorSink::write(std::string_view line) {
 
 void DescriptorSink::flush() {
   const bool mayBlock = interrupt_ == nullptr && !deadline_;
+  std::optional<Instant> end = endOfPatience();
+  bool wasRefused = false;
   std::string_view rest = buffer_;
   while (!rest.empty() && !hasFailed_) {
-    const Room room = mayBlock ? Room::some : waitForRoom();
+    const Room room = mayBlock ? Room::some : waitForRoom(end, wasRefused);
     if (room == Room::interrupted) break;
     if (room == Room::neverAgain) {
       fail("nobody reads it");
       break;
     }
     const ssize_t written = mayBlock ? ::write(descriptor_, rest.data(), rest.size()) : writeWhatFits(rest);
+    wasRefused = written < 0 && errno == EAGAIN;
     if (written >= 0) {
       rest.remove_prefix(static_cast<std::size_t>(written));
+      end = endOfPatience();
     } else if (errno != EINTR && errno != EAGAIN) {
       fail(std::strerror(errno));
     }
@@ -74,25 +89,23 @@ ssize_t DescriptorSink::writeWhatFits(std::string_view bytes) const {
   return ::write(descriptor, bytes.data(), std::min(bytes.size(), chunk_));
 }
 
-DescriptorSink::Room DescriptorSink::waitForRoom() const {
-  // A negative descriptor is passed over.
-  pollfd polled[] = {{descriptor_, POLLOUT, 0}, {interrupt_ != nullptr ? interrupt_->descriptor() : -1, POLLIN, 0}};
-  // What poll fails for, the write that follows tells better.
-  int count = 0;
-  do
-    count = poll(polled, std::size(polled), longestWait());
-  while ((count < 0 && errno == EINTR) || (count == 0 && std::chrono::steady_clock::now() < *deadline_));
-  if (count == 0) return Room::neverAgain;
-  const bool isBlocked = polled[0].revents == 0;
-  return isBlocked && polled[1].revents != 0 ? Room::interrupted : Room::some;
+std::optional<DescriptorSink::Instant> DescriptorSink::endOfPatience() const {
+  if (!deadline_) return std::nullopt;
+  return std::max(*deadline_, std::chrono::steady_clock::now()) + patience_;
 }
 
-int DescriptorSink::longestWait() const {
-  if (!deadline_) return -1;
-  using std::chrono::milliseconds;
-  const auto left = std::chrono::ceil<milliseconds>(*deadline_ - std::chrono::steady_clock::now());
-  const auto wait = std::max(left, milliseconds(0)) + patience_;
-  return static_cast<int>(std::min<milliseconds::rep>(wait.count(), std::numeric_limits<int>::max()));
+DescriptorSink::Room DescriptorSink::waitForRoom(std::optional<Instant> end, bool wasRefused) const {
+  // A negative descriptor is passed over.
+  pollfd polled[] = {{wasRefused ? -1 : descriptor_, POLLOUT, 0},
+                     {interrupt_ != nullptr ? interrupt_->descriptor() : -1, POLLIN, 0}};
+  for (;;) {
+    const int count = poll(polled, std::size(polled), wasRefused ? kUntilAskedAgain : waitUntil(end));
+    if (polled[0].revents != 0) return Room::some;
+    if (polled[1].revents != 0) return Room::interrupted;
+    if (end && std::chrono::steady_clock::now() >= *end) return Room::neverAgain;
+    // What poll fails for, the write that follows tells better.
+    if (wasRefused || (count < 0 && errno != EINTR)) return Room::some;
+  }
 }
 
 void DescriptorSink::fail(const char* reason) {

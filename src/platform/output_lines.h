@@ -55,11 +55,14 @@ class DescriptorSink : public OutputSink {
  private:
   enum class Room { some, interrupted, neverAgain };
 
-  [[nodiscard]] Room waitForRoom() const;
+  using Instant = std::chrono::steady_clock::time_point;
+
+  /// When a reader that takes nothing from now on has failed; absent for never.
+  [[nodiscard]] std::optional<Instant> endOfPatience() const;
+  /// `wasRefused` says that there was room just now, but too little.
+  [[nodiscard]] Room waitForRoom(std::optional<Instant> end, bool wasRefused) const;
   /// write(2), of some of the bytes, where there is room.
   [[nodiscard]] ssize_t writeWhatFits(std::string_view bytes) const;
-  /// Milliseconds in poll(2)'s manner.
-  [[nodiscard]] int longestWait() const;
   void fail(const char* reason);
 
   int descriptor_;

@@ -10,7 +10,8 @@ namespace vesk {
 #if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
 inline constexpr bool kIsSanitized = true;
 #elif defined(__has_feature)
-inline constexpr bool kIsSanitized = __has_feature(address_sanitizer) || __has_feature(thread_sanitizer);
+inline constexpr bool kIsSanitized =
+    __has_feature(address_sanitizer) || __has_feature(memory_sanitizer) || __has_feature(thread_sanitizer);
 #else
 inline constexpr bool kIsSanitized = false;
 #endif

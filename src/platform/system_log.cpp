@@ -66,14 +66,13 @@ class DescriptorLogSink : public LogSink {
     while (!bytes.empty()) {
       const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - steady_clock::now());
       pollfd polled{descriptor_.get(), POLLOUT, 0};
-      const int ready = poll(&polled, 1, static_cast<int>(std::max<std::int64_t>(0, left.count())));
-      if (ready == 0) break;
-      // A signal is none of the reader's doing.
-      if (ready < 0) continue;
-      const ssize_t written = ::write(descriptor_.get(), bytes.data(), std::min<std::size_t>(bytes.size(), PIPE_BUF));
-      if (written >= 0) {
+      ssize_t written = poll(&polled, 1, static_cast<int>(std::max<std::int64_t>(0, left.count())));
+      if (written > 0) {
+        written = ::write(descriptor_.get(), bytes.data(), std::min<std::size_t>(bytes.size(), PIPE_BUF));
+      }
+      if (written > 0) {
         bytes.remove_prefix(static_cast<std::size_t>(written));
-      } else if (errno != EINTR && errno != EAGAIN) {
+      } else if (left.count() <= 0 || (written < 0 && errno != EINTR && errno != EAGAIN)) {
         break;
       }
     }

@@ -5,7 +5,6 @@
 #include <new>
 #include <type_traits>
 #include <utility>
-#include <vector>
 
 namespace vesk {
 
@@ -85,15 +84,5 @@ class Task {
   const Operations* operations_ = nullptr;
   alignas(std::max_align_t) std::byte room_[kRoom];
 };
-
-/// Runs the tasks one after another, and leaves none.
-inline void runAll(std::vector<Task>& tasks) {
-  for (Task& task : tasks) {
-    task();
-    // What the task holds goes before the next one runs.
-    task = Task();
-  }
-  tasks.clear();
-}
 
 }  // namespace vesk

@@ -35,7 +35,12 @@ void WorkQueue::serve() {
 void WorkQueue::runPending() {
   if (pending_.isEmpty()) return;
   pending_.take(batch_);
-  runAll(batch_);
+  for (Task& task : batch_) {
+    task();
+    // What the task holds goes before the next one runs.
+    task = Task();
+  }
+  batch_.clear();
 }
 
 }  // namespace vesk

@@ -77,9 +77,9 @@ class Fire {
   /// Ends the program by a key, by the key for interrupting, or by a signal.
   bool end(int how) {
     const Clock::time_point deadline = Clock::now() + 20s;
-    // The first bytes end whatever sequence was begun, the next one the typing of a filter.
     read(0);
     if (isOver()) return fail("it ended by itself");
+    // The first bytes end whatever sequence was begun, the next one the typing of a filter.
     constexpr std::string_view kLead = "\x18\x18\x18\x18\r";
     if (how == 2) kill(process_->id(), SIGTERM);
     while (!isOver()) {

@@ -176,6 +176,21 @@ TEST_F(ClientTest, DeliversASourcesEventBeforeTheSourceGoesOnBehindThoseRaisedBe
   EXPECT_EQ(ids, (std::vector<std::int64_t>{1, 2, 3, 4, 5, 6}));
 }
 
+TEST_F(ClientTest, LetsGoOfAnEventThatIsHandled) {
+  int ends[2];
+  ASSERT_EQ(pipe(ends), 0);
+  const vesk::FileDescriptor readEnd(ends[0]);
+  InterProcessDictionary message;
+  message.setDescriptor("trace"_text, vesk::FileDescriptor(ends[1]));
+  EventsOn(manager_);
+  service_->events->raise(kEventTrigger, std::exchange(message, {}));
+  deliverAll();
+  // Until then it would block.
+  queue_->sync([] {});
+  char byte = 0;
+  EXPECT_EQ(read(readEnd.get(), &byte, 1), 0);
+}
+
 TEST_F(ClientTest, AnswersAQueryWithoutAConfiguration) {
   std::vector<std::int64_t> ids;
   note(ids);
@@ -239,8 +254,9 @@ TEST_F(ClientTest, KeepsTheOrderOfEachThreadOfAServiceThatRaisesFromSeveral) {
     std::vector<std::jthread> threads;
     for (std::int64_t thread = 0; thread < kThreads; ++thread) {
       threads.emplace_back([&, thread] {
+        const auto hand = thread % 2 == 0 ? &EventStream::raise : &EventStream::deliver;
         for (std::int64_t event = 0; event < kEventsEach; ++event)
-          raise(event * kThreads + thread);
+          (service_->events->*hand)(kEventMetric, makeMetricEvent(event * kThreads + thread, kBytes));
       });
     }
     // Switching them off and on meanwhile loses none either.

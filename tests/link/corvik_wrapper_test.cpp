@@ -204,6 +204,27 @@ TEST_F(CorvikWrapperTest, LivesUntilItsScheduledEventsAreDeliveredAndNoLonger) {
   EXPECT_EQ(service_->events, nullptr) << "disconnected with the wrapper";
 }
 
+TEST_F(CorvikWrapperTest, EndsOnTheMainThreadThoughAHandlerIsTheLastToHoldIt) {
+  class LettingGo : public LogSink {
+   public:
+    explicit LettingGo(std::shared_ptr<CorvikWrapper>& held) : held_(held) {}
+    void write(std::string_view) override { held_.reset(); }
+
+   private:
+    std::shared_ptr<CorvikWrapper>& held_;
+  };
+  wrapper_->listen();
+  wrapper_->setDelegate(delegate_);
+  auto previous = SystemLog::setSink(std::make_unique<LettingGo>(wrapper_));
+  raise(corvik::kEventMetric, 1);
+  SystemLog::setSink(std::move(previous));
+  EXPECT_EQ(wrapper_, nullptr);
+  EXPECT_NE(service_->events, nullptr) << "still connected";
+  loop_.runDue();
+  EXPECT_EQ(notes_, Lines{"metric {id: 1}"});
+  EXPECT_EQ(service_->events, nullptr);
+}
+
 TEST_F(CorvikWrapperTest, LogsAndDropsAnEventWithoutAnOrdinaryForm) {
   const RecordedLog log;
   wrapper_->listen();

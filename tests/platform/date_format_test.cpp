@@ -100,5 +100,17 @@ TEST(DateFormat, RemembersADayButNeverAcrossAChangeOfTheClocks) {
   EXPECT_EQ(written(format, kAutumn - kHour - 1), "2023-10-28 23:59:59 BBB");
 }
 
+TEST(DateFormat, WritesALeapSecondAsTheSixtiethOfItsMinute) {
+  const Zone zone("right/Europe/Berlin");
+  // The last of 2016, in whose count of seconds there were 26 before it.
+  constexpr double kLeapSecond = (1'483'228'800.0 + 26) * 1000;
+  DateFormat format;
+  if (written(format, kLeapSecond) == "2017-01-01 01:00:26 CET") GTEST_SKIP() << "a zone that knows none";
+  EXPECT_EQ(written(format, kLeapSecond - 1000), "2017-01-01 00:59:59 CET");
+  EXPECT_EQ(written(format, kLeapSecond), "2017-01-01 00:59:60 CET");
+  EXPECT_EQ(written(format, kLeapSecond + 1000), "2017-01-01 01:00:00 CET");
+  EXPECT_EQ(written(format, kLeapSecond + 3'601'000), "2017-01-01 02:00:00 CET");
+}
+
 }  // namespace
 }  // namespace vesk

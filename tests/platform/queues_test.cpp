@@ -87,6 +87,21 @@ TEST(MainQueue, RunsABatchInOrderAndLeavesWhatItsTasksSchedule) {
   EXPECT_TRUE(queue.isEmpty());
 }
 
+TEST(MainQueue, KeepsItsOrderWhenATaskServesItToo) {
+  MainQueue queue;
+  std::vector<int> ran;
+  queue.async([&] {
+    queue.async([&] { ran.push_back(3); });
+    EXPECT_EQ(queue.runBatch(), 1U);
+    EXPECT_EQ(queue.runBatch(), 1U);
+    ran.push_back(4);
+  });
+  queue.async([&] { ran.push_back(2); });
+  EXPECT_EQ(queue.runBatch(), 1U);
+  EXPECT_EQ(ran, (std::vector{2, 3, 4}));
+  EXPECT_EQ(queue.runBatch(), 0U);
+}
+
 TEST(MainQueue, HoldsASourceThatIsAheadUntilTasksAreTakenOrItShallStop) {
   constexpr std::size_t kMost = 8;
   constexpr int kEvents = 1000;

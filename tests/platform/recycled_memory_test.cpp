@@ -76,7 +76,9 @@ TEST(RecycledMemory, NoBlockHasTwoOwnersHoweverManyWereReleased) {
 struct ReleasesAtTheVeryEnd {
   ~ReleasesAtTheVeryEnd() {
     releaseAll(blocks, 40);
+    const std::uint64_t before = allocatedBytes();
     RecycledMemory::release(RecycledMemory::allocate(40), 40);
+    EXPECT_GE(allocatedBytes() - before, 40U) << "nothing was kept";
   }
   std::vector<void*> blocks;
 };

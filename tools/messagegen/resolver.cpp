@@ -59,7 +59,7 @@ std::vector<std::string> accessorsOf(const Field& field) {
 }
 
 constexpr std::size_t kMostPresenceBits = 64;
-/// The decoder's stack grows with the depth to which messages nest.
+/// The decoder's stack grows with the depth to which messages nest; those of one file, for each is held to it.
 constexpr std::size_t kDeepestMessage = 32;
 
 class Resolver {
