@@ -17,19 +17,28 @@ void MainQueue::async(Task task) {
 
 std::size_t MainQueue::runBatch() {
   // A task that serves the queue itself goes on where the queue stands.
-  if (next_ == batch_.size()) {
-    batch_.clear();
-    next_ = 0;
-    if (isEmpty()) return 0;
-    pending_.take(batch_);
-  }
-  std::size_t count = 0;
-  for (; next_ < batch_.size(); ++count) {
-    // What the task holds goes before the next one runs.
-    Task task = std::move(batch_[next_++]);
-    task();
-  }
+  if (next_ < batch_.size()) return runRest();
+  if (isEmpty()) return 0;
+  std::vector<Task> underWay;
+  if (!batch_.empty()) underWay.swap(batch_);
+  next_ = 0;
+  pending_.take(batch_);
+  const std::size_t count = runRest();
+  batch_.clear();
+  if (!underWay.empty()) batch_.swap(underWay);
+  next_ = batch_.size();
   return count;
+}
+
+std::size_t MainQueue::runRest() {
+  const std::size_t begun = next_;
+  while (next_ < batch_.size()) {
+    Task& task = batch_[next_++];
+    task();
+    // What the task holds goes before the next one runs.
+    task = Task();
+  }
+  return next_ - begun;
 }
 
 void MainQueue::setWakeUp(const WakeUp* wakeUp) {

@@ -38,9 +38,15 @@ class MainQueue {
   void setWakeUp(const WakeUp* wakeUp);
 
  private:
-  Backlog<Task> pending_;
-  /// The tasks under way, and how many of them have begun.
-  std::vector<Task> batch_;
+  static constexpr std::size_t kCacheLine = 64;
+
+  /// Runs those of the batch that have not begun.
+  std::size_t runRest();
+
+  /// Written by the sources, and so kept apart from what the main thread writes.
+  alignas(kCacheLine) Backlog<Task> pending_;
+  /// The tasks under way, empty beside a run, and how many of them have begun.
+  alignas(kCacheLine) std::vector<Task> batch_;
   std::size_t next_ = 0;
   std::mutex wakeUpMutex_;
   const WakeUp* wakeUp_ = nullptr;

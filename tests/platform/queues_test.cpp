@@ -97,7 +97,7 @@ TEST(MainQueue, KeepsItsOrderWhenATaskServesItToo) {
     ran.push_back(4);
   });
   queue.async([&] { ran.push_back(2); });
-  EXPECT_EQ(queue.runBatch(), 1U);
+  EXPECT_EQ(queue.runBatch(), 2U);
   EXPECT_EQ(ran, (std::vector{2, 3, 4}));
   EXPECT_EQ(queue.runBatch(), 0U);
 }
