@@ -47,8 +47,8 @@ Outcome playRecording(const std::optional<std::string>& path,
       fail("vesk: " + *recording.failure());
       return outcome;
     }
-    service =
-        std::make_shared<corvik::RecordedService>(std::move(recording), clock, corvik::Playback{.speed = std::nullopt});
+    const corvik::Playback playback{.speed = std::nullopt, .isOnMainThread = true};
+    service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, playback);
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
       if (failure) fail("vesk: " + *failure);

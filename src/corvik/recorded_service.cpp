@@ -5,6 +5,8 @@
 #include <poll.h>
 #include <utility>
 
+#include "platform/main_queue.h"
+
 namespace corvik {
 
 namespace {
@@ -13,6 +15,10 @@ using vesk::Clock;
 
 /// Longer waits are never meant; beyond this a time would not fit the clock.
 constexpr double kLongestWait = 1e9;
+
+/// How much the main thread plays at a time, in lines and in bytes of payload.
+constexpr int kLinesAtATime = 64;
+constexpr std::size_t kBytesAtATime = std::size_t{64} << 10;
 
 }  // namespace
 
@@ -40,7 +46,19 @@ void RecordedService::setPhase(PlaybackState::Phase phase) {
 }
 
 void RecordedService::start(EventStream& events) {
+  if (playback_.isOnMainThread) {
+    turn_ = std::make_shared<std::monostate>();
+    vesk::MainQueue::shared().async([this, turn = std::weak_ptr(turn_), &events] {
+      if (!turn.expired() && begin({}, events)) scheduleSome(events);
+    });
+    return;
+  }
   thread_ = std::jthread([this, &events](const std::stop_token& stop) { play(stop, events); });
+}
+
+void RecordedService::stop() {
+  turn_.reset();
+  endThread();
 }
 
 void RecordedService::endThread() {
@@ -56,22 +74,45 @@ Result RecordedService::answer(const MetricQuery&, EventStream&) {
 }
 
 void RecordedService::play(const std::stop_token& stop, EventStream& events) {
-  if (state().phase == PlaybackState::Phase::ended || !events.waitUntilWanted(stop)) return;
+  if (!begin(stop, events)) return;
+  while (playNext(stop, events) && events.waitUntilWanted(stop)) {
+  }
+}
+
+void RecordedService::scheduleSome(EventStream& events) {
+  vesk::MainQueue::shared().async([this, turn = std::weak_ptr(turn_), &events] {
+    if (!turn.expired() && playSome(events)) scheduleSome(events);
+  });
+}
+
+bool RecordedService::playSome(EventStream& events) {
+  bytesPlayed_ = 0;
+  for (int lines = 0; lines < kLinesAtATime && bytesPlayed_ < kBytesAtATime; ++lines) {
+    if (!playNext({}, events)) return false;
+  }
+  return true;
+}
+
+bool RecordedService::begin(const std::stop_token& stop, EventStream& events) {
+  if (state().phase == PlaybackState::Phase::ended || !events.waitUntilWanted(stop)) return false;
   if (!due_) due_ = clock_.now();
   setPhase(PlaybackState::Phase::playing);
-  do {
-    RecordingReader::Step step = recording_.next();
-    if (stop.stop_requested()) return;
-    if (const auto* event = std::get_if<RecordedEvent>(&step)) {
-      if (!waitUntil(event->at, stop)) return;
-      playEvent(*event, events);
-    } else if (auto* bad = std::get_if<BadLine>(&step)) {
-      tellBadLine(std::move(bad->message), events);
-    } else if (!startAgain()) {
-      end(events);
-      return;
-    }
-  } while (events.waitUntilWanted(stop));
+  return true;
+}
+
+bool RecordedService::playNext(const std::stop_token& stop, EventStream& events) {
+  RecordingReader::Step step = recording_.next();
+  if (stop.stop_requested()) return false;
+  if (const auto* event = std::get_if<RecordedEvent>(&step)) {
+    if (!waitUntil(event->at, stop)) return false;
+    playEvent(*event, events);
+  } else if (auto* bad = std::get_if<BadLine>(&step)) {
+    tellBadLine(std::move(bad->message), events);
+  } else if (!startAgain()) {
+    end(events);
+    return false;
+  }
+  return true;
 }
 
 bool RecordedService::waitForInput(int descriptor) {
@@ -101,6 +142,7 @@ bool RecordedService::waitUntil(double at, const std::stop_token& stop) {
 
 void RecordedService::playEvent(const RecordedEvent& event, EventStream& events) {
   ++eventsOfLap_;
+  bytesPlayed_ += event.payload.size();
   {
     const std::lock_guard lock(mutex_);
     next_.reset();

@@ -23,8 +23,8 @@ Result checkConfiguration(const vesk::InterProcessDictionary& message) {
 vesk::InterProcessDictionary makeMetricEvent(std::int64_t metricId, std::span<const std::uint8_t> payload) {
   vesk::InterProcessDictionary event;
   event.reserve(2);
-  event.setInteger(kKeyMetricID, metricId);
-  event.setData(kKeyPayload, vesk::Data::copy(payload));
+  event.appendInteger(kKeyMetricID, metricId);
+  event.appendData(kKeyPayload, vesk::Data::copy(payload));
   return event;
 }
 

@@ -22,6 +22,9 @@ class InterProcessDictionary {
   void setInteger(Text key, std::int64_t value) { setValue(std::move(key), value); }
   void setData(Text key, Data value) { setValue(std::move(key), std::move(value)); }
   void setDescriptor(Text key, FileDescriptor descriptor);
+  /// These add a value under a key that the dictionary does not hold yet, without looking.
+  void appendInteger(Text key, std::int64_t value) { values_.append(std::move(key), value); }
+  void appendData(Text key, Data value) { values_.append(std::move(key), std::move(value)); }
 
   [[nodiscard]] std::size_t size() const { return values_.size() + descriptors_.size(); }
   [[nodiscard]] bool empty() const { return size() == 0; }

@@ -83,7 +83,10 @@ class RecordedServiceTest : public testing::Test {
   std::shared_ptr<client::Manager> manager_;
 };
 
-TEST_F(RecordedServiceTest, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) {
+class RecordedServiceOnEitherThread : public RecordedServiceTest, public testing::WithParamInterface<bool> {};
+INSTANTIATE_TEST_SUITE_P(IsOnMainThread, RecordedServiceOnEitherThread, testing::Bool());
+
+TEST_P(RecordedServiceOnEitherThread, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) {
   std::string recording;
   Ids expected;
   for (int id = 0; id < 5000; ++id) {
@@ -91,7 +94,7 @@ TEST_F(RecordedServiceTest, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) {
     expected.push_back(id);
     if (id == 2) recording += "bad\n";
   }
-  connect(vesk::fileWith(recording), {std::nullopt, false});
+  connect(vesk::fileWith(recording), {std::nullopt, false, GetParam()});
   loop_.run();
   EXPECT_TRUE(isEnded_);
   EXPECT_EQ(ids_, expected);
@@ -103,6 +106,21 @@ TEST_F(RecordedServiceTest, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) {
   EXPECT_EQ(state.duration, 49990.0);
   EXPECT_EQ(state.events, 5000U);
   EXPECT_EQ(state.badLines, 1U);
+}
+
+TEST_P(RecordedServiceOnEitherThread, PlaysNothingOnceItsClientHasGone) {
+  std::string recording;
+  for (int id = 0; id < 5000; ++id)
+    recording += line(0, id);
+  connect(vesk::fileWith(recording), {std::nullopt, true, GetParam()});
+  stopAfter_ = 100;
+  loop_.run();
+  manager_.reset();
+  loop_.runDue();
+  const std::size_t taken = ids_.size();
+  loop_.runDue();
+  EXPECT_EQ(ids_.size(), taken);
+  EXPECT_FALSE(isEnded_);
 }
 
 TEST_F(RecordedServiceTest, KeepsTheRecordingsPaceAndDoesNotWaitForAStepBack) {
