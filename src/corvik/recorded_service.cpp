@@ -48,9 +48,7 @@ void RecordedService::setPhase(PlaybackState::Phase phase) {
 void RecordedService::start(EventStream& events) {
   if (playback_.isOnMainThread) {
     turn_ = std::make_shared<std::monostate>();
-    vesk::MainQueue::shared().async([this, turn = std::weak_ptr(turn_), &events] {
-      if (!turn.expired() && begin({}, events)) scheduleSome(events);
-    });
+    schedule(&RecordedService::begin, events);
     return;
   }
   thread_ = std::jthread([this, &events](const std::stop_token& stop) { play(stop, events); });
@@ -79,16 +77,16 @@ void RecordedService::play(const std::stop_token& stop, EventStream& events) {
   }
 }
 
-void RecordedService::scheduleSome(EventStream& events) {
-  vesk::MainQueue::shared().async([this, turn = std::weak_ptr(turn_), &events] {
-    if (!turn.expired() && playSome(events)) scheduleSome(events);
+void RecordedService::schedule(Step step, EventStream& events) {
+  vesk::MainQueue::shared().async([this, step, turn = std::weak_ptr(turn_), &events] {
+    if (!turn.expired() && (this->*step)({}, events)) schedule(&RecordedService::playSome, events);
   });
 }
 
-bool RecordedService::playSome(EventStream& events) {
+bool RecordedService::playSome(const std::stop_token& stop, EventStream& events) {
   bytesPlayed_ = 0;
   for (int lines = 0; lines < kLinesAtATime && bytesPlayed_ < kBytesAtATime; ++lines) {
-    if (!playNext({}, events)) return false;
+    if (!playNext(stop, events)) return false;
   }
   return true;
 }

@@ -80,12 +80,13 @@ class RecordedService final : public Service {
 
   void endThread();
   void setPhase(PlaybackState::Phase phase);
-  /// Has the main thread play some events, and then some more.
-  void scheduleSome(EventStream& events);
+  using Step = bool (RecordedService::*)(const std::stop_token& stop, EventStream& events);
+  /// Has the main thread take `step`, and then play some events after others.
+  void schedule(Step step, EventStream& events);
 
   /// These run on the service's thread, or on the main one in its place; false when there is nothing more to play.
   void play(const std::stop_token& stop, EventStream& events);
-  [[nodiscard]] bool playSome(EventStream& events);
+  [[nodiscard]] bool playSome(const std::stop_token& stop, EventStream& events);
   [[nodiscard]] bool begin(const std::stop_token& stop, EventStream& events);
   [[nodiscard]] bool playNext(const std::stop_token& stop, EventStream& events);
   [[nodiscard]] bool waitForInput(int descriptor);

@@ -1,9 +1,17 @@
 #include "platform/clock.h"
 
+#include <algorithm>
 #include <cerrno>
+#include <limits>
 #include <poll.h>
 
 namespace vesk {
+
+int pollTimeout(Clock::Duration left) {
+  using std::chrono::milliseconds;
+  const milliseconds::rep wait = std::chrono::ceil<milliseconds>(left).count();
+  return static_cast<int>(std::clamp<milliseconds::rep>(wait, 0, std::numeric_limits<int>::max()));
+}
 
 void SteadyClock::sleepUntil(Instant instant, const WakeUp& interrupt) const {
   for (;;) {

@@ -19,6 +19,10 @@ class Clock {
   virtual void sleepUntil(Instant instant, const WakeUp& interrupt) const = 0;
 };
 
+/// How long poll(2) has to wait for what lies `left` ahead: in milliseconds, rounded up, for waking before the time
+/// would mean a round for nothing; 0 for what has come.
+[[nodiscard]] int pollTimeout(Clock::Duration left);
+
 /// The system's monotonic clock.
 class SteadyClock : public Clock {
  public:

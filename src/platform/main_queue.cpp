@@ -32,12 +32,8 @@ std::size_t MainQueue::runBatch() {
 
 std::size_t MainQueue::runRest() {
   const std::size_t begun = next_;
-  while (next_ < batch_.size()) {
-    Task& task = batch_[next_++];
-    task();
-    // What the task holds goes before the next one runs.
-    task = Task();
-  }
+  while (next_ < batch_.size())
+    batch_[next_++].runOnce();
   return next_ - begun;
 }
 

@@ -5,12 +5,12 @@
 #include <climits>
 #include <csignal>
 #include <cstring>
-#include <limits>
 #include <poll.h>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <utility>
 
+#include "platform/clock.h"
 #include "platform/file.h"
 #include "platform/visible_text.h"
 
@@ -33,14 +33,6 @@ std::unique_ptr<OutputSink>& sinkInForce() {
 
 /// Milliseconds.
 constexpr int kUntilAskedAgain = 10;
-
-/// Milliseconds in poll(2)'s manner.
-int waitUntil(std::optional<std::chrono::steady_clock::time_point> end) {
-  if (!end) return -1;
-  using std::chrono::milliseconds;
-  const auto left = std::chrono::ceil<milliseconds>(*end - std::chrono::steady_clock::now()).count();
-  return static_cast<int>(std::clamp<milliseconds::rep>(left, 0, std::numeric_limits<int>::max()));
-}
 
 }  // namespace
 
@@ -99,7 +91,8 @@ DescriptorSink::Room DescriptorSink::waitForRoom(std::optional<Instant> end, boo
   pollfd polled[] = {{wasRefused ? -1 : descriptor_, POLLOUT, 0},
                      {interrupt_ != nullptr ? interrupt_->descriptor() : -1, POLLIN, 0}};
   for (;;) {
-    const int count = poll(polled, std::size(polled), wasRefused ? kUntilAskedAgain : waitUntil(end));
+    const int untilEnd = end ? pollTimeout(*end - std::chrono::steady_clock::now()) : -1;
+    const int count = poll(polled, std::size(polled), wasRefused ? kUntilAskedAgain : untilEnd);
     if (polled[0].revents != 0) return Room::some;
     if (polled[1].revents != 0) return Room::interrupted;
     if (end && std::chrono::steady_clock::now() >= *end) return Room::neverAgain;

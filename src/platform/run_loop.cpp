@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cassert>
-#include <limits>
 #include <poll.h>
 #include <span>
 #include <utility>
@@ -91,9 +90,7 @@ int RunLoop::timeUntilNextTimer() const {
     if (isTicking(*timer)) next = std::min(next.value_or(timer->due), timer->due);
   }
   if (!next) return -1;
-  // Rounded up: waking before the time would mean a round for nothing.
-  const auto left = std::chrono::ceil<std::chrono::milliseconds>(*next - clock_.now()).count();
-  return static_cast<int>(std::clamp<std::int64_t>(left, 0, std::numeric_limits<int>::max()));
+  return pollTimeout(*next - clock_.now());
 }
 
 bool RunLoop::serveInputs(int timeout) {

@@ -14,6 +14,7 @@
 #include <unistd.h>
 #include <utility>
 
+#include "platform/clock.h"
 #include "platform/file.h"
 #include "platform/visible_text.h"
 
@@ -64,19 +65,23 @@ class DescriptorLogSink : public LogSink {
     using std::chrono::steady_clock;
     const auto deadline = steady_clock::now() + (dropped_ > 0 ? std::chrono::milliseconds(0) : patience_);
     while (!bytes.empty()) {
-      const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - steady_clock::now());
-      pollfd polled{descriptor_.get(), POLLOUT, 0};
-      ssize_t written = poll(&polled, 1, static_cast<int>(std::max<std::int64_t>(0, left.count())));
-      if (written > 0) {
-        written = ::write(descriptor_.get(), bytes.data(), std::min<std::size_t>(bytes.size(), PIPE_BUF));
-      }
+      const int wait = pollTimeout(deadline - steady_clock::now());
+      const ssize_t written = writeWithin(wait, bytes);
       if (written > 0) {
         bytes.remove_prefix(static_cast<std::size_t>(written));
-      } else if (left.count() <= 0 || (written < 0 && errno != EINTR && errno != EAGAIN)) {
+      } else if (wait == 0 || (written < 0 && errno != EINTR && errno != EAGAIN)) {
         break;
       }
     }
     return bytes.size();
+  }
+
+  /// write(2), of some of the bytes, once there is room; 0 when there is none within that many milliseconds.
+  [[nodiscard]] ssize_t writeWithin(int milliseconds, std::string_view bytes) const {
+    pollfd polled{descriptor_.get(), POLLOUT, 0};
+    const int ready = poll(&polled, 1, milliseconds);
+    if (ready <= 0) return ready;
+    return ::write(descriptor_.get(), bytes.data(), std::min<std::size_t>(bytes.size(), PIPE_BUF));
   }
 
   FileDescriptor descriptor_;

@@ -44,6 +44,11 @@ class Task {
 
   /// Must hold something.
   void operator()() { operations_->run(room_); }
+  /// Runs it for the last time: what it holds goes before anything else runs.
+  void runOnce() {
+    (*this)();
+    reset();
+  }
   explicit operator bool() const { return operations_ != nullptr; }
 
  private:

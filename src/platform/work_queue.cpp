@@ -35,11 +35,8 @@ void WorkQueue::serve() {
 void WorkQueue::runPending() {
   if (pending_.isEmpty()) return;
   pending_.take(batch_);
-  for (Task& task : batch_) {
-    task();
-    // What the task holds goes before the next one runs.
-    task = Task();
-  }
+  for (Task& task : batch_)
+    task.runOnce();
   batch_.clear();
 }
 

@@ -160,9 +160,9 @@ void TerminalDevice::waitForTerminal() {
   using std::chrono::steady_clock;
   const steady_clock::time_point deadline = steady_clock::now() + kPatience;
   while (isBehind()) {
-    const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - steady_clock::now());
+    const int wait = pollTimeout(deadline - steady_clock::now());
     pollfd polled{terminal_.get(), POLLOUT, 0};
-    if (left.count() <= 0 || poll(&polled, 1, static_cast<int>(left.count())) == 0) unwritten_.clear();
+    if (wait == 0 || poll(&polled, 1, wait) == 0) unwritten_.clear();
     writeOn();
   }
 }
