@@ -10,6 +10,7 @@ namespace {
 template <class Element, class Owner>
 std::vector<const Element*> all(const Owner& owner, int count, const Element* (Owner::*at)(int) const) {
   std::vector<const Element*> elements;
+  elements.reserve(static_cast<std::size_t>(count));
   for (int index = 0; index < count; ++index)
     elements.push_back((owner.*at)(index));
   return elements;
