@@ -11,12 +11,11 @@ build     g++                 g++
 build     rapidjson-dev       /usr/include/rapidjson/reader.h
 build     libcli11-dev        /usr/include/CLI/CLI.hpp
 build     libncurses-dev      /usr/include/ncursesw/curses.h
+build     protobuf-compiler   protoc
+build     libprotobuf-dev     /usr/include/google/protobuf/message.h
+build     libprotoc-dev       /usr/include/google/protobuf/compiler/plugin.h
 test      libgtest-dev        /usr/include/gtest/gtest.h
-test      protobuf-compiler   protoc
-test      libprotobuf-dev     /usr/include/google/protobuf/message.h
 bench     libbenchmark-dev    /usr/include/benchmark/benchmark.h
-bench     libprotobuf-dev     /usr/include/google/protobuf/message.h
-bench     protobuf-compiler   protoc
 bench     libprotozero-dev    /usr/include/protozero/pbf_reader.hpp
 bench     valgrind            valgrind
 clang     clang               clang++
