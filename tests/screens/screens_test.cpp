@@ -32,13 +32,7 @@ class Screens : public testing::Test {
   Screens() {
     setenv("TZ", "UTC", 1);
     tzset();
-    const auto fresh = MetricValidator::listeningTo(nullptr);
-    for (const auto& [name, record] : kLatestRecords)
-      (*intake).*record = (*fresh).*record;
-    intake->myLTE = fresh->myLTE;
-    intake->myUMTS = fresh->myUMTS;
-    intake->myGSM = fresh->myGSM;
-    intake->myCommon = fresh->myCommon;
+    intake->stores = {};
   }
 
   static std::shared_ptr<SecondLevelViewController> open(std::string_view area, std::string_view category) {
@@ -130,20 +124,20 @@ TEST_F(Screens, EveryPairShowsItsSourceBeforeAnyEvent) {
 }
 
 TEST_F(Screens, ShowWhatTheStoresHold) {
-  intake->myUMTS.TxPower.clear();
-  intake->myUMTS.TxPower.append({{"pucch_tx_power"_text, -5}, {"timestamp"_text, "now"_text}});
-  intake->myUMTS.TxPower.append({{"pusch_tx_power"_text, 2.5F}});
+  intake->stores.myUMTS.TxPower.clear();
+  intake->stores.myUMTS.TxPower.append({{"pucch_tx_power"_text, -5}, {"timestamp"_text, "now"_text}});
+  intake->stores.myUMTS.TxPower.append({{"pusch_tx_power"_text, 2.5F}});
   EXPECT_EQ(shown(*open("UMTS", "Tx Power")),
             "[TxPowerInfo 0] pucch_tx_power=-5 timestamp=now[TxPowerInfo 1] pusch_tx_power=2.5");
   EXPECT_EQ(shown(*open("LTE", "Tx Power")), "[TxPowerInfo 0] Waiting for Update=Waiting for Update");
 
-  intake->myLTE.RsrpRsrqSinr.clear();
+  intake->stores.myLTE.RsrpRsrqSinr.clear();
   EXPECT_EQ(shown(*open("LTE", "Serving Cell Meas")), "[-]");
   for (const int rsrp : {-95, -96, -97})
-    intake->myLTE.RsrpRsrqSinr.append({{"rsrp0"_text, rsrp}});
+    intake->stores.myLTE.RsrpRsrqSinr.append({{"rsrp0"_text, rsrp}});
   EXPECT_EQ(shown(*open("LTE", "Serving Cell Meas")), "[-] rsrp0=-95");
 
-  intake->myGSM.geraNbrMeas.clear();
+  intake->stores.myGSM.geraNbrMeas.clear();
   EXPECT_EQ(shown(*open("GSM", "GSM Neighbor Cell Meas")), "");
 
   KCellularGsmGprsConfig gprs;
@@ -153,12 +147,12 @@ TEST_F(Screens, ShowWhatTheStoresHold) {
 }
 
 TEST_F(Screens, ASourceThatShrinksAfterTheCountGivesEmptyRows) {
-  intake->myLTE.TxPower.clear();
-  intake->myLTE.TxPower.append({{"a"_text, 1}, {"b"_text, 2}});
-  intake->myLTE.TxPower.append({{"c"_text, 3}});
+  intake->stores.myLTE.TxPower.clear();
+  intake->stores.myLTE.TxPower.append({{"a"_text, 1}, {"b"_text, 2}});
+  intake->stores.myLTE.TxPower.append({{"c"_text, 3}});
   const auto screen = open("LTE", "Tx Power");
-  intake->myLTE.TxPower.clear();
-  intake->myLTE.TxPower.append({{"a"_text, 9}});
+  intake->stores.myLTE.TxPower.clear();
+  intake->stores.myLTE.TxPower.append({{"a"_text, 9}});
   EXPECT_EQ(shown(*screen), "[TxPowerInfo 0] a=9 -=-[TxPowerInfo 1] -=-");
   screen->tableView().reloadData();
   EXPECT_EQ(shown(*screen), "[TxPowerInfo 0] a=9");
