@@ -23,7 +23,7 @@ class DateFormat {
   [[nodiscard]] bool writeHourOf(std::time_t instant);
 
   std::string text_;
-  /// text_ holds from begin_ to before end_, but for its minutes and seconds. Instants come in clusters: this saves 0 %
+  /// text_ holds from begin_ to before end_, but for its minutes and seconds. Instants come in clusters: this saves 7 %
   /// of the instructions of `vesk stores`.
   std::time_t begin_ = 0;
   std::time_t end_ = 0;
