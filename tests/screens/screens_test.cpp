@@ -6,9 +6,7 @@
 #include <vector>
 
 #include "intake/metric_validator.h"
-#include "messages/gsm/gsm.h"
 #include "messages/lte/lte.h"
-#include "messages/wcdma/wcdma.h"
 #include "screens/detail_text.h"
 #include "screens/first_level_view_controller.h"
 #include "screens/second_level_view_controller.h"
@@ -20,6 +18,7 @@
 #include "system/main_queue.h"
 #include "system/run_loop.h"
 #include "toolkit/system_appearance.h"
+#include "values/text_form.h"
 
 namespace vesk {
 namespace {
@@ -69,81 +68,91 @@ class Screens : public testing::Test {
   std::shared_ptr<MetricValidator> intake = MetricValidator::shared();
 };
 
-TEST_F(Screens, TheMenuHasItsCategories) {
-  const VeskViewItems items;
-  const std::vector<std::size_t> counts{3, 13, 15, 11};
-  ASSERT_EQ(items.launchViewItemNames.size(), counts.size());
-  EXPECT_EQ(items.firstLevelViewItems.size(), counts.size());
-  for (std::size_t area = 0; area < counts.size(); ++area) {
-    EXPECT_EQ(items.categoriesOf(items.launchViewItemNames[area].view()).size(), counts[area]);
-  }
-  EXPECT_EQ(items.categoriesOf("GSM")[6], "GSM GPRS Config");
-  EXPECT_TRUE(items.categoriesOf("gsm").empty());
-}
-
-TEST_F(Screens, EveryPairShowsItsSourceBeforeAnyEvent) {
-  std::size_t pairs = 0;
-  std::string kinds;
+TEST_F(Screens, EveryCategoryShowsItsSourceInTheOrderOfTheMenu) {
+  int number = 0;
+  visitTechnologyFields(intake->stores, [&](std::string_view name, auto& field) {
+    const Record record{{Text::copy(name), ++number}};
+    if constexpr (std::is_same_v<decltype(field), RecordList&>) {
+      field.clear();
+      field.append(record);
+      field.append({});
+    } else {
+      field = record;
+    }
+  });
+  visitLatestRecords(intake->stores, [](std::string_view name, LatestRecord& record) {
+    record = Record{{Text::copy(name), "latest"_text}};
+  });
+  std::string all;
   for (const Text& area : VeskViewItems::shared().launchViewItemNames) {
     for (const Text& category : VeskViewItems::shared().categoriesOf(area.view())) {
-      ++pairs;
-      SCOPED_TRACE(std::string(area.view()) + " " + std::string(category.view()));
-      const CategorySource& source = sourceOf(area.view(), category.view());
-      const std::string text = shown(*open(area.view(), category.view()));
-      switch (source.kind) {
-        case SourceKind::metricRecord:
-          kinds += 'D';
-          EXPECT_EQ(text, "[-] -=-");
-          break;
-        case SourceKind::storeRecord:
-          kinds += 'S';
-          EXPECT_TRUE(text.starts_with("[-] timestamp= ")) << text;
-          break;
-        case SourceKind::storeList:
-          kinds += 'L';
-          EXPECT_TRUE(source.headerPrefix.ends_with(' '));
-          EXPECT_EQ(text, "[" + std::string(source.headerPrefix) + "0] Waiting for Update=Waiting for Update");
-          break;
-        case SourceKind::firstElement:
-          kinds += 'F';
-          EXPECT_EQ(text, "[-] Waiting for Update=Waiting for Update");
-          break;
-        case SourceKind::placeholder:
-          kinds += 'P';
-          EXPECT_EQ(text, "[-] Come back later=Come back later");
-          EXPECT_FALSE(source.metric.has_value());
-          break;
-      }
+      all += std::string(area.view()) + ", " + std::string(category.view()) + ": ";
+      all += shown(*open(area.view(), category.view())) + " of ";
+      appendUpperHex(all, static_cast<std::uint64_t>(sourceOf(area.view(), category.view()).metric.value_or(0)));
+      all += '\n';
     }
   }
-  EXPECT_EQ(pairs, 42U);
-  EXPECT_EQ(kinds, "PPLDDDFLSLDLLLLLDDDDDLLSLLLLLLLDDDDDDDLLLL");
-  EXPECT_EQ(output.lines(), std::vector<std::string>{"You are screwed"});
-  EXPECT_EQ(shown(*open("LTE", "Tx Powers")), "[-] Come back later=Come back later");
-  EXPECT_EQ(shown(*open("", "")), "[-] Come back later=Come back later");
+  EXPECT_EQ(all, R"(Device Info, IMSI: [-] Come back later=Come back later of 0
+Device Info, IMEISV: [-] Come back later=Come back later of 0
+Device Info, SIM Files: [SIM Content 0] simContents=24[SIM Content 1] of 3C0013
+LTE, NAS: [-] myLTEEMMContextDict=latest of 3CD50C
+LTE, RRC State: [-] myLTERRCStateDict=latest of 3C4E04
+LTE, Serving Cell Info: [-] myLTESCellInfoDict=latest of 3C40C2
+LTE, Serving Cell Meas: [-] RsrpRsrqSinr=3 of 3C4F6A
+LTE, Tx Power: [TxPowerInfo 0] TxPower=4[TxPowerInfo 1] of 3CD302
+LTE, Sel Resel Parameters: [-] SelReselCellInfo=1 of 3CD30E
+LTE, EUTRA Neighbor Info: [EUTRA Neighbor 0] EutraNbrs=2[EUTRA Neighbor 1] of 3CD30E
+LTE, C-DRX: [-] myLTECDRXConfigDict=latest of 3C4E18
+LTE, LTE Neighbor Cell Meas: [LTE Neighbor 0] EutraNbrsMeas=5[LTE Neighbor 1] of 3CD30F
+LTE, UMTS Neighbor Cell Meas: [UMTS Neighbor 0] UtraNbrsMeas=6[UMTS Neighbor 1] of 3CD310
+LTE, GSM Neighbor Cell Meas: [GSM Neighbor 0] GeraNbrsMeas=7[GSM Neighbor 1] of 3CD310
+LTE, CA Status: [Component Carrier 0] CAStatusList=8[Component Carrier 1] of 3CD313
+LTE, Active Bearers: [PDP 0] activeBearer=23[PDP 1] of 3CD50D
+UMTS, NAS GMM: [-] myGMMContextDict=latest of 3CD50B
+UMTS, NAS MM: [-] myMMContextDict=latest of 3CD50A
+UMTS, RRC State: [-] myUMTSRRCStateDict=latest of 3CD112
+UMTS, RRC Configuration: [-] myUMTSRRCConfigDict=latest of 3CD113
+UMTS, Serving Cell Info: [-] myUMTSCellInfoDict=latest of 3C300C
+UMTS, Serving Cell Meas: [RxInfo 0] rXInfo=11[RxInfo 1] of 3CD102
+UMTS, Tx Power: [TxPowerInfo 0] TxPower=12[TxPowerInfo 1] of 3CD103
+UMTS, Sel Resel Parameters: [-] SelReselCellInfo=13 of 3CD104
+UMTS, EUTRA Neighbor Info: [EUTRA Neighbor 0] eUtraNbrs=14[EUTRA Neighbor 1] of 3CD104
+UMTS, UTRA Neighbor Info: [UTRA Neighbor 0] utraNbrs=15[UTRA Neighbor 1] of 3CD104
+UMTS, GSM Neighbor Info: [GSM Neighbor 0] geraNbrs=16[GSM Neighbor 1] of 3CD104
+UMTS, LTE Neighbor Cell Meas: [LTE Neighbor 0] eUtraNbrMeas=17[LTE Neighbor 1] of 3CD105
+UMTS, UMTS Neighbor Cell Meas: [UMTS Neighbor 0] utraNbrMeas=18[UMTS Neighbor 1] of 3CD105
+UMTS, GSM Neighbor Cell Meas: [GSM Neighbor 0] geraNbrMeas=19[GSM Neighbor 1] of 3CD105
+UMTS, Active Bearers: [PDP 0] activeBearer=23[PDP 1] of 3CD50D
+GSM, NAS GMM: [-] myGMMContextDict=latest of 3CD50B
+GSM, NAS MM: [-] myMMContextDict=latest of 3CD50A
+GSM, Serving Cell Info: [-] myGSMScellInfoDict=latest of 3C2E0C
+GSM, Idle Config: [-] myGSMIdleConfigInfoDict=latest of 3CD001
+GSM, Idle Serv Cell Meas: [-] myGSMIdleScellMeasDict=latest of 3CD002
+GSM, Connected Serv Cell Meas: [-] myGSMConnRfMeasDict=latest of 3CD003
+GSM, GSM GPRS Config: [-] myGSMGPRSConfigDict=latest of 3CD00C
+GSM, LTE Neighbor Cell Meas: [LTE Neighbor 0] eUtraNbrMeas=20[LTE Neighbor 1] of 3CD009
+GSM, UMTS Neighbor Cell Meas: [UMTS Neighbor 0] utraNbrMeas=21[UMTS Neighbor 1] of 3CD009
+GSM, GSM Neighbor Cell Meas: [GSM Neighbor 0] geraNbrMeas=22[GSM Neighbor 1] of 3CD009
+GSM, Active Bearers: [PDP 0] activeBearer=23[PDP 1] of 3CD50D
+)");
 }
 
-TEST_F(Screens, ShowWhatTheStoresHold) {
-  intake->stores.myUMTS.TxPower.clear();
-  intake->stores.myUMTS.TxPower.append({{"pucch_tx_power"_text, -5}, {"timestamp"_text, "now"_text}});
-  intake->stores.myUMTS.TxPower.append({{"pusch_tx_power"_text, 2.5F}});
-  EXPECT_EQ(shown(*open("UMTS", "Tx Power")),
-            "[TxPowerInfo 0] pucch_tx_power=-5 timestamp=now[TxPowerInfo 1] pusch_tx_power=2.5");
+TEST_F(Screens, ShowPlaceholdersBeforeAnyEvent) {
+  for (const CategorySource& source : categorySources()) {
+    const std::string text = shown(*open(source.area, source.category));
+    EXPECT_TRUE(text == "[-] -=-" || text.find("Waiting for Update=Waiting for Update") != std::string::npos ||
+                text == "[-] Come back later=Come back later" || text.starts_with("[-] timestamp= "))
+        << text;
+  }
+  EXPECT_EQ(output.lines(), std::vector<std::string>{"You are screwed"}) << "said for the serving cell of LTE alone";
+  EXPECT_EQ(shown(*open("LTE", "Serving Cell Info")), "[-] -=-");
   EXPECT_EQ(shown(*open("LTE", "Tx Power")), "[TxPowerInfo 0] Waiting for Update=Waiting for Update");
-
+  EXPECT_EQ(shown(*open("Device Info", "IMSI")), "[-] Come back later=Come back later");
+  EXPECT_EQ(shown(*open("LTE", "Tx Powers")), "[-] Come back later=Come back later");
   intake->stores.myLTE.RsrpRsrqSinr.clear();
   EXPECT_EQ(shown(*open("LTE", "Serving Cell Meas")), "[-]");
-  for (const int rsrp : {-95, -96, -97})
-    intake->stores.myLTE.RsrpRsrqSinr.append({{"rsrp0"_text, rsrp}});
-  EXPECT_EQ(shown(*open("LTE", "Serving Cell Meas")), "[-] rsrp0=-95");
-
-  intake->stores.myGSM.geraNbrMeas.clear();
-  EXPECT_EQ(shown(*open("GSM", "GSM Neighbor Cell Meas")), "");
-
-  KCellularGsmGprsConfig gprs;
-  gprs.setRac(7);
-  intake->validateMetric(metricEvent(K_GSM_GPRS_CONFIG, gprs));
-  EXPECT_EQ(shown(*open("GSM", "GSM GPRS Config")), "[-] rac=7");
+  intake->stores.myLTE.TxPower.clear();
+  EXPECT_EQ(shown(*open("LTE", "Tx Power")), "");
 }
 
 TEST_F(Screens, ASourceThatShrinksAfterTheCountGivesEmptyRows) {
@@ -233,6 +242,7 @@ TEST_F(Screens, TheOtherScreensShowTheMenuAndNothing) {
   EXPECT_EQ(shown(first), "[-] IMSI=- IMEISV=- SIM Files=-");
   EXPECT_FALSE(first.tableView().footerView().has_value());
   FirstLevelViewController lost;
+  lost.seguedThroughRow = "gsm"_text;
   lost.loadViewIfNeeded();
   EXPECT_EQ(shown(lost), "[-]");
   ThirdLevelViewController third;
