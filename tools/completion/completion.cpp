@@ -1,5 +1,5 @@
-// completion TEMPLATE OUTPUT: writes the completion for bash: the template, with the menu in place of @menu@, a line for
-// each category: its area, a tab, and its label.
+// completion TEMPLATE OUTPUT: writes the completion for bash: the template, with the menu in place of @menu@, a line
+// for each category: its area, a tab, and its label.
 
 #include <cstdlib>
 #include <fstream>
