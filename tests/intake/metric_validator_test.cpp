@@ -96,18 +96,18 @@ TEST_F(Intake, TakesEachMetricByItsClassIntoItsRecordUnderItsText) {
     ASSERT_NE(metricClass, nullptr);
     EXPECT_EQ(metricClass->name, row.className);
     const RecordedOutput printed;
-    // A timestamp of 1 ms, which all have as their first field.
-    EXPECT_TRUE(intake->validateMetric(metricEvent(row.metric, Data::copy(bytesOf("08 01")))));
+    // A timestamp of 2000 ms, which all have as their first field.
+    EXPECT_TRUE(intake->validateMetric(metricEvent(row.metric, Data::copy(bytesOf("08 D0 0F")))));
     const std::string keepsNumber =
-        row.record == "myLTESelReselDict" || row.record == "myLTERsrpRsrqSinrDict" ? "1" : "";
+        row.record == "myLTESelReselDict" || row.record == "myLTERsrpRsrqSinrDict" ? "2000" : "";
     const bool printsFirst = !keepsNumber.empty() || row.record == "myCellularActiveBearerDict";
-    const std::string shownDate = printsFirst ? "1" : "1970-01-01 00:00:00 UTC";
+    const std::string shownDate = printsFirst ? "2000" : "1970-01-01 00:00:02 UTC";
     EXPECT_TRUE(printed.lines().at(1).starts_with(std::string(row.text) + " {timestamp: " + shownDate))
         << printed.lines().at(1);
     visitLatestRecords(stores, [&](std::string_view name, const LatestRecord& record) {
       if (!record || !filled.insert(name).second) return;
       EXPECT_EQ(name, row.record);
-      EXPECT_EQ(textOf(*record->find("timestamp")), keepsNumber.empty() ? "1970-01-01 00:00:00 UTC" : keepsNumber);
+      EXPECT_EQ(textOf(*record->find("timestamp")), keepsNumber.empty() ? "1970-01-01 00:00:02 UTC" : keepsNumber);
     });
     EXPECT_TRUE(filled.contains(row.record));
   }
