@@ -29,12 +29,12 @@ std::optional<Record> SecondLevelViewController::recordOf(std::size_t section) c
   const CategorySource& from = source();
   switch (from.kind) {
     case SourceKind::metricRecord:
-      return from.latestRecord(*myMetricValidator);
+      return from.latestRecord(myMetricValidator->stores);
     case SourceKind::storeRecord:
-      return from.storeRecord(*myMetricValidator);
+      return from.storeRecord(myMetricValidator->stores);
     case SourceKind::storeList:
     case SourceKind::firstElement: {
-      const RecordList list = from.list(*myMetricValidator);
+      const RecordList list = from.list(myMetricValidator->stores);
       if (section < list.size()) return list[section];
       break;
     }
@@ -62,7 +62,7 @@ void SecondLevelViewController::update() {
 
 std::size_t SecondLevelViewController::numberOfSections() {
   const CategorySource& from = source();
-  return from.kind == SourceKind::storeList ? from.list(*myMetricValidator).size() : 1;
+  return from.kind == SourceKind::storeList ? from.list(myMetricValidator->stores).size() : 1;
 }
 
 std::optional<Text> SecondLevelViewController::headerTitle(std::size_t section) {
