@@ -116,7 +116,7 @@ TEST_F(ClientTest, DeliversInOrderOnItsQueueToTheHandlerRegisteredLast) {
   note(second);
   std::thread::id handlersThread;
   std::thread::id queuesThread;
-  queue_->async([&] { queuesThread = std::this_thread::get_id(); });
+  queue_->post([&] { queuesThread = std::this_thread::get_id(); });
   RegisterEventHandler(manager_, kEventTrigger, [&](const InterProcessDictionary&, const WorkGroup&) {
     handlersThread = std::this_thread::get_id();
     second.push_back(0);
@@ -145,7 +145,7 @@ TEST_F(ClientTest, KeepsEventsWhileTheyAreOff) {
   RegisterEventHandler(manager_, kEventMetric, [&](const InterProcessDictionary&, const WorkGroup&) {
     ids.push_back(0);
     EventsOff(manager_);
-    MainQueue::shared().async([&] { loop_.stop(); });
+    MainQueue::shared().post([&] { loop_.stop(); });
   });
   raise(3);
   raise(4);
@@ -230,7 +230,7 @@ TEST_F(ClientTest, HoldsASourceBackThatIsAheadTheMoreTheLargerItsEventsAre) {
     int received = 0;
     int ahead = 0;
     RegisterEventHandler(manager_, kEventMetric, [&](const InterProcessDictionary&, const WorkGroup&) {
-      MainQueue::shared().async([&] { ahead = std::max(ahead, raised - ++received); });
+      MainQueue::shared().post([&] { ahead = std::max(ahead, raised - ++received); });
     });
     std::jthread source([&, bytes = std::vector<std::uint8_t>(payload)](const std::stop_token& stop) {
       while (raised < kEvents && service_->events->waitUntilWanted(stop)) {

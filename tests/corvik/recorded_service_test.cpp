@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "corvik/client.h"
+#include "recording/recording_reader.h"
 #include "support/input.h"
 #include "support/manual_clock.h"
 #include "system/main_queue.h"
@@ -15,6 +16,7 @@ namespace corvik {
 namespace {
 
 using namespace std::chrono_literals;
+using Runs = RecordedService::Runs;
 using Phase = PlaybackState::Phase;
 
 using Ids = std::vector<std::int64_t>;
@@ -35,8 +37,9 @@ class RecordedServiceTest : public testing::Test {
     loop_.runDue();
   }
 
-  void connect(vesk::FileDescriptor recording, Playback playback) {
-    service_ = std::make_shared<RecordedService>(vesk::RecordingReader(std::move(recording), "r"), clock_, playback);
+  void connect(vesk::FileDescriptor recording, Playback playback, Runs runs = Runs::onThreadOfItsOwn) {
+    auto reader = std::make_unique<vesk::RecordingReader>(std::move(recording), "r");
+    service_ = std::make_shared<RecordedService>(std::move(reader), clock_, playback, runs);
     service_->setBadLineHandler([this](const std::string& message) { badLines_.push_back(message); });
     service_->setEndHandler([this](const std::optional<std::string>& failure) {
       failure_ = failure;
@@ -48,7 +51,7 @@ class RecordedServiceTest : public testing::Test {
     installService(nullptr);
     client::RegisterEventHandler(
         manager_, kEventMetric, [this](const vesk::InterProcessDictionary& event, const client::WorkGroup&) {
-          vesk::MainQueue::shared().async([this, id = event.integer("kKeyMetricID"_text)] { take(id.value()); });
+          vesk::MainQueue::shared().post([this, id = event.integer("kKeyMetricID"_text)] { take(id.value()); });
         });
     client::EventsOn(manager_);
     vesk::InterProcessDictionary configuration;
@@ -83,8 +86,9 @@ class RecordedServiceTest : public testing::Test {
   std::shared_ptr<client::Manager> manager_;
 };
 
-class RecordedServiceOnEitherThread : public RecordedServiceTest, public testing::WithParamInterface<bool> {};
-INSTANTIATE_TEST_SUITE_P(IsOnMainThread, RecordedServiceOnEitherThread, testing::Bool());
+class RecordedServiceOnEitherThread : public RecordedServiceTest, public testing::WithParamInterface<Runs> {};
+INSTANTIATE_TEST_SUITE_P(Runs, RecordedServiceOnEitherThread,
+                         testing::Values(Runs::onThreadOfItsOwn, Runs::onMainThread));
 
 TEST_P(RecordedServiceOnEitherThread, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) {
   std::string recording;
@@ -94,7 +98,7 @@ TEST_P(RecordedServiceOnEitherThread, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) 
     expected.push_back(id);
     if (id == 2) recording += "bad\n";
   }
-  connect(vesk::fileWith(recording), {std::nullopt, false, GetParam()});
+  connect(vesk::fileWith(recording), {std::nullopt, false}, GetParam());
   loop_.run();
   EXPECT_TRUE(isEnded_);
   EXPECT_EQ(ids_, expected);
@@ -112,7 +116,7 @@ TEST_P(RecordedServiceOnEitherThread, PlaysNothingOnceItsClientHasGone) {
   std::string recording;
   for (int id = 0; id < 5000; ++id)
     recording += line(0, id);
-  connect(vesk::fileWith(recording), {std::nullopt, true, GetParam()});
+  connect(vesk::fileWith(recording), {std::nullopt, true}, GetParam());
   stopAfter_ = 100;
   loop_.run();
   manager_.reset();

@@ -66,7 +66,7 @@ class CorvikWrapperTest : public testing::Test {
   /// Waits until the handlers have seen every event raised so far.
   void settleHandlers() {
     std::promise<void> settled;
-    CorvikWrapper::queue().async([&] { settled.set_value(); });
+    CorvikWrapper::queue().post([&] { settled.set_value(); });
     settled.get_future().wait();
   }
   void raise(const Text& event, std::int64_t id) {

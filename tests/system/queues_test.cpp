@@ -34,8 +34,8 @@ TEST(WorkQueue, RunsInOrderAndFinishesWhatItHasBeforeItEnds) {
     WorkQueue queue("org.example.serialQ.queue");
     EXPECT_EQ(queue.label(), "org.example.serialQ.queue");
     for (int number = 0; number < 1000; ++number)
-      queue.async([&ran, number] { ran.push_back(number); });
-    queue.async([&] { queue.async([&] { ran.push_back(-1); }); });
+      queue.post([&ran, number] { ran.push_back(number); });
+    queue.post([&] { queue.post([&] { ran.push_back(-1); }); });
   }
   ASSERT_EQ(ran.size(), 1001U);
   for (int number = 0; number < 1000; ++number)
@@ -49,7 +49,7 @@ TEST(WorkQueue, RunsWorkOnTheThreadThatWaitsForItBehindWhatWasThereAndBesideNoth
   WorkQueue queue("");
   std::vector<int> ran;
   for (int number = 0; number < kEach; ++number)
-    queue.async([&ran, number] { ran.push_back(number); });
+    queue.post([&ran, number] { ran.push_back(number); });
   const auto caller = std::this_thread::get_id();
   queue.sync([&] {
     EXPECT_EQ(std::this_thread::get_id(), caller);
@@ -63,7 +63,7 @@ TEST(WorkQueue, RunsWorkOnTheThreadThatWaitsForItBehindWhatWasThereAndBesideNoth
     for (int thread = 0; thread < kThreads; ++thread) {
       threads.emplace_back([&] {
         for (int number = 0; number < kEach; ++number) {
-          queue.async([&count] { ++count; });
+          queue.post([&count] { ++count; });
           queue.sync([&count] { ++count; });
         }
       });
@@ -75,31 +75,16 @@ TEST(WorkQueue, RunsWorkOnTheThreadThatWaitsForItBehindWhatWasThereAndBesideNoth
 TEST(MainQueue, RunsABatchInOrderAndLeavesWhatItsTasksSchedule) {
   MainQueue queue;
   std::vector<int> ran;
-  queue.async([&] {
+  queue.post([&] {
     ran.push_back(1);
-    queue.async([&] { ran.push_back(3); });
+    queue.post([&] { ran.push_back(3); });
   });
-  queue.async([&] { ran.push_back(2); });
+  queue.post([&] { ran.push_back(2); });
   EXPECT_EQ(queue.runBatch(), 2U);
   EXPECT_EQ(ran, (std::vector{1, 2}));
   EXPECT_EQ(queue.runBatch(), 1U);
   EXPECT_EQ(ran, (std::vector{1, 2, 3}));
   EXPECT_TRUE(queue.isEmpty());
-}
-
-TEST(MainQueue, KeepsItsOrderWhenATaskServesItToo) {
-  MainQueue queue;
-  std::vector<int> ran;
-  queue.async([&] {
-    queue.async([&] { ran.push_back(3); });
-    EXPECT_EQ(queue.runBatch(), 1U);
-    EXPECT_EQ(queue.runBatch(), 1U);
-    ran.push_back(4);
-  });
-  queue.async([&] { ran.push_back(2); });
-  EXPECT_EQ(queue.runBatch(), 2U);
-  EXPECT_EQ(ran, (std::vector{2, 3, 4}));
-  EXPECT_EQ(queue.runBatch(), 0U);
 }
 
 TEST(MainQueue, HoldsASourceThatIsAheadUntilTasksAreTakenOrItShallStop) {
@@ -110,14 +95,14 @@ TEST(MainQueue, HoldsASourceThatIsAheadUntilTasksAreTakenOrItShallStop) {
   std::jthread source([&](const std::stop_token& stop) {
     for (int event = 0; event < kEvents; ++event) {
       ASSERT_TRUE(queue.waitUntilFewerThan(kMost, stop));
-      queue.async([&ran] { ++ran; });
+      queue.post([&ran] { ++ran; });
     }
   });
   while (ran < kEvents)
     EXPECT_LE(queue.runBatch(), kMost);
   source.join();
 
-  queue.async([] {});
+  queue.post([] {});
   bool wasRoom = true;
   std::jthread stopped([&](const std::stop_token& stop) { wasRoom = queue.waitUntilFewerThan(1, stop); });
   stopped.request_stop();

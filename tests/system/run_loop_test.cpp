@@ -72,7 +72,7 @@ TEST_F(RunLoopTest, ServesInputsAndTimersWhileTasksKeepComing) {
   Pipe keys;
   std::string served;
   std::function<void()> again = [&] {
-    if (served.size() < 2) queue_.async([&] { again(); });
+    if (served.size() < 2) queue_.post([&] { again(); });
   };
   again();
   writeAll(keys.writing, "k");
@@ -117,7 +117,7 @@ class FlushSink : public OutputSink {
 TEST_F(RunLoopTest, FlushesItsOutputBeforeItSleepsAndWakesForATaskFromAnotherThread) {
   bool isRun = false;
   auto previous = OutputLines::setSink(std::make_unique<FlushSink>([&] {
-    queue_.async([&] {
+    queue_.post([&] {
       isRun = true;
       loop_.stop();
     });
