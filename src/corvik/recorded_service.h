@@ -23,8 +23,8 @@ class RecordedService final : public Service {
   /// Which thread plays.
   enum class Runs {
     onThreadOfItsOwn,
-    /// On the main thread, between its other tasks. The main thread then waits for a pipe's input, and for a client
-    /// that does not want metrics yet: for commands that do nothing else.
+    /// On the main thread, between its other tasks: for commands that do nothing else, for the main thread then waits
+    /// for a pipe's input, and for a client that does not want metrics yet.
     onMainThread,
   };
 
