@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "corvik/constants.h"
 #include "intake/metric_table.h"
 #include "intake/value_conversions.h"
 #include "system/output_lines.h"
@@ -11,8 +12,8 @@ namespace vesk {
 
 namespace {
 
-const Text metricIDKey = "kKeyMetricID"_text;
-const Text payloadKey = "kKeyPayload"_text;
+const Text& metricIDKey = corvik::kKeyMetricID;
+const Text& payloadKey = corvik::kKeyPayload;
 
 /// Of at least two characters, as of an unsigned number.
 std::string hexadecimal(std::int64_t number) {

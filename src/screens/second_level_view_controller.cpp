@@ -55,7 +55,7 @@ void SecondLevelViewController::didLeaveNavigationStack() {
 }
 
 void SecondLevelViewController::update() {
-  MainQueue::shared().async([screen = weak_from_this()] {
+  MainQueue::shared().post([screen = weak_from_this()] {
     if (const auto alive = screen.lock()) alive->tableView().reloadData();
   });
 }
