@@ -91,36 +91,5 @@ TEST_P(EveryMessage, IsWholeWhereAFieldEndsAndNowhereElse) {
   }
 }
 
-TEST_P(EveryMessage, WritesWhatItMadeOfDamagedBytesSoThatItReadsTheSame) {
-  for (std::size_t index = 0; index < filled_.payload.size(); ++index) {
-    for (const std::uint8_t byte : bytesOf("00 03 04 7A 80 FF")) {
-      Bytes damaged = filled_.payload;
-      damaged[index] = byte;
-      const Message message = decode(damaged);
-      if (message == nullptr) continue;
-      ProtoWriter writer;
-      message->writeTo(writer);
-      const Message again = GetParam().decode(writer.written());
-      ASSERT_NE(again, nullptr);
-      EXPECT_TRUE(again->isEqual(*message)) << shown(*again) << '\n' << shown(*message);
-    }
-  }
-}
-
-TEST_P(EveryMessage, AllocatesNeitherKeysNorNames) {
-  const FilledMessage filled = filledMessage(GetParam().name, Filling::small);
-  const Dictionary one = decode(filled.payload)->dictionaryRepresentation();
-  const Dictionary other = decode(filled.payload)->dictionaryRepresentation();
-  const auto& fields = schema().find(GetParam().name)->second.fields;
-  for (const auto& field : fields) {
-    const auto isField = [&](const Dictionary::Entry& entry) { return entry.key == field.name; };
-    const auto* a = std::find_if(one.begin(), one.end(), isField);
-    const auto* b = std::find_if(other.begin(), other.end(), isField);
-    EXPECT_EQ(a->key.view().data(), b->key.view().data()) << field.name;
-    if (field.type != messagegen::FieldType::enumeration) continue;
-    EXPECT_EQ(a->value.text()->view().data(), b->value.text()->view().data()) << field.name;
-  }
-}
-
 }  // namespace
 }  // namespace vesk

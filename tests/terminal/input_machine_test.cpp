@@ -95,18 +95,6 @@ TEST(InputMachine, SwallowsASequenceOfAnyLength) {
   EXPECT_EQ(events, std::vector<InputEvent>{character('x')});
 }
 
-TEST(InputMachine, TakesAnEscapeForTheKeyWhenNothingFollowsFor50Milliseconds) {
-  InputMachine machine;
-  std::vector<InputEvent> events;
-  machine.feed("\x1b", Clock::Instant(1000ms), events);
-  EXPECT_EQ(machine.deadline(), Clock::Instant(1050ms));
-  machine.advance(Clock::Instant(1049ms), events);
-  EXPECT_TRUE(events.empty());
-  machine.advance(Clock::Instant(1050ms), events);
-  EXPECT_EQ(events, std::vector<InputEvent>{key(Key::Escape)});
-  EXPECT_EQ(machine.deadline(), std::nullopt);
-}
-
 TEST(InputMachine, JudgesWhatFollowsAnEscapeByItsTime) {
   struct {
     std::chrono::milliseconds pause;
