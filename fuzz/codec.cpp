@@ -42,6 +42,7 @@ void checkCodec(const MessageClass& messageClass, Payload payload) {
   if (message == nullptr) return;
   require(isSame(message->dictionaryRepresentation(), *modelled), "the reader reads what the rules of the wire say");
   checkJson(*message);
+  checkFields(messageClass, payload);
   checkWriting(messageClass, *message, payload.size());
   checkCopies(messageClass, *message);
 }

@@ -50,4 +50,19 @@ void checkCopies(const MessageClass& messageClass, const ProtoCodable& message) 
   requireSame(*merged, message);
 }
 
+void checkFields(const MessageClass& messageClass, std::span<const std::uint8_t> payload) {
+  constexpr std::size_t kLongest = 300;
+  auto before = messageClass.decode({});
+  std::string shownBefore = textOf(before->dictionaryRepresentation());
+  for (std::size_t end = 1; end <= std::min(payload.size(), kLongest); ++end) {
+    const auto message = messageClass.decode(payload.first(end));
+    if (message == nullptr) continue;
+    std::string shown = textOf(message->dictionaryRepresentation());
+    const bool showsTheSame = shown == shownBefore;
+    require(showsTheSame || !message->isEqual(*before), "messages that show different fields are not equal");
+    before = message;
+    shownBefore = std::move(shown);
+  }
+}
+
 }  // namespace vesk

@@ -36,11 +36,6 @@ std::string rrcState(double at, std::uint64_t timestamp, LteRrcState state) {
   return recorded(at, K_LTE_RRC_STATE, message);
 }
 
-std::string withoutLineFeed(std::string line) {
-  line.pop_back();
-  return line;
-}
-
 const std::string kStartLines = "pushing metric file\nQuerying SIM files\n";
 const std::string kConnectedLines =
     "Metric ID in Hex =  3C4E04\n"
@@ -51,16 +46,13 @@ std::string connected() {
   return rrcState(1, 1500, LteRrcState::KLTE_RRC_STATE_CONNECTED);
 }
 
-Finished replayed(std::string_view recording) {
-  return vesk({"--headless", "--log", "none", "--speed", "max", "--replay", "-"}, recording);
-}
-
 TEST_F(Road, PrintsTheLinesOfEveryEvent) {
   KCellularLteScellInfo cell;
   cell.setDlBw(7);
   cell.setUlBw(1);
-  const Finished finished = replayed(recorded(0, K_LTE_RLF, cell) + recorded(0, K_LTE_SCELL_INFO, cell) +
-                                     "{\"at\": 1, \"metric\": \"0x3C4E04\", \"payload\": \"08\"}\n" + connected());
+  const std::string recording = recorded(0, K_LTE_RLF, cell) + recorded(0, K_LTE_SCELL_INFO, cell) +
+                                "{\"at\": 1, \"metric\": \"0x3C4E04\", \"payload\": \"08\"}\n" + connected();
+  const Finished finished = vesk({"--headless", "--log", "none", "--speed", "max", "--replay", "-"}, recording);
   EXPECT_EQ(
       finished.output,
       kStartLines +
@@ -89,7 +81,7 @@ TEST_F(Road, FillsTheStoresUpToTheLastEvent) {
   const Finished finished =
       vesk({"stores"}, recorded(0, K_LTE_CA_STATUS, aggregation) + recorded(0, K_LTE_RSRP_RSRQ_SINR, levels) +
                            recorded(0, K_GSM_NCELL_MEAS, neighbours) +
-                           rrcState(0, 0, LteRrcState::KLTE_RRC_STATE_IDLE) + withoutLineFeed(connected()));
+                           rrcState(0, 0, LteRrcState::KLTE_RRC_STATE_IDLE) + connected());
   const char* parts[] = {
       R"({"dictionaries":{"myLTERRCStateDict":{"timestamp":"1970-01-01 00:00:01 UTC",)",
       R"("state":"KLTE_RRC_STATE_CONNECTED"},"myLTECDRXConfigDict":null,)",
@@ -222,10 +214,7 @@ TEST_F(Road, ADriveFillsEveryScreen) {
       for (const char* missing : {"Waiting for Update", "-=", "=- "})
         EXPECT_EQ(shown.find(missing), std::string::npos) << pair << ": " << shown;
     }
-    EXPECT_TRUE(after.at("UMTS Serving Cell Meas").starts_with("[RxInfo 0] ")) << after.at("UMTS Serving Cell Meas");
-    EXPECT_NE(after.at("Device Info SIM Files").find("[SIM Content 1] "), std::string::npos);
     EXPECT_EQ(after.at("LTE Active Bearers"), after.at("GSM Active Bearers"));
-    EXPECT_EQ(after.at("UMTS NAS MM"), after.at("GSM NAS MM"));
     EXPECT_NE(after.at("UMTS NAS MM"), after.at("UMTS NAS GMM"));
   });
 }

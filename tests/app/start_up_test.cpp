@@ -7,6 +7,8 @@
 #include "app/connected_program.h"
 #include "app/root_navigation_controller.h"
 #include "screens/vesk_view_controller.h"
+#include "system/output_lines.h"
+#include "system/system_log.h"
 
 namespace vesk {
 namespace {
@@ -105,35 +107,24 @@ TEST(Bundle, FindsAResourceInTheFirstDirectoryThatHasIt) {
   const std::filesystem::path root = testing::TempDir() + "vesk_bundle_test";
   const std::filesystem::path first = root / "first";
   const std::filesystem::path second = root / "second";
-  std::filesystem::create_directories(first / "folder.deviceconfig");
+  std::filesystem::create_directories(first / "folder.txt");
   std::filesystem::create_directories(second);
-  for (const auto& path : {first / "both.deviceconfig", second / "both.deviceconfig", second / "one.txt"})
+  for (const auto& path : {first / "both.txt", second / "both.txt", second / "one.txt"})
     std::ofstream(path) << "content";
   const Bundle bundle({first, second});
-  EXPECT_EQ(bundle.pathForResource("both", "deviceconfig"), (first / "both.deviceconfig").string());
+  EXPECT_EQ(bundle.pathForResource("both", "txt"), (first / "both.txt").string());
   EXPECT_EQ(bundle.pathForResource("one", "txt"), (second / "one.txt").string());
-  EXPECT_EQ(bundle.pathForResource("one", "deviceconfig"), std::nullopt);
-  EXPECT_EQ(bundle.pathForResource("folder", "deviceconfig"), std::nullopt);
+  EXPECT_EQ(bundle.pathForResource("folder", "txt"), std::nullopt);
   std::filesystem::remove_all(root);
 }
 
 TEST(AppIDValidator, AcceptsOnlyTheIntegerTwo) {
-  struct Case {
-    Dictionary event;
-    bool isForThisApplication;
-    std::optional<std::int64_t> appID;
-  };
-  const Case cases[] = {
-      {{{"kKeyAppID"_text, 2}}, true, 2},
-      {{{"kKeyAppID"_text, 3}}, false, 3},
-      {{{"kKeyAppID"_text, "2"_text}}, false, std::nullopt},
-      {{}, false, std::nullopt},
-  };
   AppIDValidator validator;
-  for (const Case& row : cases) {
-    EXPECT_EQ(validator.isForThisApplication(row.event), row.isForThisApplication) << textOf(row.event);
-    EXPECT_EQ(validator.appID(), row.appID) << textOf(row.event);
-  }
+  EXPECT_TRUE(validator.isForThisApplication({{"kKeyAppID"_text, 2}}));
+  EXPECT_FALSE(validator.isForThisApplication({{"kKeyAppID"_text, 3}}));
+  EXPECT_EQ(validator.appID(), 3);
+  EXPECT_FALSE(validator.isForThisApplication({{"kKeyAppID"_text, "2"_text}}));
+  EXPECT_EQ(validator.appID(), std::nullopt);
 }
 
 }  // namespace

@@ -12,36 +12,6 @@
 namespace vesk {
 namespace {
 
-TEST(ProtoWriter, WritesAKeyAndAValue) {
-  struct Case {
-    void (*write)(ProtoWriter& to);
-    std::string written;
-  };
-  constexpr auto kMin = std::numeric_limits<std::int32_t>::min();
-  constexpr auto kMax = std::numeric_limits<std::int32_t>::max();
-  constexpr std::uint32_t kNoKey = ProtoWriter::kNoKey;
-  const Case cases[] = {
-      {[](ProtoWriter& to) { to.writeUInt32(150, 1); }, "08 96 01"},
-      {[](ProtoWriter& to) { to.writeUInt32(0xFFFFFFFF, 16); }, "80 01 FF FF FF FF 0F"},
-      {[](ProtoWriter& to) { to.writeInt32(kMin, 1); }, "08 80 80 80 80 F8 FF FF FF FF 01"},
-      {[](ProtoWriter& to) { to.writeSInt32(-110, 1); }, "08 DB 01"},
-      {[](ProtoWriter& to) { to.writeSInt32(kMax, 1); }, "08 FE FF FF FF 0F"},
-      {[](ProtoWriter& to) { to.writeSInt32(kMin, 1); }, "08 FF FF FF FF 0F"},
-      {[](ProtoWriter& to) { to.writeBool(true, 2); }, "10 01"},
-      {[](ProtoWriter& to) { to.writeEnumeration(static_cast<metrics::SccState>(-2), 1); },
-       "08 FE FF FF FF FF FF FF FF FF 01"},
-      {[](ProtoWriter& to) { to.writeString(Text::copy("a\xFF"), 3); }, "1A 02 61 FF"},
-      {[](ProtoWriter& to) { to.writeBytes(Data::copy(bytesOf("00 01")), 3); }, "1A 02 00 01"},
-      {[](ProtoWriter& to) { to.writeMessage(metrics::TxPowerInfo(), 2); }, "12 00"},
-      {[](ProtoWriter& to) { to.writeUInt32(300, kNoKey), to.writeSInt32(-3, kNoKey); }, "AC 02 05"},
-  };
-  for (const Case& row : cases) {
-    ProtoWriter writer;
-    row.write(writer);
-    EXPECT_EQ(hexOf(writer.written()), row.written);
-  }
-}
-
 TEST(ProtoWriter, WritesVarintsThatReadBackInTheFewestBytes) {
   for (unsigned power = 0; power < 64; ++power) {
     for (const std::uint64_t value : {(1ULL << power) - 1, 1ULL << power, (1ULL << power) + 1}) {

@@ -3,7 +3,11 @@
 #include <cctype>
 #include <fstream>
 #include <gtest/gtest.h>
+#include <set>
 #include <string>
+
+#include "messages/message_classes.h"
+#include "messages/proto_schema.h"
 
 namespace vesk {
 namespace {
@@ -33,6 +37,16 @@ TEST(Schema, IsTheOneThatTheHandsetWrites) {
                                                 << " differs: what is there must keep its names, numbers and types; "
                                                    "when only new ones came, put the new number here";
   }
+}
+
+TEST(Schema, NamesTheMessagesThatTheTestsGoThrough) {
+  std::set<std::string_view> listed;
+  for (const MessageClass& each : metrics::kEveryMessage)
+    listed.insert(each.name);
+  std::set<std::string_view> declared;
+  for (const auto& [name, message] : schema())
+    declared.insert(name);
+  EXPECT_EQ(listed, declared);
 }
 
 }  // namespace
