@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <memory>
 
-#include "messages/filled_message.h"
+#include "filled_message.h"
 #include "messages/lte/lte.h"
 #include "messages/nas/nas.h"
 #include "messages/registry/metric_classes.h"

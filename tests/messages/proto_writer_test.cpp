@@ -2,10 +2,8 @@
 
 #include <bit>
 #include <gtest/gtest.h>
-#include <limits>
 
 #include "messages/codec/repeated_scalar.h"
-#include "messages/lte/lte.h"
 #include "support/bytes.h"
 #include "values/text_form.h"
 

@@ -219,11 +219,10 @@ TEST_F(PresenterTest, StopsTrackingWhenTheReleaseIsLost) {
       [&] { desk_->presenter().forgetMouse(); },
   };
   for (const auto& interruption : interruptions) {
-    tracking_.clear();
     desk_->mouse(MouseAction::Press, 5, 7);
     desk_->mouse(MouseAction::Drag, 5, 4);
     interruption();
-    EXPECT_EQ(tracking_, (std::vector<bool>{true, false}));
+    EXPECT_EQ(std::exchange(tracking_, {}), (std::vector<bool>{true, false}));
   }
 }
 

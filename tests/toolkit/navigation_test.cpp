@@ -70,7 +70,6 @@ TEST_F(Navigation, SelectingARowPreparesTheDestinationBeforeItLoads) {
   EXPECT_EQ(happenings, (std::vector<std::string>{"prepared showList", "list loaded with GSM"}));
   ASSERT_EQ(stack_->stack().size(), 2U);
   EXPECT_EQ(stack_->topViewController()->title(), "GSM"_text);
-  EXPECT_EQ(launch_.tableView().cellForRow({0, 1})->style(), CellStyle::Basic);
 }
 
 TEST_F(Navigation, GoesNowhereWithoutARowADeclarationOrAStack) {

@@ -1,19 +1,20 @@
-// What our writers write, protobuf reads as the same fields and writes as the same bytes.
+#include "peer_messages.h"
 
 #include <cstdlib>
 #include <fstream>
 #include <google/protobuf/descriptor.pb.h>
 #include <google/protobuf/dynamic_message.h>
+#include <string>
+#include <vector>
 
-#include "messages/every_message.h"
-#include "messages/filled_message.h"
-#include "support/decoded.h"
+#include "support/bytes.h"
 
 namespace vesk {
-namespace {
 
 namespace pb = google::protobuf;
 using pb::FieldDescriptor;
+
+namespace {
 
 /// Makes messages of the schema, as protoc understood it.
 class Peer {
@@ -36,8 +37,6 @@ class Peer {
   pb::DescriptorPool pool_;
   pb::DynamicMessageFactory factory_;
 };
-
-Dictionary dictionaryOf(const pb::Message& message);
 
 Value valueOf(const pb::Message& message, const FieldDescriptor* field) {
   const pb::Reflection& with = *message.GetReflection();
@@ -80,6 +79,13 @@ Array arrayOf(const pb::Message& message, const FieldDescriptor* field) {
   return array;
 }
 
+}  // namespace
+
+std::unique_ptr<pb::Message> makePeerMessage(std::string_view className) {
+  static Peer peer;
+  return peer.make(className);
+}
+
 Dictionary dictionaryOf(const pb::Message& message) {
   Dictionary dictionary;
   std::vector<const FieldDescriptor*> fields;
@@ -90,24 +96,4 @@ Dictionary dictionaryOf(const pb::Message& message) {
   return dictionary;
 }
 
-class PeerAgrees : public testing::TestWithParam<MessageClass> {};
-INSTANTIATE_TEST_SUITE_P(Schema, PeerAgrees, testing::ValuesIn(metrics::kEveryMessage), nameOfTest);
-
-TEST_P(PeerAgrees, OnTheFieldsAndOnTheBytes) {
-  static Peer peer;
-  for (const Filling filling : {Filling::small, Filling::extreme}) {
-    const auto ours = GetParam().decode(filledMessage(GetParam().name, filling).payload);
-    ProtoWriter writer;
-    ours->writeTo(writer);
-    const auto theirs = peer.make(GetParam().name);
-    ASSERT_TRUE(theirs->ParseFromArray(writer.written().data(), static_cast<int>(writer.written().size())));
-    EXPECT_TRUE(theirs->GetReflection()->GetUnknownFields(*theirs).empty());
-    EXPECT_EQ(dictionaryOf(*theirs), ours->dictionaryRepresentation()) << shown(*ours);
-
-    const std::string bytes = theirs->SerializeAsString();
-    EXPECT_EQ(hexOf(Bytes(bytes.begin(), bytes.end())), hexOf(writer.written()));
-  }
-}
-
-}  // namespace
 }  // namespace vesk
