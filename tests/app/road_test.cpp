@@ -11,6 +11,7 @@
 #include "handset/recording.h"
 #include "messages/gsm/gsm.h"
 #include "messages/lte/lte.h"
+#include "messages/nas/nas.h"
 #include "recording/recording_reader.h"
 #include "screens/vesk_view_items.h"
 #include "support/recorded_output.h"
@@ -132,15 +133,21 @@ TEST_F(Road, ShowsWhatAnUnknownPairShowsAndTellsWhichThereAre) {
       {"GSM", "GPRS Config",
        "vesk: no category \"GPRS Config\" in GSM; did you mean \"GSM GPRS Config\"; there are: NAS GMM, NAS MM, "},
       {"gsm", "NAS MM", "vesk: no area \"gsm\"; did you mean \"GSM\"; there are: Device Info, LTE, UMTS, GSM\n"},
-      {"", "\x1B[2J", "vesk: no area \"\""},
+      {"\x1B[2J", "\x1B[2J", "vesk: no area \""},
   };
   for (const Case& row : cases) {
     const Finished finished = vesk({"show", row.area, row.category}, connected());
     EXPECT_TRUE(finished.error.starts_with(row.told)) << finished.error;
     EXPECT_NE(finished.output.find("\n  Come back later  Come back later\n"), std::string::npos) << finished.output;
-    EXPECT_EQ(finished.output.find('\x1B'), std::string::npos);
+    EXPECT_EQ((finished.output + finished.error).find('\x1B'), std::string::npos);
     EXPECT_EQ(finished.status, 0);
   }
+  KCellularActivatedBearerContexts bearers;
+  bearers.addBearerContexts(std::make_shared<BearerContext>());
+  bearers.bearerContextsAtIndex(0)->setApn(Text::copy("\x1B[2J"));
+  const Finished hostile = vesk({"show", "LTE", "Active Bearers", "-"}, recorded(0, K_CELLULAR_ACTIVE_BEARER, bearers));
+  EXPECT_NE(hostile.output.find("[2J"), std::string::npos) << hostile.output;
+  EXPECT_EQ(hostile.output.find('\x1B'), std::string::npos);
 }
 
 TEST_F(Road, TheSameSeedDrivesTheSameWay) {
