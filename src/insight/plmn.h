@@ -21,6 +21,9 @@ namespace vesk::insight {
 /// The same of the "encoded_plmn" of a record.
 [[nodiscard]] std::optional<std::string> encodedPlmnText(const Dictionary& record);
 
+/// How many digits a network code has at least: 3 when a record says so, else 2; null is absent.
+[[nodiscard]] int mncDigitsOf(const Value* mncDigits);
+
 /// An MCC alone, or an MNC: `digits` at least, with leading zeros.
 [[nodiscard]] std::string codeText(std::int64_t code, int digits);
 

@@ -25,14 +25,16 @@ struct LteChannelRange {
   int last;
 
   [[nodiscard]] constexpr bool contains(std::int64_t channel) const { return channel >= first && channel <= last; }
-  [[nodiscard]] constexpr int frequencyOf(std::int64_t channel) const { return low + static_cast<int>(channel - first); }
+  [[nodiscard]] constexpr int frequencyOf(std::int64_t channel) const {
+    return low + static_cast<int>(channel - first);
+  }
 };
 
 struct LteBand {
   int number;
   Duplex duplex;
   LteChannelRange downlink;
-  /// That of the downlink for TDD; without meaning for SDL.
+  /// That of the downlink for TDD; without any channel for SDL.
   LteChannelRange uplink;
 
   /// The frequency of the uplink that belongs to a downlink channel of this band; absent where there is none.
