@@ -5,7 +5,7 @@
 #include <string_view>
 
 #include "messages/shared/lte_bands.h"
-#include "platform/value.h"
+#include "values/value.h"
 
 /// Channel numbers to bands and frequencies. Frequencies are in units of 100 kHz.
 namespace vesk::insight {

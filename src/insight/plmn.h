@@ -5,7 +5,7 @@
 #include <span>
 #include <string>
 
-#include "platform/value.h"
+#include "values/value.h"
 
 /// Networks: a mobile country code and a mobile network code.
 namespace vesk::insight {

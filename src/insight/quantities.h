@@ -3,7 +3,7 @@
 #include <optional>
 #include <string_view>
 
-#include "platform/value.h"
+#include "values/value.h"
 
 /// The measured quantities: what values are possible, and which are good.
 namespace vesk::insight {
