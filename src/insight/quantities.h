@@ -20,6 +20,15 @@ struct GradeSteps {
   double fair;
 };
 
+/// The values of the lowest codes with which a level is reported: they mean "at or below".
+struct Floor {
+  double low;
+  double high;
+};
+
+/// From this transmit power on, in dBm, a phone shouts.
+inline constexpr double kHighTxPower = 20;
+
 struct Quantity {
   std::string_view unit;
   /// The possible values, ends included.
@@ -27,12 +36,15 @@ struct Quantity {
   double highest;
   /// Absent for a quantity that has no grades.
   std::optional<GradeSteps> steps{};
+  std::optional<Floor> floor{};
+  /// From this value on it is high; absent where that says nothing.
+  std::optional<double> high{};
 };
 
 // clang-format off
-inline constexpr Quantity kRsrp{"dBm", -156, -31, GradeSteps{-80, -90, -100}};
+inline constexpr Quantity kRsrp{"dBm", -156, -31, GradeSteps{-80, -90, -100}, Floor{-140, -140}};
 /// A fully loaded cell alone has -10.8 dB; below -12 dB others are loud.
-inline constexpr Quantity kRsrq{"dB", -34, 2.5, GradeSteps{-7, -10, -12}};
+inline constexpr Quantity kRsrq{"dB", -34, 2.5, GradeSteps{-7, -10, -12}, Floor{-20, -19.5}};
 /// About 64QAM, 16QAM, the cell's edge.
 inline constexpr Quantity kSinr{"dB", -23, 40, GradeSteps{20, 13, 0}};
 inline constexpr Quantity kRscp{"dBm", -120, -25, GradeSteps{-75, -85, -95}};
@@ -41,11 +53,8 @@ inline constexpr Quantity kEcNo{"dB", -24.5, 0, GradeSteps{-6, -10, -14}};
 inline constexpr Quantity kRxLev{"dBm", -110, -47, GradeSteps{-70, -85, -95}};
 /// All power in the carrier, which tells nothing of the cell.
 inline constexpr Quantity kRssi{"dBm", -120, -25};
-inline constexpr Quantity kTxPower{"dBm", -50, 39};
+inline constexpr Quantity kTxPower{.unit = "dBm", .lowest = -50, .highest = 39, .high = kHighTxPower};
 // clang-format on
-
-/// From this transmit power on, in dBm, a phone shouts.
-inline constexpr double kHighTxPower = 20;
 
 [[nodiscard]] constexpr bool isPossible(const Quantity& quantity, double value) {
   return value >= quantity.lowest && value <= quantity.highest;
