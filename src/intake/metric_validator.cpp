@@ -30,6 +30,12 @@ void printRecord(std::string_view logText, const Dictionary& record) {
   if (OutputLines::isOpen()) OutputLines::print({logText, textOf(record)});
 }
 
+/// The record's timestamp while it is a number; absent when it is none that fits.
+std::optional<std::int64_t> millisecondsOf(const Dictionary& record) {
+  const Value* timestamp = record.find("timestamp"_text);
+  return timestamp == nullptr ? std::nullopt : timestamp->integer();
+}
+
 void printNotHandled() {
   OutputLines::print({"I dont care for this Metric"});
 }
@@ -72,9 +78,12 @@ bool MetricValidator::validateMetric(const Dictionary& event) {
   if (metric != nullptr) fields = metric->decode(payloadOf(event));
   if (!fields) {
     printNotHandled();
+    const EventFate fate = metric == nullptr ? EventFate::ignored : EventFate::undecodable;
+    if (eventObserver_) eventObserver_({fate, metricID, std::nullopt, nullptr});
     return false;
   }
 
+  const auto timestamp = eventObserver_ ? millisecondsOf(*fields) : std::nullopt;
   LatestRecord& record = this->*metric->record;
   record = std::move(fields);
   const auto runExtraStep = [&] {
@@ -101,6 +110,7 @@ bool MetricValidator::validateMetric(const Dictionary& event) {
       runExtraStep();
       break;
   }
+  if (eventObserver_) eventObserver_({EventFate::stored, metricID, timestamp, &*record});
   return true;
 }
 

@@ -16,6 +16,27 @@
 
 namespace vesk {
 
+/// What became of a metric event.
+enum class EventFate {
+  stored,
+  /// Its metric is handled, its payload is no encoding of one.
+  undecodable,
+  /// Its metric is not handled.
+  ignored,
+};
+
+/// A metric event, told once the intake is done with it.
+struct TakenEvent {
+  EventFate fate;
+  /// Absent when the event had none.
+  std::optional<std::int64_t> metricId;
+  /// What the record had under "timestamp" before that became a date: milliseconds since 1970-01-01 00:00:00 UTC.
+  /// Absent unless stored, and where the record has none that fits.
+  std::optional<std::int64_t> timestamp;
+  /// The latest record of its kind; null unless stored.
+  const Dictionary* record;
+};
+
 /// Takes in every metric event: decodes it, keeps it as the latest record of its kind, and fills the technology
 /// stores. The one object of the process is shared(); everything happens on the main queue. Whoever shows the stores
 /// reads them here.
@@ -36,6 +57,9 @@ class MetricValidator : public CorvikWrapperDelegate {
   void setArrivalObserver(std::function<void(std::int64_t metricId)> observer) {
     arrivalObserver_ = std::move(observer);
   }
+
+  /// `observer` is told of every metric event, stored or not; the stores are then as the event left them.
+  void setEventObserver(std::function<void(const TakenEvent&)> observer) { eventObserver_ = std::move(observer); }
 
   /// Decodes and stores the event. False, with nothing stored, for a metric that is not handled and for a payload that
   /// cannot be decoded.
@@ -95,6 +119,7 @@ class MetricValidator : public CorvikWrapperDelegate {
   /// The date written last, kept for its storage.
   std::string date_;
   std::function<void(std::int64_t)> arrivalObserver_;
+  std::function<void(const TakenEvent&)> eventObserver_;
 };
 
 /// The names of the latest records and where they are, in the order of their declaration.
