@@ -19,6 +19,7 @@ struct Stats {
 class Histogram {
  public:
   void add(double value);
+  [[nodiscard]] bool empty() const { return bins_.empty(); }
 
   /// Absent without values.
   [[nodiscard]] std::optional<Stats> stats() const;
