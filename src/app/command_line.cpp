@@ -14,6 +14,7 @@
 
 #include "app/data_output.h"
 #include "app/decode_command.h"
+#include "app/redact_command.h"
 #include "app/run_command.h"
 #include "app/show_command.h"
 #include "app/simulate_command.h"
@@ -59,6 +60,14 @@ constexpr const char* kShowExamples =
     "Examples:\n"
     "  vesk show LTE \"Serving Cell Meas\" drive.jsonl\n"
     "  vesk show UMTS \"Tx Power\" drive.jsonl --json | jq '.sections[].rows'";
+
+constexpr const char* kRedactExamples =
+    "Masked are IMSI, TMSI, addresses, access points' names, call identifiers and the\n"
+    "contents of SIM files that name a subscriber. Cells, areas and times stay.\n"
+    "\n"
+    "Examples:\n"
+    "  vesk redact drive.jsonl > shareable.jsonl\n"
+    "  vesk simulate --seconds 600 | vesk redact | vesk decode";
 
 constexpr const char* kSimulateExamples =
     "Examples:\n"
@@ -127,6 +136,7 @@ class CommandLine {
     addDecode();
     addStores();
     addShow();
+    addRedact();
     addSimulate();
   }
 
@@ -171,6 +181,7 @@ class CommandLine {
         ->check(CLI::NonNegativeNumber.description(""))
         ->excludes(replay);
     program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
+    addRedactOption(program_, run_.isRedacted);
     program_
         .add_option_function<double>(
             "--seconds",
@@ -189,18 +200,18 @@ class CommandLine {
 
   void addDecode() {
     CLI::App* decode = program_.add_subcommand("decode", "Print the events of a recording, one JSON line each");
-    addRecording(*decode, recording_, "The recording; - or nothing for standard input");
+    addRecording(*decode, input_);
     addLogOption(*decode, kDataLog);
     decode->footer(kDecodeExamples);
-    decode->final_callback([this] { command_ = [this] { return runDecode(recording_.value_or("-")); }; });
+    decode->final_callback([this] { command_ = [this] { return runDecode(input_); }; });
   }
 
   void addStores() {
     CLI::App* stores = program_.add_subcommand("stores", "Print what the stores hold at the end of a recording");
-    addRecording(*stores, recording_, "The recording; - or nothing for standard input");
+    addRecording(*stores, input_);
     addLogOption(*stores, kDataLog);
     stores->footer(kStoresExamples);
-    stores->final_callback([this] { command_ = [this] { return runStores(recording_.value_or("-")); }; });
+    stores->final_callback([this] { command_ = [this] { return runStores(input_); }; });
   }
 
   void addShow() {
@@ -209,11 +220,19 @@ class CommandLine {
     show->add_option("CATEGORY", show_.category, "A line of the area's screen, as \"Tx Power\"")
         ->required()
         ->type_name("");
-    addRecording(*show, show_.path, "The recording; - is standard input, nothing: no events yet");
+    addRecordingIfAny(*show, show_.input);
     show->add_flag("--json", show_.asJson, "Print JSON");
     addLogOption(*show, kDataLog);
     show->footer(kShowExamples);
     show->final_callback([this] { command_ = [this] { return runShow(show_); }; });
+  }
+
+  void addRedact() {
+    CLI::App* redact = program_.add_subcommand("redact", "Print a recording without the subscriber's identities");
+    addFile(*redact, input_, "The recording; - or nothing for standard input");
+    addLogOption(*redact, kDataLog);
+    redact->footer(kRedactExamples);
+    redact->final_callback([this] { command_ = [this] { return runRedact(input_); }; });
   }
 
   void addSimulate() {
@@ -284,8 +303,24 @@ class CommandLine {
     return "no subcommand " + word + suggestionFor(word, names);
   }
 
-  static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {
-    command.add_option("FILE", path, description)->type_name("");
+  /// Standard input where no file is named.
+  static void addRecording(CLI::App& command, RecordingInput& input) {
+    input.path = "-";
+    addFile(command, input, "The recording; - or nothing for standard input");
+    addRedactOption(command, input.isRedacted);
+  }
+
+  static void addRecordingIfAny(CLI::App& command, RecordingInput& input) {
+    addFile(command, input, "The recording; - is standard input, nothing: no events yet");
+    addRedactOption(command, input.isRedacted);
+  }
+
+  static void addFile(CLI::App& command, RecordingInput& input, const std::string& description) {
+    command.add_option("FILE", input.path, description)->type_name("");
+  }
+
+  static void addRedactOption(CLI::App& command, bool& isRedacted) {
+    command.add_flag("--redact", isRedacted, "Without the subscriber's identities and addresses");
   }
 
   void addLogOption(CLI::App& command, const std::string& usual) {
@@ -298,7 +333,7 @@ class CommandLine {
   RunOptions run_;
   ShowOptions show_;
   SimulateOptions simulate_;
-  std::optional<std::string> recording_;
+  RecordingInput input_;
   std::optional<std::string> logTo_;
   std::function<Outcome()> command_;
 };

@@ -6,6 +6,7 @@
 
 #include "app/app_delegate.h"
 #include "app/metric_arrivals.h"
+#include "app/redaction.h"
 #include "app/road.h"
 #include "app/stop_signals.h"
 #include "app/vesk_interface.h"
@@ -36,7 +37,9 @@ class Run {
       tellUser("vesk: " + *source_.failure);
       return Outcome::failed;
     }
-    corvik::installService(source_.service);
+    const std::shared_ptr<corvik::Service> service =
+        options_.isRedacted ? makeRedactedService(source_.service, redaction_) : source_.service;
+    corvik::installService(service);
     if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
     if (isHeadless_) {
       printLines();
@@ -47,7 +50,8 @@ class Run {
     const int status = application.run([&](NavigationController& root) { mainLoop(application, root); });
     if (status != 0) outcome_ = Outcome::failed;
     // The connection outlives all that the service was made of here.
-    source_.service->shutDown();
+    service->shutDown();
+    redaction_.tellLeftOut();
     OutputLines::setSink(nullptr);
     return outcome_;
   }
@@ -156,6 +160,7 @@ class Run {
   const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
   MetricArrivals arrivals_{clock_};
+  Redaction redaction_;
   EventSource source_;
   AppDelegate delegate_;
   std::unique_ptr<Terminal> terminal_;

@@ -10,6 +10,8 @@ namespace vesk {
 
 struct RunOptions {
   SourceOptions source;
+  /// Without identities.
+  bool isRedacted = false;
   /// No screens: the program's lines on standard output. So it also runs where there is no terminal for screens.
   bool isHeadless = false;
   /// How long; absent until the user quits, or without screens until the recording has ended.

@@ -66,10 +66,10 @@ std::string storesAsJson(const MetricValidator& intake) {
 
 }  // namespace
 
-Outcome runStores(const std::string& path) {
+Outcome runStores(const RecordingInput& input) {
   DataOutput output;
   const Outcome outcome = playRecording(
-      path, [&](NavigationController& /*root*/) { output.writeLine(storesAsJson(*MetricValidator::shared())); });
+      input, [&](NavigationController& /*root*/) { output.writeLine(storesAsJson(*MetricValidator::shared())); });
   return output.finish(outcome);
 }
 

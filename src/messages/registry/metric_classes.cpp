@@ -14,7 +14,7 @@ using namespace metrics;
 template <class MetricMessage>
 constexpr MetricClass row() {
   return {kMetricId<MetricMessage>, MetricMessage::kClassName, &decodePayload<MetricMessage>,
-          &appendPayloadJson<MetricMessage>};
+          &appendPayloadJson<MetricMessage>, &decodeMessage<MetricMessage>};
 }
 
 /// In the order of their identifiers.
