@@ -12,67 +12,23 @@
 #include <string>
 #include <vector>
 
+#include "app/command_examples.h"
 #include "app/data_output.h"
 #include "app/decode_command.h"
 #include "app/redact_command.h"
 #include "app/run_command.h"
+#include "app/series_command.h"
 #include "app/show_command.h"
 #include "app/simulate_command.h"
 #include "app/stores_command.h"
 #include "app/suggestion.h"
+#include "app/summary_command.h"
+#include "app/timeline_command.h"
 #include "system/system_log.h"
 
 namespace vesk {
 
 namespace {
-
-constexpr const char* kExamples =
-    "Examples:\n"
-    "  vesk                                   walk the screens of a simulated drive\n"
-    "  vesk --replay drive.jsonl              the screens while a drive is replayed\n"
-    "  vesk --replay drive.jsonl --speed 10   the same, ten times as fast\n"
-    "  tail -f live.jsonl | vesk --replay -   the screens on a live pipe\n"
-    "  vesk --headless --replay drive.jsonl   the diagnostic lines, no screens\n"
-    "\n"
-    "A recording has one event a line:\n"
-    "  {\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"1003\"}\n"
-    "\n"
-    "Exit status: 0 done, 1 something failed, 2 wrong usage.\n"
-    "vesk SUBCOMMAND --help tells more of a subcommand.";
-
-constexpr const char* kDecodeExamples =
-    "One JSON object an event, on one line (here in two):\n"
-    "  {\"at\":12.5,\"metric\":\"0x3C4E04\",\"class\":\"KCellularLteRrcState\",\n"
-    "   \"status\":\"decoded\",\"fields\":{\"state\":\"KLTE_RRC_STATE_CONNECTED\"}}\n"
-    "The status is decoded, undecodable (the payload is damaged) or ignored (no\n"
-    "class knows the metric).\n"
-    "\n"
-    "Examples:\n"
-    "  vesk decode drive.jsonl | jq -r '.fields.state // empty'\n"
-    "  tail -f live.jsonl | vesk decode";
-
-constexpr const char* kStoresExamples =
-    "Examples:\n"
-    "  vesk stores drive.jsonl | jq .LTE.SelReselCellInfo\n"
-    "  vesk stores drive.jsonl | jq .dictionaries.myLTERRCStateDict.state";
-
-constexpr const char* kShowExamples =
-    "Examples:\n"
-    "  vesk show LTE \"Serving Cell Meas\" drive.jsonl\n"
-    "  vesk show UMTS \"Tx Power\" drive.jsonl --json | jq '.sections[].rows'";
-
-constexpr const char* kRedactExamples =
-    "Masked are IMSI, TMSI, addresses, access points' names, call identifiers and the\n"
-    "contents of SIM files that name a subscriber. Cells, areas and times stay.\n"
-    "\n"
-    "Examples:\n"
-    "  vesk redact drive.jsonl > shareable.jsonl\n"
-    "  vesk simulate --seconds 600 | vesk redact | vesk decode";
-
-constexpr const char* kSimulateExamples =
-    "Examples:\n"
-    "  vesk simulate --seconds 600 > drive.jsonl\n"
-    "  vesk simulate --seed 7 | vesk show LTE \"RRC State\" -";
 
 /// So narrow that the descriptions beside the options end before column 80.
 constexpr std::size_t kOptionColumn = 20;
@@ -136,6 +92,9 @@ class CommandLine {
     addDecode();
     addStores();
     addShow();
+    addSummary();
+    addTimeline();
+    addSeries();
     addRedact();
     addSimulate();
   }
@@ -182,6 +141,7 @@ class CommandLine {
         ->excludes(replay);
     program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
     addRedactOption(program_, run_.isRedacted);
+    addRuleOptions(program_, run_.rules);
     program_
         .add_option_function<double>(
             "--seconds",
@@ -225,6 +185,34 @@ class CommandLine {
     addLogOption(*show, kDataLog);
     show->footer(kShowExamples);
     show->final_callback([this] { command_ = [this] { return runShow(show_); }; });
+  }
+
+  void addSummary() {
+    CLI::App* summary = program_.add_subcommand("summary", "Print what a whole drive was, on 24 lines");
+    addRecording(*summary, input_);
+    summary->add_flag("--json", asJson_, "Print one JSON object");
+    addLogOption(*summary, kDataLog);
+    summary->footer(kSummaryExamples);
+    summary->final_callback([this] { command_ = [this] { return runSummary(input_, asJson_); }; });
+  }
+
+  void addTimeline() {
+    CLI::App* timeline = program_.add_subcommand("timeline", "Print what happened on a drive, one line an event");
+    addRecording(*timeline, timeline_.input);
+    timeline->add_flag("--json", timeline_.asJson, "Print JSON, one object a line");
+    addRuleOptions(*timeline, timeline_.rules);
+    addLogOption(*timeline, kDataLog);
+    timeline->footer(kTimelineExamples);
+    timeline->final_callback([this] { command_ = [this] { return runTimeline(timeline_); }; });
+  }
+
+  void addSeries() {
+    CLI::App* series = program_.add_subcommand("series", "Print the course of a drive's levels and powers");
+    addRecording(*series, input_);
+    series->add_flag("--csv", asCsv_, "Print CSV, with a header");
+    addLogOption(*series, kDataLog);
+    series->footer(kSeriesExamples);
+    series->final_callback([this] { command_ = [this] { return runSeries(input_, asCsv_); }; });
   }
 
   void addRedact() {
@@ -323,6 +311,15 @@ class CommandLine {
     command.add_flag("--redact", isRedacted, "Without the subscriber's identities and addresses");
   }
 
+  /// Each --rule takes one.
+  static void addRuleOptions(CLI::App& command, RuleInput& rules) {
+    command.add_option("--rule", rules.rules, "Tell when it fires: \"lte.rsrp < -110 for 10 s\", \"event drop\"")
+        ->type_name("RULE")
+        ->expected(1)
+        ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+    command.add_option("--rules", rules.file, "A file of such rules, one a line")->type_name("FILE");
+  }
+
   void addLogOption(CLI::App& command, const std::string& usual) {
     command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
         ->type_name("TO")
@@ -334,6 +331,9 @@ class CommandLine {
   ShowOptions show_;
   SimulateOptions simulate_;
   RecordingInput input_;
+  TimelineOptions timeline_;
+  bool asJson_ = false;
+  bool asCsv_ = false;
   std::optional<std::string> logTo_;
   std::function<Outcome()> command_;
 };

@@ -38,7 +38,20 @@ void HeardCells::take(const Report& report, const Timeline& timeline, std::int64
   for (const CarrierReport& each : report.carriers)
     if (each.level || timeline.carriers().isConfigured(each.index))
       hear({Technology::lte, each.channel, each.code}, each.level, each.quality, now);
-  for (const NeighborReport& each : report.neighbors)
+  takeNeighbors(report.neighbors, now);
+}
+
+void HeardCells::takeNeighbors(std::span<const NeighborReport> neighbors, std::int64_t now) {
+  std::vector<NeighborReport> strongest;
+  if (neighbors.size() > kMostCells) {
+    strongest.assign(neighbors.begin(), neighbors.end());
+    std::nth_element(strongest.begin(), strongest.begin() + kMostCells, strongest.end(),
+                     [](const NeighborReport& one, const NeighborReport& other) {
+                       return strengthOf(one.level) > strengthOf(other.level);
+                     });
+    neighbors = std::span(strongest).first(kMostCells);
+  }
+  for (const NeighborReport& each : neighbors)
     hear({each.technology, each.channel, each.code}, each.level, each.quality, now);
 }
 

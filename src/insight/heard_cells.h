@@ -2,6 +2,8 @@
 
 #include <cstdint>
 #include <optional>
+#include <span>
+#include <string_view>
 #include <vector>
 
 #include "insight/report.h"
@@ -68,6 +70,7 @@ class HeardCells {
 
   [[nodiscard]] static bool isOld(const Row& row, std::int64_t now) { return now - row.heardAt > kKeptFor; }
   void takeServing(const Report& report, const Timeline& timeline, std::int64_t now);
+  void takeNeighbors(std::span<const NeighborReport> neighbors, std::int64_t now);
   [[nodiscard]] Row* find(const HeardKey& key, std::int64_t now);
   /// The row, a new one when there is none; null when there is no room for one of that level.
   [[nodiscard]] Row* findOrAdd(const HeardKey& key, const std::optional<double>& level, std::int64_t now);

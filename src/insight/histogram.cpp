@@ -1,19 +1,21 @@
 #include "insight/histogram.h"
 
 #include <algorithm>
-#include <cmath>
 
 namespace vesk::insight {
 
 void Histogram::add(double value) {
-  const auto halves = static_cast<std::int32_t>(std::lround(value * 2));
-  const auto bin = std::lower_bound(bins_.begin(), bins_.end(), halves,
-                                    [](const Bin& each, std::int32_t other) { return each.halves < other; });
-  if (bin != bins_.end() && bin->halves == halves) {
-    ++bin->count;
-  } else {
-    bins_.insert(bin, {halves, 1});
+  const auto halves = static_cast<std::int32_t>(value * 2 + (value < 0 ? -0.5 : 0.5));
+  // Reports tend to repeat.
+  if (last_ < bins_.size() && bins_[last_].halves == halves) {
+    ++bins_[last_].count;
+    return;
   }
+  auto bin = std::lower_bound(bins_.begin(), bins_.end(), halves,
+                              [](const Bin& each, std::int32_t other) { return each.halves < other; });
+  if (bin == bins_.end() || bin->halves != halves) bin = bins_.insert(bin, {halves, 0});
+  ++bin->count;
+  last_ = static_cast<std::size_t>(bin - bins_.begin());
 }
 
 std::optional<Stats> Histogram::stats() const {

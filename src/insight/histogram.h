@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <optional>
 #include <vector>
@@ -35,6 +36,8 @@ class Histogram {
 
   /// In order.
   std::vector<Bin> bins_;
+  /// The bin of the last value.
+  std::size_t last_ = 0;
 };
 
 }  // namespace vesk::insight

@@ -36,8 +36,8 @@ void appendSeriesRow(std::string& out, const Insight& insight) {
 
 void appendSeriesLine(std::string& out, const Insight& insight) {
   const Mobility& mobility = insight.timeline().mobility();
-  out += timeOfDay(insight.now().value_or(0)) + " ";
-  if (mobility.technology()) out.append(1, ' ').append(nameOf(*mobility.technology()));
+  out += timeOfDay(insight.now().value_or(0));
+  if (mobility.technology()) out.append("  ").append(nameOf(*mobility.technology()));
   if (mobility.cell()) out += " " + textOf(mobility.cell()->technology, mobility.cell()->identity);
   for (const KpiDescription& each : kKpis) {
     const auto value = insight.value(each.kpi);

@@ -113,6 +113,7 @@ struct TextWriter {
 
   std::string operator()(const BearerChange& change) const {
     std::string out = "bearer " + std::to_string(change.bearer.number);
+    if (kind != EventKind::bearerUp) return out;
     if (change.bearer.accessPoint) out += " " + std::string(change.bearer.accessPoint->view());
     return change.bearer.type ? out + " " + inWords(*change.bearer.type) : out;
   }
@@ -137,6 +138,7 @@ struct TextWriter {
 
   static std::string causeText(const std::optional<Text>& cause) { return cause ? inWords(*cause) : "no cause"; }
 
+  EventKind kind;
   std::int64_t time;
 };
 
@@ -276,7 +278,7 @@ std::optional<EventKind> eventKindNamed(std::string_view name) {
 }
 
 std::string textOf(const TimelineEvent& event) {
-  return std::visit(TextWriter{event.moment.time}, event.fields);
+  return std::visit(TextWriter{event.kind, event.moment.time}, event.fields);
 }
 
 void writeJson(JsonWriter& json, const TimelineEvent& event) {

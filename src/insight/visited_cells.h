@@ -2,7 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <optional>
+#include <memory>
 #include <vector>
 
 #include "insight/cell_identity.h"
@@ -31,7 +31,7 @@ class VisitedCells {
   /// More is known of the cell that serves.
   void fillIn(const CellIdentity& identity);
   /// No cell is known to serve.
-  void leave() { serving_.reset(); }
+  void leave() { serving_ = nullptr; }
   void addTime(std::int64_t passed);
   /// What was measured of it.
   void take(const KpiReport& kpis);
@@ -47,8 +47,9 @@ class VisitedCells {
   void makeRoom();
 
   /// In the order in which they first served.
-  std::vector<VisitedCell> cells_;
-  std::optional<std::size_t> serving_;
+  std::vector<std::unique_ptr<VisitedCell>> cells_;
+  /// Null while none is known to serve.
+  VisitedCell* serving_ = nullptr;
 };
 
 }  // namespace vesk::insight
