@@ -315,8 +315,7 @@ class CommandLine {
   static void addRuleOptions(CLI::App& command, RuleInput& rules) {
     command.add_option("--rule", rules.rules, "Tell when it fires: \"lte.rsrp < -110 for 10 s\", \"event drop\"")
         ->type_name("RULE")
-        ->expected(1)
-        ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
+        ->allow_extra_args(false);
     command.add_option("--rules", rules.file, "A file of such rules, one a line")->type_name("FILE");
   }
 
