@@ -3,10 +3,18 @@
 #include <string>
 
 #include "app/watched_drive.h"
+#include "values/visible_text.h"
 
 namespace vesk {
 
 namespace {
+
+/// An access point's name may hold anything.
+std::string visibleLineOf(const insight::TimelineEvent& event) {
+  std::string out;
+  appendVisible(out, lineOf(event));
+  return out;
+}
 
 std::string jsonOf(const insight::TimelineEvent& event) {
   std::string out;
@@ -26,7 +34,7 @@ Outcome runTimeline(const TimelineOptions& options) {
   insight.setRules(*std::move(rules));
   insight.setStepHandler([&](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
     for (const insight::TimelineEvent& event : events)
-      output.writeLine(options.asJson ? jsonOf(event) : lineOf(event));
+      output.writeLine(options.asJson ? jsonOf(event) : visibleLineOf(event));
   });
   return watchDrive(options.input, insight, output);
 }

@@ -6,6 +6,17 @@ void Insight::observeEventsOf(MetricValidator& intake) {
   intake.setEventObserver([this, &intake](const TakenEvent& event) { observe(event, intake); });
 }
 
+void Insight::startAnew() {
+  clock_ = {};
+  counts_ = {};
+  timeline_ = {};
+  heard_ = {};
+  summary_ = {};
+  judge_.forget();
+  trend_ = {};
+  happenings_.clear();
+}
+
 void Insight::observe(const TakenEvent& event, const MetricValidator& intake) {
   const std::uint64_t number = counts_.all++;
   switch (event.fate) {

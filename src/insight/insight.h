@@ -37,6 +37,9 @@ class Insight {
   /// Has `intake` tell it every event, for as long as both live.
   void observeEventsOf(MetricValidator& intake);
 
+  /// Forgets the whole drive, so that another one, or the same once more, can be followed. Rules and handler stay.
+  void startAnew();
+
   /// Rules to judge from the next event on.
   void setRules(std::vector<Rule> rules) { judge_.setRules(std::move(rules)); }
   /// Called after every event that takes part, with what it reported and what happened, often nothing.

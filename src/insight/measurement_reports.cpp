@@ -5,16 +5,23 @@ namespace vesk::insight {
 
 namespace {
 
-Number ecNoOf(const Record& chain) {
-  return decodedLevel(kEcNo, chain.find("rsrq_range"_text), 0.5, -24.5);
-}
+/// A receive chain of UMTS.
+struct UmtsChain {
+  Number rscp;
+  Number ecNo;
+  Number rssi;
+};
 
 /// Ec/N0 is RSCP / RSSI: where the RSCP is not reported, the two tell it.
-Number rscpOf(const Record& chain) {
-  if (const Value* code = chain.find("rsrp_range"_text)) return decodedLevel(kRscp, code, 1, -116);
-  const Number power = levelOf(kRssi, chain, "rssi"_text);
-  const Number ecNo = ecNoOf(chain);
-  return power && ecNo && isPossible(kRscp, *power + *ecNo) ? Number(*power + *ecNo) : std::nullopt;
+UmtsChain umtsChainOf(const Record& record) {
+  UmtsChain chain{std::nullopt, decodedLevel(kEcNo, record.find("rsrq_range"_text), 0.5, -24.5),
+                  levelOf(kRssi, record, "rssi"_text)};
+  if (const Value* code = record.find("rsrp_range"_text)) {
+    chain.rscp = decodedLevel(kRscp, code, 1, -116);
+  } else if (chain.rssi && chain.ecNo && isPossible(kRscp, *chain.rssi + *chain.ecNo)) {
+    chain.rscp = *chain.rssi + *chain.ecNo;
+  }
+  return chain;
 }
 
 /// Under which keys a list has what is known of a cell.
@@ -84,11 +91,14 @@ void readUmtsMeasurement(Report& report, const Dictionary& record, const MetricV
   const Value* isConnected = record.find("connected_mode"_text);
   if (isConnected != nullptr && isConnected->boolean() != nullptr) report.isConnectedMode = *isConnected->boolean();
   if (record.find("rx_info"_text) == nullptr) return;
-  const RecordList& chains = intake.myUMTS.rXInfo;
-  report.kpis.add(Kpi::umtsRscp, greatest(chains, rscpOf));
-  report.kpis.add(Kpi::umtsEcNo, greatest(chains, ecNoOf));
-  report.kpis.add(Kpi::umtsRssi,
-                  greatest(chains, [](const Record& each) { return levelOf(kRssi, each, "rssi"_text); }));
+  UmtsChain best;
+  for (const Record& each : intake.myUMTS.rXInfo) {
+    const UmtsChain chain = umtsChainOf(each);
+    best = {greater(best.rscp, chain.rscp), greater(best.ecNo, chain.ecNo), greater(best.rssi, chain.rssi)};
+  }
+  report.kpis.add(Kpi::umtsRscp, best.rscp);
+  report.kpis.add(Kpi::umtsEcNo, best.ecNo);
+  report.kpis.add(Kpi::umtsRssi, best.rssi);
   if (!report.kpis.empty()) report.technology = Technology::umts;
 }
 

@@ -4,6 +4,15 @@
 
 namespace vesk::insight {
 
+namespace {
+
+/// Those of which counts for how long their values were known.
+constexpr std::array kKpisOfTime{Kpi::lteRsrp,         Kpi::lteRsrq,   Kpi::lteSinr,  Kpi::ltePuschTxPower,
+                                 Kpi::ltePucchTxPower, Kpi::umtsRscp,  Kpi::umtsEcNo, Kpi::umtsTxPower,
+                                 Kpi::gsmRxLev,        Kpi::gsmTxPower};
+
+}  // namespace
+
 void Summary::pass(std::int64_t passed, std::int64_t from, const Timeline& timeline) {
   const auto& technology = timeline.mobility().technology();
   times_[technology ? indexOf(*technology) : kTechnologies.size()] += passed;
@@ -15,10 +24,10 @@ void Summary::pass(std::int64_t passed, std::int64_t from, const Timeline& timel
 }
 
 void Summary::passKpis(std::int64_t passed, std::int64_t from, const KnownKpis& known) {
-  for (const KpiDescription& each : kKpis) {
-    if (!each.isGraded && !each.isTransmitPower) continue;
-    const auto value = known.at(each.kpi, from);
+  for (const Kpi kpiOfTime : kKpisOfTime) {
+    const auto value = known.at(kpiOfTime, from);
     if (!value) continue;
+    const KpiDescription& each = descriptionOf(kpiOfTime);
     KpiSummary& kpi = kpis_[indexOf(each.kpi)];
     kpi.known += passed;
     if (each.isTransmitPower && *value >= kHighTxPower) kpi.high += passed;

@@ -1,6 +1,7 @@
 #include <array>
 #include <cmath>
 #include <cstdio>
+#include <utility>
 
 #include "insight/summary_form.h"
 #include "insight/text_forms.h"
@@ -179,11 +180,10 @@ class SummaryLines {
       const KpiSummary& kpi = summary_.kpi(each.kpi);
       const auto stats = kpi.values.stats();
       if (!each.isTransmitPower || !stats) continue;
-      line += (line.empty() ? "" : "   ") + std::string(each.name) + " " + numberText(stats->max) + " dBm, " +
-              percent(kpi.high, kpi.known) + " high";
-      if (line.size() + 30 < kWidth) continue;
-      add(line);
-      line.clear();
+      const std::string power =
+          std::string(each.name) + " max " + numberText(stats->max) + " dBm, " + percent(kpi.high, kpi.known) + " high";
+      if (!line.empty() && line.size() + 2 + power.size() > kWidth) add(std::exchange(line, ""));
+      line += (line.empty() ? "" : "  ") + power;
     }
     if (!line.empty()) add(line);
   }

@@ -5,11 +5,10 @@
 namespace vesk::insight {
 
 void Trend::take(const KpiReport& report, std::int64_t position, std::int64_t time) {
-  const std::int64_t second = position - position % kWidth;
   for (const auto& [kpi, value] : report) {
     std::deque<TrendPoint>& points = points_[indexOf(kpi)];
-    if (points.empty() || points.back().position != second) {
-      points.push_back({second, time, value, value, value, 1});
+    if (points.empty() || position - points.back().position >= kWidth) {
+      points.push_back({position - position % kWidth, time, value, value, value, 1});
       if (points.size() > kMostPoints) points.pop_front();
       continue;
     }
