@@ -62,6 +62,13 @@ inline constexpr const char* kSeriesExamples =
     "  vesk series drive.jsonl\n"
     "  vesk series --csv drive.jsonl > drive.csv";
 
+inline constexpr const char* kReadingsExamples =
+    "At the end of the recording, as the screens are then; with the cells heard.\n"
+    "\n"
+    "Examples:\n"
+    "  vesk readings drive.jsonl\n"
+    "  vesk readings --json drive.jsonl | jq '.heard[] | select(.role == \"serving\")'";
+
 inline constexpr const char* kRedactExamples =
     "Masked are IMSI, TMSI, addresses, access points' names, call identifiers and the\n"
     "contents of SIM files that name a subscriber. Cells, areas and times stay.\n"

@@ -15,6 +15,7 @@
 #include "app/command_examples.h"
 #include "app/data_output.h"
 #include "app/decode_command.h"
+#include "app/readings_command.h"
 #include "app/redact_command.h"
 #include "app/run_command.h"
 #include "app/series_command.h"
@@ -95,6 +96,7 @@ class CommandLine {
     addSummary();
     addTimeline();
     addSeries();
+    addReadings();
     addRedact();
     addSimulate();
   }
@@ -213,6 +215,15 @@ class CommandLine {
     addLogOption(*series, kDataLog);
     series->footer(kSeriesExamples);
     series->final_callback([this] { command_ = [this] { return runSeries(input_, asCsv_); }; });
+  }
+
+  void addReadings() {
+    CLI::App* readings = program_.add_subcommand("readings", "Print what the values on the screens mean");
+    addRecording(*readings, input_);
+    readings->add_flag("--json", asJson_, "Print one JSON object");
+    addLogOption(*readings, kDataLog);
+    readings->footer(kReadingsExamples);
+    readings->final_callback([this] { command_ = [this] { return runReadings(input_, asJson_); }; });
   }
 
   void addRedact() {

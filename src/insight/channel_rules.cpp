@@ -73,15 +73,15 @@ std::optional<SharedGsmBand> indicatedBand(const Dictionary& record) {
 
 }  // namespace
 
-std::optional<Reading> readEarfcn(const Rule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readEarfcn(const ReadingRule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
   return readChannel(value, lteBandOfDownlink, downlinkReading);
 }
 
-std::optional<Reading> readUplinkEarfcn(const Rule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readUplinkEarfcn(const ReadingRule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
   return readChannel(value, lteBandOfUplink, uplinkReading);
 }
 
-std::optional<Reading> readBand(const Rule& rule, const Value& value, const Dictionary& record) {
+std::optional<Reading> readBand(const ReadingRule& rule, const Value& value, const Dictionary& record) {
   return readChannel(value, findLteBand, [&](const LteBand& band, std::int64_t number) {
     Reading reading{.text = bandText(band) + " ", .band = std::to_string(number), .duplex = band.duplex};
     reading.text += nameOf(band.duplex);
@@ -96,13 +96,13 @@ std::optional<Reading> readBand(const Rule& rule, const Value& value, const Dict
   });
 }
 
-std::optional<Reading> readUarfcn(const Rule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readUarfcn(const ReadingRule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
   return readChannel(value, umtsChannel, [](const Channel& channel, std::int64_t /*uarfcn*/) {
     return channelReading(channel, "band " + std::string(channel.band));
   });
 }
 
-std::optional<Reading> readArfcn(const Rule& /*rule*/, const Value& value, const Dictionary& record) {
+std::optional<Reading> readArfcn(const ReadingRule& /*rule*/, const Value& value, const Dictionary& record) {
   const auto find = [&](std::int64_t arfcn) { return gsmChannel(arfcn, indicatedBand(record)); };
   return readChannel(value, find, [](const GsmChannel& channel, std::int64_t /*arfcn*/) {
     Reading reading = channelReading(channel, std::string(channel.band));

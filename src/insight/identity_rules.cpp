@@ -64,7 +64,7 @@ std::optional<Reading> readCountryCode(std::int64_t code) {
   return Reading{.text = codeText(code, 3)};
 }
 
-std::optional<Reading> readNetworkCode(const Rule& rule, const Value& value, const Dictionary& record) {
+std::optional<Reading> readNetworkCode(const ReadingRule& rule, const Value& value, const Dictionary& record) {
   if (!value.number()) return std::nullopt;
   const std::optional<std::int64_t> code = value.integer();
   if (!code || *code < rule.lowest || *code > rule.highest) return impossibleReading();
@@ -87,7 +87,7 @@ std::optional<Reading> readHexadecimal(std::int64_t code) {
   return Reading{.text = hexadecimalText(code, 8)};
 }
 
-std::optional<Reading> readArea(const Rule& rule, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readArea(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {
   const Dictionary* area = value.dictionary();
   if (area == nullptr) return std::nullopt;
   const std::optional<std::string> plmn = encodedPlmnText(*area);

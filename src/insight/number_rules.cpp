@@ -44,14 +44,14 @@ Reading bandwidthReading(const Bandwidth& bandwidth) {
 
 }  // namespace
 
-std::optional<Reading> readByCode(const Rule& rule, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readByCode(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {
   if (!value.number()) return std::nullopt;
   const std::optional<std::int64_t> code = value.integer();
   if (!code || *code < rule.lowest || *code > rule.highest) return impossibleReading();
   return rule.readCode(*code);
 }
 
-std::optional<Reading> readLevel(const Rule& rule, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readLevel(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {
   const std::optional<double> code = value.number();
   if (!code) return std::nullopt;
   const double number = *code * rule.scale + rule.offset;
@@ -71,7 +71,7 @@ std::optional<Reading> readLevel(const Rule& rule, const Value& value, const Dic
   return reading;
 }
 
-std::optional<Reading> readNumber(const Rule& rule, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readNumber(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {
   const std::optional<double> code = value.number();
   if (!code) return std::nullopt;
   if (*code < static_cast<double>(rule.lowest) || *code > static_cast<double>(rule.highest)) return impossibleReading();
@@ -79,7 +79,7 @@ std::optional<Reading> readNumber(const Rule& rule, const Value& value, const Di
   return Reading{.text = withUnit(number, rule.unit), .value = number, .unit = rule.unit};
 }
 
-std::optional<Reading> readBandwidth(const Rule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readBandwidth(const ReadingRule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
   if (!value.number()) return std::nullopt;
   const std::optional<float> megahertz = value.exactFloat();
   // Half of the narrowest, in whole units, is what comes of it.

@@ -12,15 +12,15 @@ namespace {
 
 struct RowRule {
   std::string_view key;
-  Rule rule;
+  ReadingRule rule;
 };
 
-constexpr Rule kPercent = number("%", 0, 100);
+constexpr ReadingRule kPercent = number("%", 0, 100);
 /// As broadcast: levels in steps of 2 dB, qualities in dB.
-constexpr Rule kLeastLevel = code("dBm", -70, -22, 2);
-constexpr Rule kLeastQuality = number("dB", -34, -3);
-constexpr Rule kLevelThreshold = code("dB", 0, 31, 2);
-constexpr Rule kQualityThreshold = number("dB", 0, 31);
+constexpr ReadingRule kLeastLevel = code("dBm", -70, -22, 2);
+constexpr ReadingRule kLeastQuality = number("dB", -34, -3);
+constexpr ReadingRule kLevelThreshold = code("dB", 0, 31, 2);
+constexpr ReadingRule kQualityThreshold = number("dB", 0, 31);
 
 // clang-format off
 constexpr RowRule kEmmContextRows[] = {
@@ -361,7 +361,7 @@ bool isNoValue(const Value& value) {
   return number && std::find(kNoValues.begin(), kNoValues.end(), *number) != kNoValues.end();
 }
 
-const Rule* findRule(std::string_view messageClass, std::string_view key) {
+const ReadingRule* findRule(std::string_view messageClass, std::string_view key) {
   const auto* message = std::find_if(kMessages.begin(), kMessages.end(),
                                      [&](const MessageRules& each) { return each.messageClass == messageClass; });
   if (message == kMessages.end()) return nullptr;
@@ -370,7 +370,7 @@ const Rule* findRule(std::string_view messageClass, std::string_view key) {
   return row == message->rows.end() ? nullptr : &row->rule;
 }
 
-std::optional<Reading> readingBy(const Rule* rule, const Value& value, const Dictionary& record) {
+std::optional<Reading> readingBy(const ReadingRule* rule, const Value& value, const Dictionary& record) {
   if (rule == nullptr) return std::nullopt;
   return isNoValue(value) ? impossibleReading() : rule->read(*rule, value, record);
 }

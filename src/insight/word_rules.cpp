@@ -77,14 +77,14 @@ constexpr std::array<std::string_view, 3> kControlOrderTexts{"NC0", "NC1", "NC2"
 
 }  // namespace
 
-std::optional<Reading> readName(const Rule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readName(const ReadingRule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
   const Text* name = value.text();
   if (name == nullptr || isUnknownName(name->view())) return std::nullopt;
   std::string text = withBlanks(shortName(name->view()));
   return text == name->view() ? std::nullopt : std::optional(Reading{.text = std::move(text)});
 }
 
-std::optional<Reading> readCause(const Rule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readCause(const ReadingRule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
   const Text* name = value.text();
   const std::optional<std::int32_t> code = name == nullptr ? std::nullopt : causeCode(name->view());
   if (!code) return std::nullopt;
@@ -92,7 +92,7 @@ std::optional<Reading> readCause(const Rule& /*rule*/, const Value& value, const
   return Reading{.text = "#" + std::to_string(*code) + " " + withBlanks(shortName(name->view())), .code = code};
 }
 
-std::optional<Reading> readAddress(const Rule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
+std::optional<Reading> readAddress(const ReadingRule& /*rule*/, const Value& value, const Dictionary& /*record*/) {
   constexpr std::size_t kVersion4 = 4;
   constexpr std::size_t kInterface = 8;
   constexpr std::size_t kVersion6 = 16;
