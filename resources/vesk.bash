@@ -42,13 +42,13 @@ _vesk_files() {
 
 _vesk() {
   local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
-  local command='' word skip='' arguments=() options='--replay --headless --speed --seed --loop --seconds --log --version'
+  local command='' word skip='' arguments=() options='--replay --headless --speed --seed --loop --seconds --rule --rules --redact --log --version'
   COMPREPLY=()
 
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
     if [[ -n $skip ]]; then
       skip=''
-    elif [[ $word == --@(replay|speed|seed|seconds|log) ]]; then
+    elif [[ $word == --@(replay|speed|seed|seconds|log|rule|rules) ]]; then
       skip=1
     elif [[ $word != -?* && -z $command ]]; then
       command=$word
@@ -58,25 +58,28 @@ _vesk() {
   done
 
   case $previous in
-    --replay) _vesk_files && return ;;
+    --replay | --rules) _vesk_files && return ;;
     --speed) _vesk_offer < <(printf '%s\n' 1 2 5 10 max) && return ;;
     --log)
       _vesk_files
       _vesk_offer < <(printf '%s\n' syslog stderr none)
       return
       ;;
-    --seed | --seconds) return ;;
+    --seed | --seconds | --rule) return ;;
   esac
 
   case $command in
-    decode | stores) options='--log' ;;
-    show) options='--json --log' ;;
+    decode | stores) options='--redact --log' ;;
+    redact) options='--log' ;;
+    show | summary | readings) options='--json --redact --log' ;;
+    timeline) options='--json --rule --rules --redact --log' ;;
+    series) options='--csv --redact --log' ;;
     simulate) options='--seed --seconds --log' ;;
   esac
   if [[ $cur == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
   elif [[ -z $command ]]; then
-    mapfile -t COMPREPLY < <(compgen -W 'decode stores show simulate' -- "$cur")
+    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings redact simulate' -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
     _vesk_offer < <(_vesk_areas)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then

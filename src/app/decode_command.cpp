@@ -1,14 +1,7 @@
 #include "app/decode_command.h"
 
-#include <optional>
-#include <unistd.h>
-#include <variant>
-
-#include "app/data_output.h"
-#include "app/progress.h"
-#include "app/recording_hint.h"
+#include "app/event_lines.h"
 #include "messages/registry/metric_classes.h"
-#include "recording/recording_reader.h"
 #include "values/text_form.h"
 
 namespace vesk {
@@ -37,70 +30,10 @@ void appendDecodedEvent(std::string& out, const RecordedEvent& event) {
   }
 }
 
-/// Decodes a recording step by step; each step answers whether to go on.
-class Decoding {
- public:
-  explicit Decoding(const std::string& path) : path_(path), reader_(path) {
-    reader_.setBeforeRead([this](int) {
-      output_.flush();
-      return !output_.hasFailed();
-    });
-  }
-
-  Outcome run() {
-    while (!output_.hasFailed() && std::visit(*this, reader_.next())) {
-    }
-    progress_.hide();
-    if (events_ == 0 && hasBadLines_) tellIsNoRecording(path_);
-    return output_.finish(outcome_);
-  }
-
-  bool operator()(const RecordedEvent& event) {
-    line_.clear();
-    appendDecodedEvent(line_, event);
-    output_.writeLine(line_);
-    // So rarely that asking the clock costs nothing.
-    if (++events_ % kEventsToProgress == 0) progress_.show(events_, event.at, duration_);
-    return true;
-  }
-
-  bool operator()(const BadLine& bad) {
-    hasBadLines_ = true;
-    fail(bad.message);
-    return true;
-  }
-
-  bool operator()(const ReadFailure& failure) {
-    fail("vesk: " + failure.message);
-    return false;
-  }
-
-  bool operator()(EndOfRecording /*end*/) { return false; }
-
- private:
-  static constexpr std::uint64_t kEventsToProgress = 4096;
-
-  void fail(const std::string& reason) {
-    progress_.hide();
-    tellUser(reason);
-    outcome_ = Outcome::failed;
-  }
-
-  const std::string& path_;
-  RecordingReader reader_;
-  DataOutput output_;
-  Progress progress_{Progress::Output::meanwhile};
-  const std::optional<double> duration_ = progress_.isPossible() ? reader_.duration() : std::nullopt;
-  std::uint64_t events_ = 0;
-  bool hasBadLines_ = false;
-  std::string line_;
-  Outcome outcome_ = Outcome::done;
-};
-
 }  // namespace
 
-Outcome runDecode(const std::string& path) {
-  return Decoding(path).run();
+Outcome runDecode(const RecordingInput& input) {
+  return writeEventLines(input, appendDecodedEvent);
 }
 
 }  // namespace vesk

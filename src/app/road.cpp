@@ -6,6 +6,7 @@
 #include "app/app_delegate.h"
 #include "app/progress.h"
 #include "app/recording_hint.h"
+#include "app/redaction.h"
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
@@ -29,8 +30,8 @@ std::optional<std::string> whyNoMetricArrives(const NavigationController& root) 
   return "vesk: the metric configuration is missing or was refused, and no metric arrives; --log stderr tells more";
 }
 
-Outcome playRecording(const std::optional<std::string>& path,
-                      const std::function<void(NavigationController& root)>& use) {
+Outcome playRecording(const RecordingInput& input, const std::function<void(NavigationController& root)>& use,
+                      const std::function<void()>& beforePlaying) {
   OutputLines::setSink(nullptr);
   const SteadyClock clock;
   RunLoop loop(clock);
@@ -41,32 +42,38 @@ Outcome playRecording(const std::optional<std::string>& path,
     tellUser(reason);
     outcome = Outcome::failed;
   };
+  Redaction redaction;
   std::shared_ptr<corvik::RecordedService> service;
-  if (path) {
-    auto recording = std::make_unique<RecordingReader>(*path);
+  if (input.path) {
+    auto recording = std::make_unique<RecordingReader>(*input.path);
     if (recording->failure()) {
       fail("vesk: " + *recording->failure());
       return outcome;
     }
+    using Runs = corvik::RecordedService::Runs;
+    const bool isWatchedPipe = beforePlaying && *input.path == "-";
     service =
         std::make_shared<corvik::RecordedService>(std::move(recording), clock, corvik::Playback{.speed = std::nullopt},
-                                                  corvik::RecordedService::Runs::onMainThread);
+                                                  isWatchedPipe ? Runs::onThreadOfItsOwn : Runs::onMainThread);
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
       if (failure) fail("vesk: " + *failure);
       loop.stop();
     });
   }
-  corvik::installService(service);
+  const std::shared_ptr<corvik::Service> installed =
+      input.isRedacted && service != nullptr ? makeRedactedService(service, redaction) : service;
+  corvik::installService(installed);
 
   AppDelegate delegate;
   Application application(veskInterface(), delegate);
   const int status = application.run([&](NavigationController& root) {
-    if (path) {
+    if (input.path) {
       if (const auto reason = whyNoMetricArrives(root)) {
         fail(*reason);
         return;
       }
+      if (beforePlaying) beforePlaying();
       std::optional<Timer> ticker;
       if (progress.isPossible()) {
         ticker.emplace(loop, kProgressInterval, RunLoopMode::defaultMode, [&] {
@@ -76,13 +83,14 @@ Outcome playRecording(const std::optional<std::string>& path,
       }
       loop.run();
       progress.hide();
-      if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*path);
+      if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*input.path);
     }
     use(root);
   });
   if (status != 0) outcome = Outcome::failed;
   // The connection outlives all that the service was made of here.
-  if (service != nullptr) service->shutDown();
+  if (installed != nullptr) installed->shutDown();
+  redaction.tellLeftOut();
   return outcome;
 }
 
