@@ -10,10 +10,9 @@ namespace vesk::insight {
 
 namespace {
 
-/// Rounded half up, as people do.
+/// Rounded half up, as people do; in whole numbers, as 14.5 % is no exact fraction.
 std::string percent(std::int64_t part, std::int64_t whole) {
-  const double share = whole == 0 ? 0 : static_cast<double>(part) / static_cast<double>(whole);
-  return std::to_string(static_cast<int>(std::floor(share * 100 + 0.5))) + " %";
+  return std::to_string(whole == 0 ? 0 : (200 * part + whole) / (2 * whole)) + " %";
 }
 
 std::string whole(double number) {
