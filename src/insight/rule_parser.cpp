@@ -54,14 +54,12 @@ class RuleParser {
     const std::string_view subject = word();
     const bool isRead = subject == "event" ? readEvent() : readKpi(subject);
     skipBlanks();
-    if (isRead && place_ != text_.size()) fail(place_, isEvent() ? "the end" : "for, or the end");
+    if (isRead && place_ != text_.size()) fail(place_, "the end");
     if (error_) return *error_;
     return Rule{std::string(text_), *condition_};
   }
 
  private:
-  [[nodiscard]] bool isEvent() const { return std::holds_alternative<EventRule>(*condition_); }
-
   bool readEvent() {
     skipBlanks();
     const std::size_t start = place_;
@@ -94,7 +92,8 @@ class RuleParser {
     skipBlanks();
     const std::size_t start = place_;
     if (place_ == text_.size()) return true;
-    if (start == afterLimit || word() != "for") return fail(start, "for, or the end");
+    if (start == afterLimit) return fail(start, "a blank, or the end");
+    if (word() != "for") return fail(start, "for, or the end");
     if (place_ < text_.size() && !isBlank(text_[place_])) return fail(place_, "a blank");
     const auto count = number();
     if (!count) return false;

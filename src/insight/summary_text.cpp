@@ -10,10 +10,9 @@ namespace vesk::insight {
 
 namespace {
 
-/// Rounded half up, as people do.
+/// Rounded half up, as people do; in whole numbers, as 14.5 % is no exact fraction.
 std::string percent(std::int64_t part, std::int64_t whole) {
-  const double share = whole == 0 ? 0 : static_cast<double>(part) / static_cast<double>(whole);
-  return std::to_string(static_cast<int>(std::floor(share * 100 + 0.5))) + " %";
+  return std::to_string(whole == 0 ? 0 : (200 * part + whole) / (2 * whole)) + " %";
 }
 
 std::string whole(double number) {
@@ -37,6 +36,12 @@ std::string right(std::string text, std::size_t width) {
 std::string left(std::string text, std::size_t width) {
   if (text.size() < width) text.append(width - text.size(), ' ');
   return text;
+}
+
+/// Appends `text` so that it ends at `column`, and behind it where there is no room for it and a blank.
+void appendUpTo(std::string& line, std::size_t column, const std::string& text) {
+  const std::size_t taken = line.size() + text.size();
+  line.append(taken < column ? column - taken : 1, ' ').append(text);
 }
 
 template <class Number>
@@ -91,11 +96,23 @@ class SummaryLines {
     addTxPower();
     addRegistration();
     addCells(height);
+    if (lines_.size() > height) lines_.resize(height);
     return std::move(lines_);
   }
 
  private:
   void add(std::string line) { lines_.push_back(std::move(line)); }
+
+  /// One line where they fit in it, else several.
+  void addJoined(const std::vector<std::string>& parts, std::string_view separator) {
+    std::string line;
+    for (const std::string& part : parts) {
+      if (!line.empty() && line.size() + separator.size() + part.size() > kWidth) add(std::exchange(line, ""));
+      if (!line.empty()) line += separator;
+      line += part;
+    }
+    if (!line.empty()) add(std::move(line));
+  }
 
   void addHead() {
     const EventCounts& counts = insight_.counts();
@@ -105,12 +122,13 @@ class SummaryLines {
     add(line);
     if (!insight_.now()) return;
     const std::uint64_t stretches = insight_.clock().stretches();
-    line = spanText(insight_.clock().counted()) + " counted in " + counted(stretches, "stretch", "stretches") + ", " +
-           counted(stretches - 1, "gap", "gaps");
+    std::vector<std::string> parts{spanText(insight_.clock().counted()) + " counted in " +
+                                   counted(stretches, "stretch", "stretches") + ", " +
+                                   counted(stretches - 1, "gap", "gaps")};
     const std::uint64_t noService = summary_.count(EventKind::noService);
     if (noService > 0)
-      line += "; no service " + counted(noService, "time", "times") + ", " + spanText(summary_.noService());
-    add(line);
+      parts.push_back("no service " + counted(noService, "time", "times") + ", " + spanText(summary_.noService()));
+    addJoined(parts, "; ");
   }
 
   void addTechnologies() {
@@ -150,10 +168,11 @@ class SummaryLines {
     const std::string name(nameOf(technology));
     const std::uint64_t ended = counts.failed.total() + counts.dropped.total() + counts.released.total();
     if (counts.attempted + counts.established + ended > 0)
-      add(name + " connections: " + std::to_string(counts.attempted) + " attempted, " +
-          std::to_string(counts.established) + " established, " + std::to_string(counts.failed.total()) + " failed, " +
-          std::to_string(counts.dropped.total()) + " dropped, " + std::to_string(counts.released.total()) +
-          " released");
+      addJoined(
+          {name + " connections: " + std::to_string(counts.attempted) + " attempted",
+           std::to_string(counts.established) + " established", std::to_string(counts.failed.total()) + " failed",
+           std::to_string(counts.dropped.total()) + " dropped", std::to_string(counts.released.total()) + " released"},
+          ", ");
     if (counts.reestablishments.total() > 0)
       add(name + " re-established: " + std::to_string(counts.reestablished) + " of " +
           std::to_string(counts.reestablishments.total()));
@@ -175,17 +194,15 @@ class SummaryLines {
   }
 
   void addTxPower() {
-    std::string line;
+    std::vector<std::string> powers;
     for (const KpiDescription& each : kKpis) {
       const KpiSummary& kpi = summary_.kpi(each.kpi);
       const auto stats = kpi.values.stats();
       if (!each.isTransmitPower || !stats) continue;
-      const std::string power =
-          std::string(each.name) + " max " + numberText(stats->max) + " dBm, " + percent(kpi.high, kpi.known) + " high";
-      if (!line.empty() && line.size() + 2 + power.size() > kWidth) add(std::exchange(line, ""));
-      line += (line.empty() ? "" : "  ") + power;
+      powers.push_back(std::string(each.name) + " max " + numberText(stats->max) + " dBm, " +
+                       percent(kpi.high, kpi.known) + " high");
     }
-    if (!line.empty()) add(line);
+    addJoined(powers, "  ");
   }
 
   void addRegistration() {
@@ -197,9 +214,11 @@ class SummaryLines {
     const std::uint64_t changes = summary_.count(EventKind::emm) + summary_.count(EventKind::mm) +
                                   summary_.count(EventKind::gmm) + summary_.count(EventKind::bearerUp) + rejects;
     if (changes == 0) return;
-    add("registration changes: " + count(EventKind::emm) + " EMM, " + count(EventKind::mm) + " MM, " +
-        count(EventKind::gmm) + " GMM; rejects " + std::to_string(rejects) + "; bearers " + count(EventKind::bearerUp) +
-        " up, " + count(EventKind::bearerDown) + " down");
+    addJoined({"registration changes: " + count(EventKind::emm) + " EMM, " + count(EventKind::mm) + " MM, " +
+                   count(EventKind::gmm) + " GMM",
+               "rejects " + std::to_string(rejects),
+               "bearers " + count(EventKind::bearerUp) + " up, " + count(EventKind::bearerDown) + " down"},
+              "; ");
   }
 
   void addCells(std::size_t height) {
@@ -209,12 +228,15 @@ class SummaryLines {
       if (lines_.size() == height) return;
       const auto level = cell->level.stats();
       const auto quality = cell->quality.stats();
-      const std::string name = textOf(cell->technology, cell->identity, true);
-      const std::string time = spanText(cell->time);
-      add(left(name, 42 - time.size()) + time + right(percent(cell->time, insight_.clock().counted()), 6) +
-          right(std::to_string(cell->visits), 7) + right(level ? numberText(level->min) : "-", 6) +
-          right(level ? whole(level->mean) : "-", 5) + right(level ? numberText(level->max) : "-", 5) +
-          right(quality ? whole(quality->mean) : "-", 8));
+      std::string line = textOf(cell->technology, cell->identity, true);
+      appendUpTo(line, 42, spanText(cell->time));
+      appendUpTo(line, 48, percent(cell->time, insight_.clock().counted()));
+      appendUpTo(line, 55, std::to_string(cell->visits));
+      appendUpTo(line, 61, level ? numberText(level->min) : "-");
+      appendUpTo(line, 66, level ? whole(level->mean) : "-");
+      appendUpTo(line, 71, level ? numberText(level->max) : "-");
+      appendUpTo(line, 79, quality ? whole(quality->mean) : "-");
+      add(std::move(line));
     }
   }
 

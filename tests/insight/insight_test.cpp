@@ -122,6 +122,29 @@ TEST(Summary, TellsTheWholeDrive) {
       R"("kinds":{"gap":1,"technology":3,"cell":3,"handover":1,"rrc":1,"emm":1,"ca-activated":1,"no-service":1}})");
 }
 
+TEST(Summary, FitsAScreenWhateverItCounts) {
+  Drive drive({umtsCell(0, 10637, 500, 268'435'455)});
+  for (std::int64_t at = 45'000; at <= 855'000; at += 45'000)
+    drive.play({umtsLevel(at, -70, 43)});
+  drive.play({umtsCell(855'000, 10638, 501), umtsLevel(900'000, -70, 43), umtsLevel(950'000, -70, 43),
+              umtsLevel(1'000'000, -70, 43)});
+  for (int count = 0; count < 1000; ++count)
+    drive.play({lteRrc(1'000'000, KLTE_RRC_STATE_CONNECTED), lteRrc(1'000'000, KLTE_RRC_STATE_IDLE)});
+  EXPECT_EQ(summaryText(drive.insight),
+            "2024 of 2024 events, 2018-01-20 21:52:40 to 2018-01-20 22:09:20 UTC\n"
+            "16 min 40 s counted in 1 stretch, 0 gaps\n"
+            "technology  UMTS 100 %\n"
+            "kpi          count     min    mean  median     max   excellent  good  fair  poor\n"
+            "umts.rscp       22     -73   -73.0     -73     -73       100 %   0 %   0 %   0 %\n"
+            "umts.ecno       22      -3    -3.0      -3      -3       100 %   0 %   0 %   0 %\n"
+            "LTE connections: 999 attempted, 999 established, 0 failed, 0 dropped\n"
+            "1000 released\n"
+            "UMTS cell changes: 0 handovers, 0 reselections, 1 other, 0 ping-pongs\n"
+            "cell                                  time share visits   min mean  max quality\n"
+            "PSC 500 UARFCN 10637 CI 268435455 14 min 15 s 86 %    1   -73  -73  -73      -3\n"
+            "PSC 501 UARFCN 10638            2 min 25 s  15 %      1   -73  -73  -73      -3");
+}
+
 /// The memory of a drive is that of its histograms, rings and bounded tables, whatever comes.
 TEST(Summary, IsBoundedHoweverManyCellsAreVisited) {
   Drive drive;
