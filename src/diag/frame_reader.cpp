@@ -1,0 +1,1 @@
+#include "diag/frame_reader.h"
