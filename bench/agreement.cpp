@@ -8,7 +8,7 @@
 
 #include "bench/stop.h"
 #include "messages/codec/proto_writer.h"
-#include "platform/text_form.h"
+#include "values/text_form.h"
 
 namespace vesk::bench {
 

@@ -5,9 +5,9 @@
 #include <variant>
 
 #include "bench/stop.h"
-#include "corvik/recording_reader.h"
 #include "handset/handset.h"
 #include "intake/metric_table.h"
+#include "recording/recording_reader.h"
 
 namespace vesk::bench {
 
@@ -92,13 +92,13 @@ Corpus mixedCorpus(std::size_t count) {
 }
 
 Corpus recordedCorpus(const std::string& path) {
-  corvik::RecordingReader reader(path);
+  RecordingReader reader(path);
   std::vector<std::vector<std::uint8_t>> payloads;
   std::vector<Event> events;
-  for (auto step = reader.next(); !std::holds_alternative<corvik::EndOfRecording>(step); step = reader.next()) {
-    if (const auto* failure = std::get_if<corvik::ReadFailure>(&step)) stop(failure->message);
-    if (const auto* bad = std::get_if<corvik::BadLine>(&step)) stop(bad->message);
-    const auto& event = std::get<corvik::RecordedEvent>(step);
+  for (auto step = reader.next(); !std::holds_alternative<EndOfRecording>(step); step = reader.next()) {
+    if (const auto* failure = std::get_if<ReadFailure>(&step)) stop(failure->message);
+    if (const auto* bad = std::get_if<BadLine>(&step)) stop(bad->message);
+    const auto& event = std::get<RecordedEvent>(step);
     const Kind* kind = findKind(event.metricId);
     if (kind == nullptr) continue;
     const auto& payload = payloads.emplace_back(event.payload.begin(), event.payload.end());

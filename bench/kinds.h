@@ -10,7 +10,7 @@
 
 #include "bench/peers/reflection_walk.h"
 #include "messages/codec/proto_codable.h"
-#include "platform/data.h"
+#include "values/data.h"
 
 namespace vesk::bench {
 

@@ -7,7 +7,7 @@
 
 #include "bench/corpus.h"
 #include "bench/stop.h"
-#include "corvik/recorded_event.h"
+#include "recording/recorded_event.h"
 
 int main(int argc, char** argv) {
   using namespace vesk::bench;
@@ -20,7 +20,7 @@ int main(int argc, char** argv) {
   std::string line;
   for (const Event& event : corpus.events()) {
     line.clear();
-    corvik::appendRecordedEvent(line, {event.at, event.kind->metricId, event.payload});
+    appendRecordedEvent(line, {event.at, event.kind->metricId, event.payload});
     std::fputs(line.c_str(), stdout);
   }
   if (std::fflush(stdout) != 0) stop("the recording cannot be written");

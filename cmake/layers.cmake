@@ -1,16 +1,16 @@
 # Every target of the project is made by one of these two functions, so that warnings, the include root and the
-# link line (SEES: what the code may include and call) are stated the same way everywhere.
+# link line (what the code may include and call) are stated the same way everywhere.
 
 add_library(vesk_options INTERFACE)
 target_compile_options(vesk_options INTERFACE -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror)
 target_include_directories(vesk_options INTERFACE ${CMAKE_SOURCE_DIR}/src)
 
-# vesk_layer(NAME SOURCES ... [SEES ...] [USES ...]): one folder of src/ as a library. SEES names layers below it;
-# USES names libraries from outside the project.
+# vesk_layer(NAME SOURCES ... [SHOWS ...] [SEES ...] [USES ...]): one folder of src/ as a library. SHOWS names the layers
+# that its headers include, SEES those that only its sources do; USES names libraries from outside the project.
 function(vesk_layer name)
-  cmake_parse_arguments(LAYER "" "" "SOURCES;SEES;USES" ${ARGN})
+  cmake_parse_arguments(LAYER "" "" "SOURCES;SHOWS;SEES;USES" ${ARGN})
   add_library(${name} STATIC ${LAYER_SOURCES})
-  target_link_libraries(${name} PUBLIC vesk_options ${LAYER_SEES} PRIVATE ${LAYER_USES})
+  target_link_libraries(${name} PUBLIC vesk_options ${LAYER_SHOWS} PRIVATE ${LAYER_SEES} ${LAYER_USES})
 endfunction()
 
 # vesk_program(NAME SOURCES ... [SEES ...] [USES ...]): an executable in bin/.

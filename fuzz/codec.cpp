@@ -4,9 +4,9 @@
 
 #include "messages/message_classes.h"
 #include "messages/wire_model.h"
-#include "platform/text_form.h"
 #include "property.h"
 #include "support/allocations.h"
+#include "values/text_form.h"
 
 namespace vesk {
 

@@ -9,17 +9,17 @@
 #include <unistd.h>
 #include <vector>
 
-#include "corvik/recording_reader.h"
-#include "platform/text_form.h"
 #include "property.h"
+#include "recording/recording_reader.h"
+#include "values/text_form.h"
 
 namespace vesk {
 
 namespace {
 
-using corvik::RecordedEvent;
-using corvik::RecordedEventParser;
-using corvik::RecordingReader;
+using vesk::RecordedEvent;
+using vesk::RecordedEventParser;
+using vesk::RecordingReader;
 
 const std::string kGoodLine = R"({"at": 1.5, "metric": "0x3C4E04", "payload": "1003"})";
 const std::string kGoodEvent = "1.5 3952132 1003";
@@ -56,10 +56,10 @@ Outcomes read(RecordingReader& reader) {
   Outcomes outcomes;
   for (;;) {
     const RecordingReader::Step step = reader.next();
-    if (std::holds_alternative<corvik::EndOfRecording>(step)) return outcomes;
+    if (std::holds_alternative<vesk::EndOfRecording>(step)) return outcomes;
     if (const auto* event = std::get_if<RecordedEvent>(&step)) {
       outcomes.push_back({reader.lineNumber(), textOf(*event)});
-    } else if (const auto* bad = std::get_if<corvik::BadLine>(&step)) {
+    } else if (const auto* bad = std::get_if<vesk::BadLine>(&step)) {
       outcomes.push_back({reader.lineNumber(), bad->message});
     } else {
       require(false, "a file that is there can be read");
@@ -104,7 +104,7 @@ std::string outcomeOf(std::string_view line, std::size_t number) {
   if (!event) return complaint(number, parser.reason());
 
   std::string written;
-  corvik::appendRecordedEvent(written, *event);
+  vesk::appendRecordedEvent(written, *event);
   std::string text = textOf(*event);
   const Outcomes again = readFile(written, written.size());
   require(again.size() == 1 && again[0].text == text, "an event is written as it is read");

@@ -10,13 +10,13 @@
 #include "app/connected_program.h"
 #include "intake/metric_table.h"
 #include "messages/wire_model.h"
-#include "platform/json_form.h"
 #include "property.h"
 #include "screens/vesk_view_items.h"
 #include "shown.h"
 #include "support/pictures.h"
 #include "support/recorded_output.h"
 #include "toolkit/table_view_controller.h"
+#include "values/json_form.h"
 
 namespace vesk {
 

@@ -2,9 +2,9 @@
 
 #include <string_view>
 
-#include "platform/utf8.h"
 #include "property.h"
-#include "terminal/grid.h"
+#include "terminal/device/grid.h"
+#include "values/utf8.h"
 
 namespace vesk {
 

@@ -9,7 +9,7 @@
 #include "support/allocations.h"
 #include "support/fake_interface.h"
 #include "support/pictures.h"
-#include "terminal/input_machine.h"
+#include "terminal/input/input_machine.h"
 
 namespace vesk {
 

@@ -8,9 +8,9 @@
 #include "app/data_output.h"
 #include "bench/kinds.h"
 #include "bench/stop.h"
-#include "corvik/recording_reader.h"
-#include "platform/json_form.h"
-#include "platform/text_form.h"
+#include "recording/recording_reader.h"
+#include "values/json_form.h"
+#include "values/text_form.h"
 
 namespace vesk::bench {
 namespace {
@@ -24,11 +24,11 @@ void appendDecoded(std::string& out, ReflectionWalk& walk, const Kind& kind, std
   out += R"(,"status":"undecodable","fields":null)";
 }
 
-void appendDecodedEvent(std::string& out, ReflectionWalk& walk, const corvik::RecordedEvent& event) {
+void appendDecodedEvent(std::string& out, ReflectionWalk& walk, const RecordedEvent& event) {
   out += "{\"at\":";
   appendDecimal(out, event.at);
   out += ",\"metric\":";
-  corvik::appendMetricId(out, event.metricId);
+  appendMetricId(out, event.metricId);
   out += ",\"class\":";
   if (const Kind* kind = findKind(event.metricId)) {
     appendDecoded(out, walk, *kind, event.payload);
@@ -39,15 +39,15 @@ void appendDecodedEvent(std::string& out, ReflectionWalk& walk, const corvik::Re
 }
 
 Outcome decode(const std::string& path) {
-  corvik::RecordingReader reader(path);
+  RecordingReader reader(path);
   DataOutput output;
   std::string line;
   ReflectionWalk walk;
-  for (auto step = reader.next(); !std::holds_alternative<corvik::EndOfRecording>(step); step = reader.next()) {
-    if (const auto* failure = std::get_if<corvik::ReadFailure>(&step)) stop(failure->message);
-    if (const auto* bad = std::get_if<corvik::BadLine>(&step)) stop(bad->message);
+  for (auto step = reader.next(); !std::holds_alternative<EndOfRecording>(step); step = reader.next()) {
+    if (const auto* failure = std::get_if<ReadFailure>(&step)) stop(failure->message);
+    if (const auto* bad = std::get_if<BadLine>(&step)) stop(bad->message);
     line.clear();
-    appendDecodedEvent(line, walk, std::get<corvik::RecordedEvent>(step));
+    appendDecodedEvent(line, walk, std::get<RecordedEvent>(step));
     output.writeLine(line);
   }
   return output.finish(Outcome::done);

@@ -5,8 +5,8 @@
 #include <span>
 #include <string_view>
 
-#include "platform/json_form.h"
-#include "platform/text_form.h"
+#include "values/json_form.h"
+#include "values/text_form.h"
 
 namespace vesk::bench {
 

@@ -4,7 +4,7 @@
 #include <optional>
 #include <string_view>
 
-#include "platform/value.h"
+#include "values/value.h"
 
 namespace vesk {
 

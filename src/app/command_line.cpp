@@ -19,7 +19,7 @@
 #include "app/simulate_command.h"
 #include "app/stores_command.h"
 #include "app/suggestion.h"
-#include "platform/system_log.h"
+#include "system/system_log.h"
 
 namespace vesk {
 

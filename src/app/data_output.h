@@ -3,7 +3,7 @@
 #include <string_view>
 
 #include "app/outcome.h"
-#include "platform/output_lines.h"
+#include "system/output_lines.h"
 
 namespace vesk {
 

@@ -7,20 +7,20 @@
 #include "app/data_output.h"
 #include "app/progress.h"
 #include "app/recording_hint.h"
-#include "corvik/recording_reader.h"
 #include "messages/registry/metric_classes.h"
-#include "platform/text_form.h"
+#include "recording/recording_reader.h"
+#include "values/text_form.h"
 
 namespace vesk {
 
 namespace {
 
-void appendDecodedEvent(std::string& out, const corvik::RecordedEvent& event) {
+void appendDecodedEvent(std::string& out, const RecordedEvent& event) {
   const MetricClass* metricClass = findMetricClass(event.metricId);
   out += "{\"at\":";
   appendDecimal(out, event.at);
   out += ",\"metric\":";
-  corvik::appendMetricId(out, event.metricId);
+  appendMetricId(out, event.metricId);
   if (metricClass == nullptr) {
     out += R"(,"class":null,"status":"ignored","fields":null})";
     return;
@@ -55,7 +55,7 @@ class Decoding {
     return output_.finish(outcome_);
   }
 
-  bool operator()(const corvik::RecordedEvent& event) {
+  bool operator()(const RecordedEvent& event) {
     line_.clear();
     appendDecodedEvent(line_, event);
     output_.writeLine(line_);
@@ -64,18 +64,18 @@ class Decoding {
     return true;
   }
 
-  bool operator()(const corvik::BadLine& bad) {
+  bool operator()(const BadLine& bad) {
     hasBadLines_ = true;
     fail(bad.message);
     return true;
   }
 
-  bool operator()(const corvik::ReadFailure& failure) {
+  bool operator()(const ReadFailure& failure) {
     fail("vesk: " + failure.message);
     return false;
   }
 
-  bool operator()(corvik::EndOfRecording /*end*/) { return false; }
+  bool operator()(EndOfRecording /*end*/) { return false; }
 
  private:
   static constexpr std::uint64_t kEventsToProgress = 4096;
@@ -87,7 +87,7 @@ class Decoding {
   }
 
   const std::string& path_;
-  corvik::RecordingReader reader_;
+  RecordingReader reader_;
   DataOutput output_;
   Progress progress_{Progress::Output::meanwhile};
   const std::optional<double> duration_ = progress_.isPossible() ? reader_.duration() : std::nullopt;

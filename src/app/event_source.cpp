@@ -47,7 +47,7 @@ EventSource makeEventSource(const SourceOptions& options, const Clock& clock, So
     return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
             [] { return ShownState{"simulated"}; }};
   }
-  corvik::RecordingReader recording(*options.replay);
+  RecordingReader recording(*options.replay);
   const std::optional<std::string> failure = recording.failure();
   auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));

@@ -8,7 +8,7 @@
 
 #include "corvik/recorded_service.h"
 #include "corvik/service.h"
-#include "platform/clock.h"
+#include "system/clock.h"
 
 namespace vesk {
 

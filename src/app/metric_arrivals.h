@@ -5,8 +5,8 @@
 #include <string_view>
 #include <unordered_map>
 
-#include "platform/clock.h"
-#include "terminal/surroundings.h"
+#include "system/clock.h"
+#include "terminal/view/surroundings.h"
 
 namespace vesk {
 

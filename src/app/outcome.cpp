@@ -3,8 +3,8 @@
 #include <string>
 #include <unistd.h>
 
-#include "platform/output_lines.h"
-#include "platform/visible_text.h"
+#include "system/output_lines.h"
+#include "values/visible_text.h"
 
 namespace vesk {
 

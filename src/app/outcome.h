@@ -4,7 +4,7 @@
 #include <optional>
 #include <string_view>
 
-#include "platform/wake_up.h"
+#include "system/wake_up.h"
 
 namespace vesk {
 

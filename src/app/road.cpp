@@ -9,10 +9,10 @@
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
-#include "platform/clock.h"
-#include "platform/output_lines.h"
-#include "platform/run_loop.h"
-#include "platform/timer.h"
+#include "system/clock.h"
+#include "system/output_lines.h"
+#include "system/run_loop.h"
+#include "system/timer.h"
 #include "toolkit/application.h"
 
 namespace vesk {
@@ -42,7 +42,7 @@ Outcome playRecording(const std::optional<std::string>& path,
   };
   std::shared_ptr<corvik::RecordedService> service;
   if (path) {
-    corvik::RecordingReader recording(*path);
+    RecordingReader recording(*path);
     if (recording.failure()) {
       fail("vesk: " + *recording.failure());
       return outcome;

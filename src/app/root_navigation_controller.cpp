@@ -2,8 +2,8 @@
 
 #include <cstdint>
 
-#include "platform/bundle.h"
-#include "platform/output_lines.h"
+#include "app/bundle.h"
+#include "system/output_lines.h"
 
 namespace vesk {
 

@@ -10,9 +10,9 @@
 #include "app/stop_signals.h"
 #include "app/vesk_interface.h"
 #include "intake/metric_validator.h"
-#include "platform/output_lines.h"
-#include "platform/run_loop.h"
-#include "platform/timer.h"
+#include "system/output_lines.h"
+#include "system/run_loop.h"
+#include "system/timer.h"
 #include "terminal/terminal.h"
 #include "toolkit/application.h"
 

@@ -7,11 +7,11 @@
 #include "app/data_output.h"
 #include "app/road.h"
 #include "app/suggestion.h"
-#include "platform/json_form.h"
-#include "platform/visible_text.h"
 #include "screens/vesk_view_items.h"
 #include "toolkit/interface_layout.h"
 #include "toolkit/table_view_controller.h"
+#include "values/json_form.h"
+#include "values/visible_text.h"
 
 namespace vesk {
 

@@ -3,7 +3,7 @@
 #include <csignal>
 #include <initializer_list>
 
-#include "platform/run_loop.h"
+#include "system/run_loop.h"
 
 namespace vesk {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/wake_up.h"
+#include "system/wake_up.h"
 
 namespace vesk {
 

@@ -3,7 +3,7 @@
 #include "app/data_output.h"
 #include "app/road.h"
 #include "intake/metric_validator.h"
-#include "platform/json_form.h"
+#include "values/json_form.h"
 
 namespace vesk {
 

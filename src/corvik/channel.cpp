@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "platform/main_queue.h"
+#include "system/main_queue.h"
 
 namespace corvik::client {
 

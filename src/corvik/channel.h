@@ -11,9 +11,9 @@
 
 #include "corvik/client.h"
 #include "corvik/service.h"
-#include "platform/backlog.h"
-#include "platform/task.h"
-#include "platform/work_queue.h"
+#include "system/backlog.h"
+#include "system/task.h"
+#include "system/work_queue.h"
 
 namespace corvik::client {
 

@@ -5,9 +5,9 @@
 #include <string>
 
 #include "corvik/constants.h"
+#include "corvik/inter_process_dictionary.h"
 #include "corvik/service.h"
-#include "platform/inter_process_dictionary.h"
-#include "platform/work_queue.h"
+#include "system/work_queue.h"
 
 /// The client library of the baseband manager service, under the library's own names. It stands in for the
 /// library where there is none: behind it is whatever service the program has installed.

@@ -2,7 +2,7 @@
 
 #include <cstdint>
 
-#include "platform/text.h"
+#include "values/text.h"
 
 namespace corvik {
 

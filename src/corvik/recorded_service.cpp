@@ -5,7 +5,7 @@
 #include <poll.h>
 #include <utility>
 
-#include "platform/main_queue.h"
+#include "system/main_queue.h"
 
 namespace corvik {
 
@@ -22,7 +22,7 @@ constexpr std::size_t kBytesAtATime = std::size_t{64} << 10;
 
 }  // namespace
 
-RecordedService::RecordedService(RecordingReader recording, const vesk::Clock& clock, Playback playback)
+RecordedService::RecordedService(vesk::RecordingReader recording, const vesk::Clock& clock, Playback playback)
     : recording_(std::move(recording)), clock_(clock), playback_(playback) {
   state_.duration = recording_.duration();
   state_.speed = playback.speed;
@@ -99,12 +99,12 @@ bool RecordedService::begin(const std::stop_token& stop, EventStream& events) {
 }
 
 bool RecordedService::playNext(const std::stop_token& stop, EventStream& events) {
-  RecordingReader::Step step = recording_.next();
+  vesk::RecordingReader::Step step = recording_.next();
   if (stop.stop_requested()) return false;
-  if (const auto* event = std::get_if<RecordedEvent>(&step)) {
+  if (const auto* event = std::get_if<vesk::RecordedEvent>(&step)) {
     if (!waitUntil(event->at, stop)) return false;
     playEvent(*event, events);
-  } else if (auto* bad = std::get_if<BadLine>(&step)) {
+  } else if (auto* bad = std::get_if<vesk::BadLine>(&step)) {
     tellBadLine(std::move(bad->message), events);
   } else if (!startAgain()) {
     end(events);
@@ -138,7 +138,7 @@ bool RecordedService::waitUntil(double at, const std::stop_token& stop) {
   return !stop.stop_requested();
 }
 
-void RecordedService::playEvent(const RecordedEvent& event, EventStream& events) {
+void RecordedService::playEvent(const vesk::RecordedEvent& event, EventStream& events) {
   ++eventsOfLap_;
   bytesPlayed_ += event.payload.size();
   {

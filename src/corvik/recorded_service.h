@@ -11,9 +11,9 @@
 #include <thread>
 #include <variant>
 
-#include "corvik/recording_reader.h"
 #include "corvik/service.h"
-#include "platform/clock.h"
+#include "recording/recording_reader.h"
+#include "system/clock.h"
 
 namespace corvik {
 
@@ -60,7 +60,7 @@ class RecordedService final : public Service {
   using EndHandler = std::function<void(const std::optional<std::string>& failure)>;
 
   /// `clock` must outlive the service.
-  RecordedService(RecordingReader recording, const vesk::Clock& clock, Playback playback);
+  RecordedService(vesk::RecordingReader recording, const vesk::Clock& clock, Playback playback);
   ~RecordedService() override { endThread(); }
   RecordedService(const RecordedService&) = delete;
   RecordedService& operator=(const RecordedService&) = delete;
@@ -92,12 +92,12 @@ class RecordedService final : public Service {
   [[nodiscard]] bool waitForInput(int descriptor);
   /// Blocks until `at` has come; false when a stop was requested.
   [[nodiscard]] bool waitUntil(double at, const std::stop_token& stop);
-  void playEvent(const RecordedEvent& event, EventStream& events);
+  void playEvent(const vesk::RecordedEvent& event, EventStream& events);
   void tellBadLine(std::string message, EventStream& events);
   [[nodiscard]] bool startAgain();
   void end(EventStream& events);
 
-  RecordingReader recording_;
+  vesk::RecordingReader recording_;
   const vesk::Clock& clock_;
   Playback playback_;
   BadLineHandler onBadLine_;

@@ -8,8 +8,8 @@
 #include <string>
 
 #include "corvik/constants.h"
-#include "platform/inter_process_dictionary.h"
-#include "platform/task.h"
+#include "corvik/inter_process_dictionary.h"
+#include "system/task.h"
 
 namespace corvik {
 

@@ -1,7 +1,7 @@
 #include "handset/handset.h"
 
-#include "handset/sim_card.h"
-#include "handset/triggers.h"
+#include "handset/behaviour/sim_card.h"
+#include "handset/behaviour/triggers.h"
 
 namespace vesk::handset {
 

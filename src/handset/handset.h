@@ -2,14 +2,14 @@
 
 #include <cstdint>
 
-#include "handset/drive.h"
-#include "handset/gsm_mode.h"
-#include "handset/lte_mode.h"
-#include "handset/network.h"
-#include "handset/outbox.h"
-#include "handset/radio.h"
-#include "handset/registration.h"
-#include "handset/umts_mode.h"
+#include "handset/behaviour/gsm_mode.h"
+#include "handset/behaviour/lte_mode.h"
+#include "handset/behaviour/registration.h"
+#include "handset/behaviour/umts_mode.h"
+#include "handset/model/drive.h"
+#include "handset/model/network.h"
+#include "handset/model/radio.h"
+#include "handset/reports/outbox.h"
 
 namespace vesk::handset {
 

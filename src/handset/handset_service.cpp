@@ -4,7 +4,7 @@
 #include <string>
 #include <utility>
 
-#include "handset/triggers.h"
+#include "handset/behaviour/triggers.h"
 
 namespace vesk::handset {
 

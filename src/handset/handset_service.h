@@ -7,7 +7,7 @@
 
 #include "corvik/service.h"
 #include "handset/handset.h"
-#include "platform/clock.h"
+#include "system/clock.h"
 
 namespace vesk::handset {
 

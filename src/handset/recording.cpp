@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "corvik/recorded_event.h"
+#include "recording/recorded_event.h"
 
 namespace vesk::handset {
 
@@ -17,7 +17,7 @@ void recordDrive(Handset& handset, double seconds, const std::function<bool(std:
   std::string line;
   const auto record = [&](const HandsetEvent& event) {
     line.clear();
-    corvik::appendRecordedEvent(line, {static_cast<double>(event.atMs) / 1000, event.id, event.payload.bytes()});
+    appendRecordedEvent(line, {static_cast<double>(event.atMs) / 1000, event.id, event.payload.bytes()});
     return write(line);
   };
 

@@ -5,8 +5,8 @@
 
 #include "intake/metric_validator.h"
 #include "intake/value_conversions.h"
-#include "platform/output_lines.h"
-#include "platform/text_form.h"
+#include "system/output_lines.h"
+#include "values/text_form.h"
 
 namespace vesk {
 

@@ -3,8 +3,8 @@
 #include <string>
 
 #include "intake/metric_table.h"
-#include "platform/output_lines.h"
-#include "platform/text_form.h"
+#include "system/output_lines.h"
+#include "values/text_form.h"
 
 namespace vesk {
 

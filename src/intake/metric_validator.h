@@ -8,11 +8,11 @@
 #include <string_view>
 #include <utility>
 
+#include "intake/date_format.h"
 #include "intake/technology_stores.h"
 #include "link/corvik_wrapper.h"
 #include "messages/registry/metric_identifiers.h"
-#include "platform/date_format.h"
-#include "platform/value.h"
+#include "values/value.h"
 
 namespace vesk {
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/shared_vector.h"
-#include "platform/value.h"
+#include "values/shared_vector.h"
+#include "values/value.h"
 
 /// What the program knows of each technology besides the latest record of every metric: lists of cells, carriers,
 /// bearers and files, and the selection parameters. Plain values: a copy is cheap and stays as it is.

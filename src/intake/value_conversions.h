@@ -2,7 +2,7 @@
 
 #include <span>
 
-#include "platform/value.h"
+#include "values/value.h"
 
 /// From a value as the handset reports it to the one that an engineer reads.
 namespace vesk {

@@ -3,10 +3,10 @@
 #include <optional>
 #include <utility>
 
-#include "platform/file.h"
-#include "platform/main_queue.h"
-#include "platform/system_log.h"
-#include "platform/text_form.h"
+#include "system/file.h"
+#include "system/main_queue.h"
+#include "system/system_log.h"
+#include "values/text_form.h"
 
 namespace vesk {
 

@@ -8,7 +8,7 @@
 
 #include "corvik/client.h"
 #include "link/corvik_wrapper_delegate.h"
-#include "platform/work_queue.h"
+#include "system/work_queue.h"
 
 namespace vesk {
 

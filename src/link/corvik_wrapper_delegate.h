@@ -2,7 +2,7 @@
 
 #include <optional>
 
-#include "platform/value.h"
+#include "values/value.h"
 
 namespace vesk {
 

@@ -3,8 +3,8 @@
 #include <algorithm>
 #include <string>
 
-#include "platform/text_form.h"
-#include "platform/utf8.h"
+#include "values/text_form.h"
+#include "values/utf8.h"
 
 namespace vesk {
 

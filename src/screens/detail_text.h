@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/value.h"
+#include "values/value.h"
 
 namespace vesk {
 

@@ -4,9 +4,9 @@
 #include <optional>
 
 #include "intake/metric_validator.h"
-#include "platform/text.h"
 #include "screens/vesk_view_items.h"
 #include "toolkit/table_view_controller.h"
+#include "values/text.h"
 
 namespace vesk {
 

@@ -3,11 +3,11 @@
 #include <chrono>
 #include <string>
 
-#include "platform/main_queue.h"
-#include "platform/output_lines.h"
-#include "platform/run_loop.h"
 #include "screens/common_look.h"
 #include "screens/detail_text.h"
+#include "system/main_queue.h"
+#include "system/output_lines.h"
+#include "system/run_loop.h"
 
 namespace vesk {
 

@@ -5,11 +5,11 @@
 #include <string_view>
 
 #include "intake/metric_validator.h"
-#include "platform/text.h"
-#include "platform/timer.h"
 #include "screens/category_sources.h"
 #include "screens/vesk_view_items.h"
+#include "system/timer.h"
 #include "toolkit/table_view_controller.h"
+#include "values/text.h"
 
 namespace vesk {
 

@@ -2,9 +2,9 @@
 
 #include <optional>
 
-#include "platform/text.h"
 #include "screens/vesk_view_items.h"
 #include "toolkit/table_view_controller.h"
+#include "values/text.h"
 
 namespace vesk {
 

@@ -4,7 +4,7 @@
 #include <string_view>
 #include <vector>
 
-#include "platform/text.h"
+#include "values/text.h"
 
 namespace vesk {
 

@@ -4,9 +4,9 @@
 #include <utility>
 #include <vector>
 
-#include "terminal/column_width.h"
-#include "terminal/difference.h"
-#include "terminal/renderer.h"
+#include "terminal/device/column_width.h"
+#include "terminal/device/difference.h"
+#include "terminal/view/renderer.h"
 
 namespace vesk {
 

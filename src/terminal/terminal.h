@@ -4,13 +4,13 @@
 #include <memory>
 #include <string>
 
-#include "platform/clock.h"
-#include "terminal/capabilities.h"
-#include "terminal/grid.h"
-#include "terminal/input_machine.h"
-#include "terminal/presenter.h"
-#include "terminal/surroundings.h"
-#include "terminal/terminal_device.h"
+#include "system/clock.h"
+#include "terminal/device/capabilities.h"
+#include "terminal/device/grid.h"
+#include "terminal/device/terminal_device.h"
+#include "terminal/input/input_machine.h"
+#include "terminal/view/presenter.h"
+#include "terminal/view/surroundings.h"
 #include "toolkit/navigation_controller.h"
 
 namespace vesk {

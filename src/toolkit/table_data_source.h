@@ -5,8 +5,8 @@
 #include <memory>
 #include <optional>
 
-#include "platform/text.h"
 #include "toolkit/table_view_cell.h"
+#include "values/text.h"
 
 namespace vesk {
 

@@ -10,9 +10,9 @@
 #include <string_view>
 #include <vector>
 
-#include "platform/text.h"
 #include "toolkit/table_data_source.h"
 #include "toolkit/table_view_cell.h"
+#include "values/text.h"
 
 namespace vesk {
 

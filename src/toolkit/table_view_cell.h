@@ -2,8 +2,8 @@
 
 #include <optional>
 
-#include "platform/text.h"
 #include "toolkit/responder.h"
+#include "values/text.h"
 
 namespace vesk {
 

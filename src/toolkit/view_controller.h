@@ -3,9 +3,9 @@
 #include <optional>
 #include <string_view>
 
-#include "platform/text.h"
 #include "toolkit/responder.h"
 #include "toolkit/system_appearance.h"
+#include "values/text.h"
 
 namespace vesk {
 

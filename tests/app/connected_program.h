@@ -10,9 +10,9 @@
 #include "corvik/service.h"
 #include "intake/metric_validator.h"
 #include "link/corvik_wrapper.h"
-#include "platform/run_loop.h"
-#include "platform/text_form.h"
 #include "support/recorded_log.h"
+#include "system/run_loop.h"
+#include "values/text_form.h"
 
 namespace vesk {
 

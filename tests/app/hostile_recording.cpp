@@ -3,12 +3,12 @@
 #include <cstdint>
 #include <memory>
 
-#include "corvik/recorded_event.h"
 #include "messages/filled_message.h"
 #include "messages/lte/lte.h"
 #include "messages/nas/nas.h"
 #include "messages/registry/metric_classes.h"
 #include "messages/registry/metric_of_message.h"
+#include "recording/recorded_event.h"
 #include "support/metric_events.h"
 
 namespace vesk {
@@ -34,7 +34,7 @@ Data dataOf(std::string_view bytes) {
 class Recording {
  public:
   void add(std::int64_t metricId, std::span<const std::uint8_t> payload) {
-    corvik::appendRecordedEvent(lines, {static_cast<double>(++events_) / 10, metricId, payload});
+    appendRecordedEvent(lines, {static_cast<double>(++events_) / 10, metricId, payload});
   }
   template <class Message>
   void add(const Message& message) {

@@ -8,12 +8,12 @@
 
 #include "app/connected_program.h"
 #include "app/vesk_program.h"
-#include "corvik/recording_reader.h"
 #include "handset/handset.h"
 #include "handset/recording.h"
 #include "messages/gsm/gsm.h"
 #include "messages/lte/lte.h"
 #include "messages/wcdma/wcdma.h"
+#include "recording/recording_reader.h"
 #include "screens/vesk_view_items.h"
 #include "support/bytes.h"
 #include "support/recorded_output.h"
@@ -226,12 +226,12 @@ TEST_F(Road, ADriveFillsEveryScreen) {
     drive += line;
     return true;
   });
-  corvik::RecordingReader reader(fileWith(drive), "drive");
+  RecordingReader reader(fileWith(drive), "drive");
   const RecordedOutput output;
   ConnectedProgram program;
   program.run([&](NavigationController& root) {
     const auto before = everyScreen(root);
-    for (auto step = reader.next(); const auto* event = std::get_if<corvik::RecordedEvent>(&step); step = reader.next())
+    for (auto step = reader.next(); const auto* event = std::get_if<RecordedEvent>(&step); step = reader.next())
       program.raise(event->metricId, event->payload);
     program.deliverAll();
     const auto after = everyScreen(root);

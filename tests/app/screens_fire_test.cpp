@@ -6,7 +6,7 @@
 
 #include "app/connected_program.h"
 #include "app/hostile_recording.h"
-#include "corvik/recording_reader.h"
+#include "recording/recording_reader.h"
 #include "screens/first_level_view_controller.h"
 #include "screens/second_level_view_controller.h"
 #include "screens/vesk_view_controller.h"
@@ -14,9 +14,9 @@
 #include "support/pictures.h"
 #include "support/recorded_output.h"
 #include "support/terminal_language.h"
-#include "terminal/capabilities.h"
-#include "terminal/diagnostic_lines.h"
-#include "terminal/difference.h"
+#include "terminal/device/capabilities.h"
+#include "terminal/device/difference.h"
+#include "terminal/view/diagnostic_lines.h"
 #include "toolkit/interface_layout.h"
 
 namespace vesk {
@@ -96,8 +96,8 @@ class ShrinkingScreen : public SecondLevelViewController {
 class ScreensUnderFire : public testing::Test {
  protected:
   void fillStores() {
-    corvik::RecordingReader reader(fileWith(recording_), "hostile");
-    for (auto step = reader.next(); const auto* event = std::get_if<corvik::RecordedEvent>(&step); step = reader.next())
+    RecordingReader reader(fileWith(recording_), "hostile");
+    for (auto step = reader.next(); const auto* event = std::get_if<RecordedEvent>(&step); step = reader.next())
       program_.raise(event->metricId, event->payload);
     program_.deliverAll();
   }

@@ -3,10 +3,10 @@
 #include <gtest/gtest.h>
 
 #include "app/app_id_validator.h"
+#include "app/bundle.h"
 #include "app/connected_program.h"
 #include "app/root_navigation_controller.h"
 #include "messages/nas/nas.h"
-#include "platform/bundle.h"
 #include "screens/vesk_view_controller.h"
 #include "support/metric_events.h"
 #include "support/recorded_output.h"

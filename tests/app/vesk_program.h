@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "corvik/recorded_event.h"
+#include "recording/recorded_event.h"
 #include "support/child_process.h"
 #include "support/metric_events.h"
 
@@ -33,7 +33,7 @@ class TemporaryFile {
 inline std::string recorded(double at, std::int64_t metricId, const ProtoCodable& message) {
   const Data payload = encoded(message);
   std::string line;
-  corvik::appendRecordedEvent(line, {at, metricId, payload.bytes()});
+  appendRecordedEvent(line, {at, metricId, payload.bytes()});
   return line;
 }
 

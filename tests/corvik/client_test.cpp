@@ -5,8 +5,8 @@
 #include <thread>
 #include <vector>
 
-#include "platform/main_queue.h"
-#include "platform/run_loop.h"
+#include "system/main_queue.h"
+#include "system/run_loop.h"
 
 namespace corvik::client {
 namespace {

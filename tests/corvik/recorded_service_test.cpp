@@ -6,10 +6,10 @@
 #include <vector>
 
 #include "corvik/client.h"
-#include "platform/main_queue.h"
-#include "platform/run_loop.h"
 #include "support/input.h"
 #include "support/manual_clock.h"
+#include "system/main_queue.h"
+#include "system/run_loop.h"
 
 namespace corvik {
 namespace {
@@ -21,7 +21,7 @@ using Ids = std::vector<std::int64_t>;
 
 std::string line(double at, int id) {
   std::string text;
-  appendRecordedEvent(text, {at, id, {}});
+  vesk::appendRecordedEvent(text, {at, id, {}});
   return text;
 }
 
@@ -36,7 +36,7 @@ class RecordedServiceTest : public testing::Test {
   }
 
   void connect(vesk::FileDescriptor recording, Playback playback) {
-    service_ = std::make_shared<RecordedService>(RecordingReader(std::move(recording), "r"), clock_, playback);
+    service_ = std::make_shared<RecordedService>(vesk::RecordingReader(std::move(recording), "r"), clock_, playback);
     service_->setBadLineHandler([this](const std::string& message) { badLines_.push_back(message); });
     service_->setEndHandler([this](const std::optional<std::string>& failure) {
       failure_ = failure;

@@ -1,9 +1,9 @@
-#include "handset/sim_card.h"
+#include "handset/behaviour/sim_card.h"
 
 #include <gtest/gtest.h>
 #include <string>
 
-#include "handset/digits.h"
+#include "handset/model/digits.h"
 
 namespace vesk::handset {
 namespace {

@@ -12,9 +12,9 @@
 #include "messages/lte/lte.h"
 #include "messages/nas/nas.h"
 #include "messages/wcdma/wcdma.h"
-#include "platform/text_form.h"
 #include "support/metric_events.h"
 #include "support/recorded_output.h"
+#include "values/text_form.h"
 
 namespace vesk {
 namespace {

@@ -8,10 +8,10 @@
 #include <thread>
 #include <vector>
 
-#include "platform/main_queue.h"
-#include "platform/run_loop.h"
-#include "platform/text_form.h"
 #include "support/recorded_log.h"
+#include "system/main_queue.h"
+#include "system/run_loop.h"
+#include "values/text_form.h"
 
 namespace vesk {
 namespace {

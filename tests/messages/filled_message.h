@@ -3,8 +3,8 @@
 #include <string_view>
 #include <vector>
 
-#include "platform/value.h"
 #include "support/bytes.h"
+#include "values/value.h"
 
 namespace vesk {
 

@@ -6,8 +6,8 @@
 
 #include "messages/codec/repeated_scalar.h"
 #include "messages/lte/lte.h"
-#include "platform/text_form.h"
 #include "support/bytes.h"
+#include "values/text_form.h"
 
 namespace vesk {
 namespace {

@@ -2,9 +2,9 @@
 
 #include "messages/registry/metric_classes.h"
 #include "messages/registry/metric_utility.h"
-#include "platform/text_form.h"
 #include "support/bytes.h"
 #include "support/recorded_log.h"
+#include "values/text_form.h"
 
 namespace vesk {
 namespace {

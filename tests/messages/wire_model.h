@@ -5,7 +5,7 @@
 #include <span>
 #include <string_view>
 
-#include "platform/value.h"
+#include "values/value.h"
 
 namespace vesk {
 

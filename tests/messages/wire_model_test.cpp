@@ -5,8 +5,8 @@
 
 #include "messages/every_message.h"
 #include "messages/filled_message.h"
-#include "platform/text_form.h"
 #include "support/bytes.h"
+#include "values/text_form.h"
 
 namespace vesk {
 namespace {

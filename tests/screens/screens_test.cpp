@@ -9,8 +9,6 @@
 #include "messages/gsm/gsm.h"
 #include "messages/lte/lte.h"
 #include "messages/wcdma/wcdma.h"
-#include "platform/main_queue.h"
-#include "platform/run_loop.h"
 #include "screens/detail_text.h"
 #include "screens/first_level_view_controller.h"
 #include "screens/second_level_view_controller.h"
@@ -19,6 +17,8 @@
 #include "support/manual_clock.h"
 #include "support/metric_events.h"
 #include "support/recorded_output.h"
+#include "system/main_queue.h"
+#include "system/run_loop.h"
 #include "toolkit/system_appearance.h"
 
 namespace vesk {

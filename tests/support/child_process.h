@@ -11,8 +11,8 @@
 #include <unistd.h>
 #include <vector>
 
-#include "platform/file_descriptor.h"
 #include "support/input.h"
+#include "system/file_descriptor.h"
 
 namespace vesk {
 

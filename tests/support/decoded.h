@@ -5,8 +5,8 @@
 #include <string>
 
 #include "messages/codec/message.h"
-#include "platform/text_form.h"
 #include "support/bytes.h"
+#include "values/text_form.h"
 
 namespace vesk {
 

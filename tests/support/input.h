@@ -6,7 +6,7 @@
 #include <sys/mman.h>
 #include <unistd.h>
 
-#include "platform/file_descriptor.h"
+#include "system/file_descriptor.h"
 
 namespace vesk {
 

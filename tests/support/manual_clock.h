@@ -5,7 +5,7 @@
 #include <optional>
 #include <poll.h>
 
-#include "platform/clock.h"
+#include "system/clock.h"
 
 namespace vesk {
 

@@ -4,7 +4,7 @@
 #include <span>
 
 #include "messages/codec/proto_codable.h"
-#include "platform/value.h"
+#include "values/value.h"
 
 namespace vesk {
 

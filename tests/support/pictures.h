@@ -5,9 +5,9 @@
 #include <string_view>
 #include <vector>
 
-#include "terminal/column_width.h"
-#include "terminal/presenter.h"
-#include "terminal/renderer.h"
+#include "terminal/device/column_width.h"
+#include "terminal/view/presenter.h"
+#include "terminal/view/renderer.h"
 #include "toolkit/navigation_controller.h"
 
 namespace vesk {

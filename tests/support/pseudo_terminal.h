@@ -11,8 +11,8 @@
 #include <termios.h>
 #include <unistd.h>
 
-#include "platform/file_descriptor.h"
-#include "terminal/grid.h"
+#include "system/file_descriptor.h"
+#include "terminal/device/grid.h"
 
 namespace vesk {
 

@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/system_log.h"
+#include "system/system_log.h"
 
 namespace vesk {
 

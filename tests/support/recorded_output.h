@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/output_lines.h"
+#include "system/output_lines.h"
 
 namespace vesk {
 

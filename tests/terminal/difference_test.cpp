@@ -1,10 +1,10 @@
-#include "terminal/difference.h"
+#include "terminal/device/difference.h"
 
 #include <cstdlib>
 #include <gtest/gtest.h>
 
 #include "support/pictures.h"
-#include "terminal/palette.h"
+#include "terminal/device/palette.h"
 
 namespace vesk {
 namespace {

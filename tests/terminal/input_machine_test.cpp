@@ -1,4 +1,4 @@
-#include "terminal/input_machine.h"
+#include "terminal/input/input_machine.h"
 
 #include <gtest/gtest.h>
 #include <ostream>

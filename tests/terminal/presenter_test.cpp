@@ -1,4 +1,4 @@
-#include "terminal/presenter.h"
+#include "terminal/view/presenter.h"
 
 #include <gtest/gtest.h>
 

@@ -2,10 +2,10 @@
 #include <gtest/gtest.h>
 
 #include "support/pictures.h"
-#include "terminal/column_width.h"
-#include "terminal/grid.h"
-#include "terminal/path_bar.h"
-#include "terminal/wrapping.h"
+#include "terminal/device/column_width.h"
+#include "terminal/device/grid.h"
+#include "terminal/view/path_bar.h"
+#include "terminal/view/wrapping.h"
 
 namespace vesk {
 namespace {

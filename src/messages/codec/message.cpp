@@ -4,7 +4,7 @@
 #include <string>
 
 #include "messages/registry/metric_utility.h"
-#include "platform/system_log.h"
+#include "system/system_log.h"
 
 namespace vesk {
 

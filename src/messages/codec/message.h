@@ -12,7 +12,7 @@
 #include "messages/codec/field_cursor.h"
 #include "messages/codec/proto_codable.h"
 #include "messages/codec/repeated_scalar.h"
-#include "platform/recycled_memory.h"
+#include "values/recycled_memory.h"
 
 /// What every generated message class is made of: the pieces that do not depend on its fields.
 namespace vesk {

@@ -1,6 +1,6 @@
 #include "messages/codec/proto_codable.h"
 
-#include "platform/text_form.h"
+#include "values/text_form.h"
 
 namespace vesk {
 

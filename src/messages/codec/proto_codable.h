@@ -6,8 +6,8 @@
 
 #include "messages/codec/proto_reader.h"
 #include "messages/codec/proto_writer.h"
-#include "platform/json_form.h"
-#include "platform/value.h"
+#include "values/json_form.h"
+#include "values/value.h"
 
 namespace vesk {
 

@@ -5,8 +5,8 @@
 #include <cstring>
 #include <span>
 
-#include "platform/data.h"
-#include "platform/text.h"
+#include "values/data.h"
+#include "values/text.h"
 
 namespace vesk {
 

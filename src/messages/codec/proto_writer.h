@@ -7,8 +7,8 @@
 #include <span>
 
 #include "messages/codec/proto_reader.h"
-#include "platform/data.h"
-#include "platform/text.h"
+#include "values/data.h"
+#include "values/text.h"
 
 namespace vesk {
 

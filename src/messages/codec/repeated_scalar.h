@@ -6,8 +6,8 @@
 #include <string>
 #include <vector>
 
-#include "platform/recycled_memory.h"
-#include "platform/value.h"
+#include "values/recycled_memory.h"
+#include "values/value.h"
 
 namespace vesk {
 

@@ -7,7 +7,7 @@
 #include <string_view>
 
 #include "messages/codec/proto_reader.h"
-#include "platform/value.h"
+#include "values/value.h"
 
 namespace vesk {
 

@@ -3,7 +3,7 @@
 #include <unordered_map>
 
 #include "messages/registry/metric_identifiers.h"
-#include "platform/system_log.h"
+#include "system/system_log.h"
 
 namespace vesk {
 

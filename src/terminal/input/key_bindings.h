@@ -1,0 +1,56 @@
+#pragma once
+
+#include <initializer_list>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+
+#include "terminal/input/input_event.h"
+
+namespace vesk {
+
+/// What a key does.
+enum class Action {
+  Help,
+  Open,
+  Back,
+  Filter,
+  Freeze,
+  Diagnostics,
+  OlderLines,
+  NewerLines,
+  Quit,
+  Up,
+  Down,
+  PageUp,
+  PageDown,
+  First,
+  Last,
+};
+
+struct BoundKey {
+  Key key;
+  char32_t character = 0;
+};
+
+/// A row of the table that the program, its line of hints and its help all read.
+struct KeyBinding {
+  Action action;
+  std::initializer_list<BoundKey> keys;
+  /// For the line of hints, beside the first key; empty where the key needs none.
+  std::string_view hint;
+  std::string_view help;
+};
+
+/// In the order in which they are shown.
+[[nodiscard]] std::span<const KeyBinding> keyBindings();
+
+[[nodiscard]] std::optional<Action> actionOf(const KeyEvent& event);
+
+/// "Enter", "↑", "f".
+[[nodiscard]] std::string nameOf(const BoundKey& key);
+/// The names of all keys of a binding, with blanks between them.
+[[nodiscard]] std::string namesOf(const KeyBinding& binding);
+
+}  // namespace vesk

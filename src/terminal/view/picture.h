@@ -1,0 +1,73 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "terminal/view/path_bar.h"
+#include "terminal/view/table_browser.h"
+
+namespace vesk {
+
+/// The smallest terminal that screens are shown on.
+inline constexpr Size kSmallestSize{40, 10};
+
+/// Which lines of the terminal are what. `end` is the line after the last one.
+struct Regions {
+  struct Lines {
+    int start = 0;
+    int end = 0;
+
+    [[nodiscard]] int count() const { return end - start; }
+    [[nodiscard]] bool has(int line) const { return start <= line && line < end; }
+  };
+
+  int bar = 0;
+  int title = 1;
+  Lines list;
+  Lines pane;  ///< with its header line; empty when there is none
+  int hints = 0;
+  int listColumns = 0;  ///< of the list's lines, without the scroll bar
+
+  [[nodiscard]] static Regions of(Size size, bool hasPane);
+};
+
+/// The columns of the bar before the path and after the status.
+inline constexpr int kBarMargin = 1;
+
+/// Where the status starts on the bar; the column after the bar's text when there is none. The path ends one
+/// column before.
+[[nodiscard]] int statusColumn(int columns, int statusWidth);
+
+/// Lines wider than this tear a name from its value.
+inline constexpr int kWidestList = 100;
+
+/// All that one drawing of the terminal needs, and nothing that looks further. Views are good as long as the
+/// presenter is told nothing.
+struct Picture {
+  Size size{};
+  PathBar path{};
+  std::string status{};
+  std::string title{};
+  std::string freshness{};
+  bool isFrozen = false;
+
+  std::vector<ListLine> lines{};
+  ScrollExtent extent{};
+
+  std::string filter{};
+  bool isTypingFilter = false;
+
+  /// The first line of the help that shows; absent when the list does.
+  std::optional<int> helpStart{};
+
+  bool hasPane = false;
+  std::vector<std::string_view> paneLines{};
+  /// The number of the last line of the pane, and of the last line there is.
+  std::uint64_t paneEnd = 0;
+  std::uint64_t paneTotal = 0;
+};
+
+}  // namespace vesk

@@ -1,0 +1,350 @@
+#include "terminal/view/presenter.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "terminal/device/column_width.h"
+#include "terminal/view/freshness.h"
+#include "terminal/view/renderer.h"
+
+namespace vesk {
+
+namespace {
+
+constexpr int kWheelLines = 3;
+
+void removeLastCharacter(std::string& text) {
+  while (!text.empty() && (static_cast<unsigned char>(text.back()) & 0xC0) == 0x80)
+    text.pop_back();
+  if (!text.empty()) text.pop_back();
+}
+
+}  // namespace
+
+void Presenter::resize(Size size) {
+  size_ = size;
+  forgetMouse();
+}
+
+void Presenter::forgetMouse() {
+  held_.reset();
+  setTracking(false);
+}
+
+void Presenter::setTracking(bool isTracking) {
+  if (isTracking == std::exchange(isTracking_, isTracking)) return;
+  if (surroundings_.setTracking) surroundings_.setTracking(isTracking);
+}
+
+void Presenter::followStack() {
+  const auto& stack = stack_.stack();
+  const auto isSame = [](const Screen& screen, const std::shared_ptr<ViewController>& controller) {
+    return screen.controller == controller;
+  };
+  const auto differs = std::mismatch(screens_.begin(), screens_.end(), stack.begin(), stack.end(), isSame).first;
+  if (differs != screens_.end() || screens_.size() < stack.size()) {
+    isTypingFilter_ = false;
+    screens_.erase(differs, screens_.end());
+    for (std::size_t depth = screens_.size(); depth < stack.size(); ++depth) {
+      auto* table = dynamic_cast<TableViewController*>(stack[depth].get());
+      screens_.push_back({stack[depth], table != nullptr ? std::make_unique<TableBrowser>(*table) : nullptr});
+    }
+    for (const Screen& screen : screens_) {
+      if (screen.browser == nullptr) continue;
+      if (screen.browser->isFrozen()) screen.browser->setFrozen(false);
+      if (!screen.browser->filter().empty()) screen.browser->setFilter({});
+    }
+  }
+  if (TableBrowser* shown = browser()) {
+    const Regions regions = this->regions();
+    shown->setViewport({regions.listColumns, std::max(regions.list.count(), 1)});
+    shown->follow();
+  }
+}
+
+void Presenter::handle(const InputEvent& event) {
+  followStack();
+  if (const auto* key = std::get_if<KeyEvent>(&event)) {
+    forgetMouse();
+    handleKey(*key);
+  } else {
+    handleMouse(std::get<MouseEvent>(event));
+  }
+}
+
+void Presenter::handleKey(const KeyEvent& event) {
+  if (isTypingFilter_ && typeIntoFilter(event)) return;
+  const std::optional<Action> action = actionOf(event);
+  if (!action) return;
+  if (helpStart_) {
+    performInHelp(*action);
+  } else {
+    perform(*action);
+  }
+}
+
+/// False for the keys that mean the same while a filter is typed.
+bool Presenter::typeIntoFilter(const KeyEvent& event) {
+  TableBrowser* shown = browser();
+  if (shown == nullptr) return false;
+  std::string filter = shown->filter();
+  switch (event.key) {
+    case Key::Character:
+      if (event.modifiers.alt || event.modifiers.control) return true;
+      filter += nameOf({Key::Character, event.character});
+      shown->setFilter(std::move(filter));
+      return true;
+    case Key::Backspace:
+      if (filter.empty()) isTypingFilter_ = false;
+      removeLastCharacter(filter);
+      shown->setFilter(std::move(filter));
+      return true;
+    case Key::Enter:
+      isTypingFilter_ = false;
+      return true;
+    case Key::Escape:
+      isTypingFilter_ = false;
+      shown->setFilter({});
+      return true;
+    case Key::Left:
+    case Key::Right:
+      return true;
+    case Key::Tab:
+    case Key::Up:
+    case Key::Down:
+    case Key::PageUp:
+    case Key::PageDown:
+    case Key::Home:
+    case Key::End:
+    case Key::Insert:
+    case Key::Delete:
+      return false;
+  }
+  return false;
+}
+
+void Presenter::perform(Action action) {
+  TableBrowser* shown = browser();
+  switch (action) {
+    case Action::Help:
+      helpStart_ = 0;
+      return;
+    case Action::Open:
+      return open();
+    case Action::Back:
+      return goBack();
+    case Action::Filter:
+      isTypingFilter_ = shown != nullptr;
+      return;
+    case Action::Freeze:
+      if (shown != nullptr) shown->setFrozen(!shown->isFrozen());
+      return;
+    case Action::Diagnostics:
+      isPaneOpen_ = !isPaneOpen_;
+      paneEnd_.reset();
+      return;
+    case Action::OlderLines:
+      return scrollPane(-std::max(regions().pane.count() - 2, 1));
+    case Action::NewerLines:
+      return scrollPane(+std::max(regions().pane.count() - 2, 1));
+    case Action::Quit:
+      if (surroundings_.quit) surroundings_.quit();
+      return;
+    case Action::Up:
+      if (shown != nullptr) shown->moveSelection(-1);
+      return;
+    case Action::Down:
+      if (shown != nullptr) shown->moveSelection(+1);
+      return;
+    case Action::PageUp:
+      if (shown != nullptr) shown->page(-1);
+      return;
+    case Action::PageDown:
+      if (shown != nullptr) shown->page(+1);
+      return;
+    case Action::First:
+      if (shown != nullptr) shown->selectFirst();
+      return;
+    case Action::Last:
+      if (shown != nullptr) shown->selectLast();
+      return;
+  }
+}
+
+void Presenter::performInHelp(Action action) {
+  const int page = std::max(regions().list.count() - 1, 1);
+  switch (action) {
+    case Action::Help:
+    case Action::Back:
+      helpStart_.reset();
+      return;
+    case Action::Quit:
+      return perform(action);
+    case Action::Up:
+      return scrollHelp(-1);
+    case Action::Down:
+      return scrollHelp(+1);
+    case Action::PageUp:
+      return scrollHelp(-page);
+    case Action::PageDown:
+      return scrollHelp(+page);
+    case Action::First:
+      return scrollHelp(-helpLineCount());
+    case Action::Last:
+      return scrollHelp(+helpLineCount());
+    case Action::Open:
+    case Action::Filter:
+    case Action::Freeze:
+    case Action::Diagnostics:
+    case Action::OlderLines:
+    case Action::NewerLines:
+      return;
+  }
+}
+
+void Presenter::scrollHelp(int lines) {
+  const int last = std::max(helpLineCount() - regions().list.count(), 0);
+  helpStart_ = std::clamp(*helpStart_ + lines, 0, last);
+}
+
+void Presenter::scrollPane(int lines) {
+  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
+  const auto total = static_cast<std::int64_t>(surroundings_.diagnostics->total());
+  const auto kept = static_cast<std::int64_t>(surroundings_.diagnostics->lines().size());
+  const std::int64_t first = std::min<std::int64_t>(total - kept + regions().pane.count() - 1, total);
+  const std::int64_t present = paneEnd_ ? static_cast<std::int64_t>(*paneEnd_) : total;
+  const std::int64_t end = std::clamp(present + lines, first, total);
+  paneEnd_ = end < total ? std::optional(static_cast<std::uint64_t>(end)) : std::nullopt;
+}
+
+void Presenter::open() {
+  TableBrowser* shown = browser();
+  if (shown == nullptr || !shown->selection()) return;
+  shown->screen().selectRow(*shown->selection());
+}
+
+void Presenter::goBack() {
+  TableBrowser* shown = browser();
+  if (shown != nullptr && !shown->filter().empty()) {
+    shown->setFilter({});
+  } else {
+    stack_.pop();
+  }
+}
+
+void Presenter::handleMouse(const MouseEvent& event) {
+  TableBrowser* shown = browser();
+  switch (event.action) {
+    case MouseAction::WheelUp:
+    case MouseAction::WheelDown: {
+      const int lines = event.action == MouseAction::WheelUp ? -kWheelLines : kWheelLines;
+      if (regions().pane.has(event.line)) {
+        scrollPane(lines);
+      } else if (helpStart_) {
+        scrollHelp(lines);
+      } else if (shown != nullptr) {
+        shown->scroll(lines);
+      }
+      return;
+    }
+    case MouseAction::Press:
+      setTracking(false);
+      held_ = event;
+      return;
+    case MouseAction::Drag:
+      if (!held_ || shown == nullptr || helpStart_) return;
+      if (!isTracking_ && (event.line == held_->line || !regions().list.has(held_->line))) return;
+      setTracking(true);
+      shown->scroll(held_->line - event.line);
+      held_ = event;
+      return;
+    case MouseAction::Release: {
+      const std::optional<MouseEvent> pressed = std::exchange(held_, std::nullopt);
+      const bool wasDragged = isTracking_;
+      setTracking(false);
+      if (pressed && !wasDragged && pressed->line == event.line) click(*pressed);
+      return;
+    }
+  }
+}
+
+void Presenter::click(const MouseEvent& event) {
+  const Regions regions = this->regions();
+  if (event.line == regions.bar) {
+    for (const PathSegment& segment : pathBar(statusWidth_).segments) {
+      const int column = event.column - kBarMargin;
+      if (segment.column <= column && column < segment.end) stack_.popToDepth(segment.depth);
+    }
+  } else if (helpStart_) {
+    helpStart_.reset();
+  } else if (regions.list.has(event.line) && event.column < regions.listColumns) {
+    TableBrowser* shown = browser();
+    if (shown != nullptr && shown->selectLine(event.line - regions.list.start)) open();
+  }
+}
+
+std::vector<std::string> Presenter::titles() const {
+  std::vector<std::string> titles;
+  for (const Screen& screen : screens_) {
+    const std::optional<Text>& title = screen.controller->title();
+    titles.emplace_back(title ? title->view() : "–");
+  }
+  return titles;
+}
+
+PathBar Presenter::pathBar(int statusWidth) const {
+  return layOutPath(titles(), statusColumn(size_.columns, statusWidth) - 1 - kBarMargin);
+}
+
+void Presenter::expectChange(std::optional<Clock::Instant> when) {
+  if (when && (!nextChange_ || *when < *nextChange_)) nextChange_ = when;
+}
+
+Picture Presenter::picture(Clock::Instant now) {
+  followStack();
+  nextChange_.reset();
+  Picture picture{.size = size_};
+  if (surroundings_.sourceState) {
+    SourceState state = surroundings_.sourceState();
+    picture.status = std::move(state.text);
+    expectChange(state.nextChange);
+  }
+  statusWidth_ = textWidth(picture.status);
+  picture.path = pathBar(statusWidth_);
+
+  const std::vector<std::string> titles = this->titles();
+  if (!titles.empty()) picture.title = titles.back();
+  constexpr std::size_t kDepthOfMetrics = 3;
+  if (titles.size() == kDepthOfMetrics && surroundings_.arrivals) {
+    if (const std::optional<Arrivals> arrivals = surroundings_.arrivals(titles[1], titles[2])) {
+      Freshness freshness = freshnessOf(*arrivals, now);
+      picture.freshness = std::move(freshness.text);
+      expectChange(freshness.nextChange);
+    }
+  }
+  picture.helpStart = helpStart_;
+  if (TableBrowser* shown = browser()) {
+    picture.isFrozen = shown->isFrozen();
+    picture.lines = shown->lines();
+    picture.extent = shown->scrollExtent();
+    picture.filter = shown->filter();
+    picture.isTypingFilter = isTypingFilter_;
+  }
+  fillPane(picture);
+  return picture;
+}
+
+void Presenter::fillPane(Picture& picture) {
+  picture.hasPane = isPaneOpen_;
+  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
+  scrollPane(0);
+  const auto& lines = surroundings_.diagnostics->lines();
+  picture.paneTotal = surroundings_.diagnostics->total();
+  picture.paneEnd = paneEnd_.value_or(picture.paneTotal);
+  const auto newer = static_cast<std::ptrdiff_t>(picture.paneTotal - picture.paneEnd);
+  const auto room = static_cast<std::ptrdiff_t>(std::max(regions().pane.count() - 1, 0));
+  const auto end = lines.end() - newer;
+  picture.paneLines.assign(end - std::min(room, end - lines.begin()), end);
+}
+
+}  // namespace vesk

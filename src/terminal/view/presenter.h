@@ -1,0 +1,83 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "terminal/input/input_event.h"
+#include "terminal/input/key_bindings.h"
+#include "terminal/view/picture.h"
+#include "terminal/view/surroundings.h"
+#include "terminal/view/table_browser.h"
+#include "toolkit/navigation_controller.h"
+
+namespace vesk {
+
+/// What stands between the keys and the screens: it turns events into selection, scrolling, filter, freeze
+/// and panes, calls the toolkit for the rest, and says what shows. It knows no terminal. Main queue only.
+class Presenter {
+ public:
+  /// `stack` must outlive the presenter.
+  Presenter(NavigationController& stack, Surroundings surroundings)
+      : stack_(stack), surroundings_(std::move(surroundings)) {}
+
+  void resize(Size size);
+  void handle(const InputEvent& event);
+  /// The mouse is no longer heard of, as when the program is stopped.
+  void forgetMouse();
+
+  /// What shows at `now`, as of the toolkit's present state.
+  [[nodiscard]] Picture picture(Clock::Instant now);
+  /// When the last picture will be another one by the passing of time alone.
+  [[nodiscard]] std::optional<Clock::Instant> nextChange() const { return nextChange_; }
+
+ private:
+  struct Screen {
+    std::shared_ptr<ViewController> controller;
+    /// Null for a screen that is no table.
+    std::unique_ptr<TableBrowser> browser;
+  };
+
+  void handleKey(const KeyEvent& event);
+  void handleMouse(const MouseEvent& event);
+  void perform(Action action);
+  void performInHelp(Action action);
+  bool typeIntoFilter(const KeyEvent& event);
+  void click(const MouseEvent& event);
+  void open();
+  void goBack();
+  void scrollHelp(int lines);
+  void scrollPane(int lines);
+  void fillPane(Picture& picture);
+  void setTracking(bool isTracking);
+
+  /// Brings the browsers in line with the navigation stack and the top one with its table.
+  void followStack();
+  [[nodiscard]] TableBrowser* browser() { return screens_.empty() ? nullptr : screens_.back().browser.get(); }
+  [[nodiscard]] Regions regions() const { return Regions::of(size_, isPaneOpen_); }
+  [[nodiscard]] std::vector<std::string> titles() const;
+  [[nodiscard]] PathBar pathBar(int statusWidth) const;
+  void expectChange(std::optional<Clock::Instant> when);
+
+  NavigationController& stack_;
+  Surroundings surroundings_;
+  Size size_;
+  /// One for each screen of the stack, as of the last followStack.
+  std::vector<Screen> screens_;
+  bool isTypingFilter_ = false;
+  bool isPaneOpen_ = false;
+  /// The number of the last diagnostic line that shows, counted from 1; absent while the newest one does.
+  std::optional<std::uint64_t> paneEnd_;
+  std::optional<int> helpStart_;
+
+  /// Where the mouse's button went down or was last dragged to.
+  std::optional<MouseEvent> held_;
+  bool isTracking_ = false;
+
+  int statusWidth_ = 0;
+  std::optional<Clock::Instant> nextChange_;
+};
+
+}  // namespace vesk

@@ -1,0 +1,60 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "terminal/view/row_layout.h"
+#include "toolkit/table_view.h"
+
+namespace vesk {
+
+/// What a table says as of one of its reloads. Rows are asked for when they are first needed and kept until
+/// the content follows a later reload, so that a held content stays as it is while the table goes on.
+class TableContent {
+ public:
+  /// `table` must outlive the content.
+  explicit TableContent(TableView& table) : table_(table) {}
+
+  /// Takes over the table's present state. False when it was not reloaded since the last time.
+  bool follow();
+  /// Asks for every row that was not needed yet.
+  void fetchAll();
+
+  [[nodiscard]] std::size_t sectionCount() const { return sections_.size(); }
+  [[nodiscard]] std::size_t rowCount(std::size_t section) const { return sections_[section].rows.size(); }
+  [[nodiscard]] const std::optional<Text>& header(std::size_t section) const { return sections_[section].header; }
+  /// The row must be within the counts.
+  const RowContent& row(IndexPath at);
+  /// The row's height in lines in a list `columns` wide.
+  int height(IndexPath at, int columns);
+  /// The same, or the table's estimate for a row that was not needed yet.
+  [[nodiscard]] int likelyHeight(IndexPath at) const { return rowAt(at).height; }
+
+ private:
+  struct Row {
+    std::optional<RowContent> content;
+    /// An estimate until the row was laid out.
+    int height;
+    int columnsOfHeight = 0;
+  };
+  struct Section {
+    std::optional<Text> header;
+    std::vector<Row> rows;
+  };
+
+  [[nodiscard]] const Row& rowAt(IndexPath at) const { return sections_[at.section].rows[at.row]; }
+  [[nodiscard]] Row& rowAt(IndexPath at) { return sections_[at.section].rows[at.row]; }
+  [[nodiscard]] RowContent fetch(IndexPath at);
+  [[nodiscard]] bool hasChanged(IndexPath at, const RowContent& content) const;
+
+  TableView& table_;
+  std::uint64_t reloadCount_ = 0;
+  std::vector<Section> sections_;
+  /// The sections before the last reload; absent before the second one.
+  std::optional<std::vector<Section>> previous_;
+};
+
+}  // namespace vesk
