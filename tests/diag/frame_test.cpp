@@ -4,7 +4,7 @@
 #include <string_view>
 #include <vector>
 
-#include "diag/frame_reader.h"
+#include "diag/framing/frame_reader.h"
 #include "support/bytes.h"
 
 namespace vesk::diag {

@@ -2,8 +2,8 @@
 #include <string>
 #include <string_view>
 
-#include "diag/packet_list_reader.h"
-#include "diag/packet_reader.h"
+#include "diag/framing/packet_list_reader.h"
+#include "diag/framing/packet_reader.h"
 #include "support/bytes.h"
 
 namespace vesk::diag {

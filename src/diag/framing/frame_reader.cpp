@@ -1,9 +1,9 @@
-#include "diag/frame_reader.h"
+#include "diag/framing/frame_reader.h"
 
 #include <algorithm>
 #include <cstring>
 
-#include "diag/checksum.h"
+#include "diag/framing/checksum.h"
 
 namespace vesk::diag {
 

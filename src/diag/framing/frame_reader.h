@@ -6,7 +6,7 @@
 #include <span>
 #include <vector>
 
-#include "diag/frame.h"
+#include "diag/framing/frame.h"
 
 namespace vesk::diag {
 

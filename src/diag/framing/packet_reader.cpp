@@ -1,4 +1,4 @@
-#include "diag/packet_reader.h"
+#include "diag/framing/packet_reader.h"
 
 #include <array>
 

@@ -1,4 +1,4 @@
-#include "diag/checksum.h"
+#include "diag/framing/checksum.h"
 
 #include <array>
 #include <cstddef>

@@ -1,6 +1,6 @@
-#include "diag/frame.h"
+#include "diag/framing/frame.h"
 
-#include "diag/checksum.h"
+#include "diag/framing/checksum.h"
 
 namespace vesk::diag {
 

@@ -1,9 +1,9 @@
-#include "diag/packet_list_reader.h"
+#include "diag/framing/packet_list_reader.h"
 
 #include <algorithm>
 
+#include "diag/framing/packet_reader.h"
 #include "diag/little_endian.h"
-#include "diag/packet_reader.h"
 
 namespace vesk::diag {
 
