@@ -11,6 +11,7 @@ build     g++                 g++
 build     rapidjson-dev       /usr/include/rapidjson/reader.h
 build     libcli11-dev        /usr/include/CLI/CLI.hpp
 build     libncurses-dev      /usr/include/ncursesw/curses.h
+build     zlib1g-dev          /usr/include/zlib.h
 test      libgtest-dev        /usr/include/gtest/gtest.h
 test      protobuf-compiler   protoc
 test      libprotobuf-dev     /usr/include/google/protobuf/message.h
@@ -27,6 +28,8 @@ schema    protobuf-compiler   protoc
 manual    groff               groff
 readme    jq                  jq
 readme    bsdutils            script
+captures  jq                  jq
+captures  diffutils           cmp
 load      time                /usr/bin/time
 load      diffutils           cmp
 shell     shellcheck          shellcheck

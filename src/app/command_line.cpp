@@ -14,6 +14,7 @@
 
 #include "app/data_output.h"
 #include "app/decode_command.h"
+#include "app/import_command.h"
 #include "app/run_command.h"
 #include "app/show_command.h"
 #include "app/simulate_command.h"
@@ -64,6 +65,15 @@ constexpr const char* kSimulateExamples =
     "Examples:\n"
     "  vesk simulate --seconds 600 > drive.jsonl\n"
     "  vesk simulate --seed 7 | vesk show LTE \"RRC State\" -";
+
+constexpr const char* kImportExamples =
+    "A capture is what a program kept of a modem's diagnostic port: QMDL, .mi2log or\n"
+    "DLF, told by its content, also compressed with gzip. It becomes a recording.\n"
+    "\n"
+    "Examples:\n"
+    "  vesk import drive.qmdl > drive.jsonl\n"
+    "  vesk import --count drive.qmdl         what it holds, and what is read of it\n"
+    "  vesk import drive.qmdl | vesk show LTE \"RRC State\" -";
 
 /// So narrow that the descriptions beside the options end before column 80.
 constexpr std::size_t kOptionColumn = 20;
@@ -128,6 +138,7 @@ class CommandLine {
     addStores();
     addShow();
     addSimulate();
+    addImport();
   }
 
   Outcome run(int argc, const char* const* argv) {
@@ -231,77 +242,90 @@ class CommandLine {
     simulate->final_callback([this] { command_ = [this] { return runSimulate(simulate_); }; });
   }
 
-  /// The help or the version.
-  Outcome printAnswer(const CLI::ParseError& asked) {
-    std::ostringstream answer;
-    program_.exit(asked, answer, answer);
-    std::string text = answer.str();
-    if (text.ends_with('\n')) text.pop_back();
-    DataOutput output;
-    output.writeLine(text);
-    return output.finish(Outcome::done);
-  }
+  void addImport() {
+    CLI::App* import = program_.add_subcommand("import", "Print a capture of a diagnostic port as a recording");
+    addRecording(*import, import_.path, "The capture; - or nothing for standard input");
+    import->add_option("--sim", import_.sim, "Take the packets of one SIM only, from 1")
+        ->type_name("N")
+        ->check(CLI::PositiveNumber.description(""));
+    import->add_flag("--count", import_.countsOnly, "Print a table of what the capture holds instead");
+    addLogOption(*import, kDataLog);
+    import->footer(kImportExamples);
+    import->final_callback([this] { command_ = [this] { return runImport(import_);
+  }; });
+}  // namespace
 
-  /// An option of the program that the subcommand would not heed; empty for none.
-  [[nodiscard]] std::string optionBeforeCommand() const {
-    if (program_.get_subcommands().empty()) return "";
-    const auto given = program_.get_options([](const CLI::Option* each) { return each->count() > 0; });
-    const auto stray =
-        std::find_if(given.begin(), given.end(), [](const CLI::Option* each) { return !each->check_lname("log"); });
-    return stray == given.end() ? "" : (*stray)->get_name();
-  }
+/// The help or the version.
+Outcome printAnswer(const CLI::ParseError& asked) {
+  std::ostringstream answer;
+  program_.exit(asked, answer, answer);
+  std::string text = answer.str();
+  if (text.ends_with('\n')) text.pop_back();
+  DataOutput output;
+  output.writeLine(text);
+  return output.finish(Outcome::done);
+}
 
-  /// One line: what was wrong, what may have been meant, and where more is told.
-  void tellMistake(const CLI::ParseError& error) {
-    const auto commands = program_.get_subcommands();
-    const CLI::App& command = commands.empty() ? program_ : *commands.front();
-    std::string line = "vesk: ";
-    const std::vector<std::string> unexpected = program_.remaining(true);
-    if (dynamic_cast<const CLI::ExtrasError*>(&error) != nullptr && !unexpected.empty()) {
-      line += inWords(unexpected, command);
-    } else {
-      line += error.what();
-    }
-    line += commands.empty() ? "; see vesk --help" : "; see vesk " + command.get_name() + " --help";
-    tellUser(line);
-  }
+/// An option of the program that the subcommand would not heed; empty for none.
+[[nodiscard]] std::string optionBeforeCommand() const {
+  if (program_.get_subcommands().empty()) return "";
+  const auto given = program_.get_options([](const CLI::Option* each) { return each->count() > 0; });
+  const auto stray =
+      std::find_if(given.begin(), given.end(), [](const CLI::Option* each) { return !each->check_lname("log"); });
+  return stray == given.end() ? "" : (*stray)->get_name();
+}
 
-  std::string inWords(const std::vector<std::string>& unexpected, const CLI::App& command) const {
-    const auto option = std::find_if(unexpected.begin(), unexpected.end(),
-                                     [](const std::string& word) { return word.starts_with('-') && word != "-"; });
-    std::vector<std::string> names;
-    if (option != unexpected.end()) {
-      for (const CLI::Option* known :
-           command.get_options([](const CLI::Option* each) { return each->nonpositional(); }))
-        names.push_back("--" + known->get_lnames().front());
-      const std::string name = option->substr(0, option->find('='));
-      return "no option " + name + suggestionFor(name, names);
-    }
-    const std::string& word = unexpected.front();
-    if (&command != &program_) return "an argument too many: " + word + " (quote a name that holds blanks)";
-    for (const CLI::App* known : program_.get_subcommands([](const CLI::App*) { return true; }))
-      names.push_back(known->get_name());
-    return "no subcommand " + word + suggestionFor(word, names);
+/// One line: what was wrong, what may have been meant, and where more is told.
+void tellMistake(const CLI::ParseError& error) {
+  const auto commands = program_.get_subcommands();
+  const CLI::App& command = commands.empty() ? program_ : *commands.front();
+  std::string line = "vesk: ";
+  const std::vector<std::string> unexpected = program_.remaining(true);
+  if (dynamic_cast<const CLI::ExtrasError*>(&error) != nullptr && !unexpected.empty()) {
+    line += inWords(unexpected, command);
+  } else {
+    line += error.what();
   }
+  line += commands.empty() ? "; see vesk --help" : "; see vesk " + command.get_name() + " --help";
+  tellUser(line);
+}
 
-  static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {
-    command.add_option("FILE", path, description)->type_name("");
+std::string inWords(const std::vector<std::string>& unexpected, const CLI::App& command) const {
+  const auto option = std::find_if(unexpected.begin(), unexpected.end(),
+                                   [](const std::string& word) { return word.starts_with('-') && word != "-"; });
+  std::vector<std::string> names;
+  if (option != unexpected.end()) {
+    for (const CLI::Option* known : command.get_options([](const CLI::Option* each) { return each->nonpositional(); }))
+      names.push_back("--" + known->get_lnames().front());
+    const std::string name = option->substr(0, option->find('='));
+    return "no option " + name + suggestionFor(name, names);
   }
+  const std::string& word = unexpected.front();
+  if (&command != &program_) return "an argument too many: " + word + " (quote a name that holds blanks)";
+  for (const CLI::App* known : program_.get_subcommands([](const CLI::App*) { return true; }))
+    names.push_back(known->get_name());
+  return "no subcommand " + word + suggestionFor(word, names);
+}
 
-  void addLogOption(CLI::App& command, const std::string& usual) {
-    command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
-        ->type_name("TO")
-        ->default_str(usual);
-  }
+static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {
+  command.add_option("FILE", path, description)->type_name("");
+}
 
-  CLI::App program_{"Radio metrics of a cellular handset, decoded and shown"};
-  RunOptions run_;
-  ShowOptions show_;
-  SimulateOptions simulate_;
-  std::optional<std::string> recording_;
-  std::optional<std::string> logTo_;
-  std::function<Outcome()> command_;
-};
+void addLogOption(CLI::App& command, const std::string& usual) {
+  command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
+      ->type_name("TO")
+      ->default_str(usual);
+}
+
+CLI::App program_{"Radio metrics of a cellular handset, decoded and shown"};
+RunOptions run_;
+ShowOptions show_;
+SimulateOptions simulate_;
+ImportOptions import_;
+std::optional<std::string> recording_;
+std::optional<std::string> logTo_;
+std::function<Outcome()> command_;
+};  // namespace vesk
 
 }  // namespace
 

@@ -22,6 +22,7 @@ enum class PacketKind {
   unknown,
   damaged,
 };
+inline constexpr std::size_t kPacketKinds = 8;
 
 /// A frame's content, told apart; valid as long as that.
 struct Packet {

@@ -1,0 +1,105 @@
+#include "app/import_command.h"
+
+#include <utility>
+
+#include "app/data_output.h"
+#include "app/packet_table.h"
+#include "app/progress.h"
+#include "diag/capture/capture_reader.h"
+#include "diag/capture/capture_remarks.h"
+#include "diag/capture/content.h"
+#include "recording/byte_input.h"
+
+namespace vesk {
+
+namespace {
+
+using diag::CaptureForm;
+using diag::Content;
+
+/// What a file is that holds no capture, and what to do; null for one that may.
+const char* whyNotImported(Content content) {
+  switch (content) {
+    case Content::frames:
+    case Content::packetList:
+    case Content::unknown:
+      return nullptr;
+    case Content::nothing:
+      return "is empty";
+    case Content::recording:
+      return "is a recording already";
+    case Content::text:
+      return "is text, and no capture of a diagnostic port";
+    case Content::networkCapture:
+      return "is a capture of a network (pcap), and not of a diagnostic port";
+    case Content::archive:
+      return "is an archive or compressed in a way that is not read: unpack it first";
+  }
+  return nullptr;
+}
+
+/// Imports a capture step by step.
+class Importing {
+ public:
+  explicit Importing(const ImportOptions& options) : options_(options) {}
+
+  Outcome run() {
+    ByteInput input(options_.path.value_or("-"));
+    const Content content = diag::tellContent(input);
+    if (input.failure()) return fail(*input.failure());
+    if (const char* reason = whyNotImported(content)) return fail(input.name() + ' ' + reason);
+
+    const CaptureForm form = content == Content::frames ? CaptureForm::frames : CaptureForm::packetList;
+    diag::CaptureReader capture(std::move(input), form, options_.sim);
+    capture.input().setBeforeRead([this](int) {
+      output_.flush();
+      return !output_.hasFailed();
+    });
+    writeEvents(capture);
+    const diag::PacketCounts& counts = capture.counts();
+    const bool isCapture = content != Content::unknown || counts.logs().read + counts.logs().passedOver > 0;
+    if (!isCapture)
+      return fail(capture.input().name() + " is no capture: it begins with neither frames nor log packets");
+    if (options_.countsOnly) writePacketTable(output_, counts);
+    for (const std::string& remark : remarksOn(capture))
+      tellUser(remark);
+    if (capture.input().failure()) return fail(*capture.input().failure());
+    return output_.finish(Outcome::done);
+  }
+
+ private:
+  static constexpr std::uint64_t kEventsToProgress = 4096;
+
+  void writeEvents(diag::CaptureReader& capture) {
+    std::string line;
+    std::uint64_t events = 0;
+    while (const std::optional<RecordedEvent> event = capture.next()) {
+      if (output_.hasFailed()) break;
+      // So rarely that asking the clock costs nothing.
+      if (++events % kEventsToProgress == 0) progress_.show(events, 0, std::nullopt);
+      if (options_.countsOnly) continue;
+      line.clear();
+      appendRecordedEvent(line, *event);
+      line.pop_back();
+      output_.writeLine(line);
+    }
+    progress_.hide();
+  }
+
+  Outcome fail(const std::string& reason) {
+    tellUser("vesk: " + reason);
+    return output_.finish(Outcome::failed);
+  }
+
+  const ImportOptions& options_;
+  DataOutput output_;
+  Progress progress_{Progress::Output::meanwhile};
+};
+
+}  // namespace
+
+Outcome runImport(const ImportOptions& options) {
+  return Importing(options).run();
+}
+
+}  // namespace vesk
