@@ -31,7 +31,7 @@ bool Bearers::deactivate(std::uint8_t identity) {
 KCellularActivatedBearerContexts Bearers::report() const {
   KCellularActivatedBearerContexts report;
   for (const auto& bearer : active_) {
-    if (bearer != nullptr) report.addBearerContext(bearer);
+    if (bearer != nullptr) report.addBearerContexts(bearer);
   }
   if (areAllKnown_) report.setBearerContextCount(static_cast<std::uint32_t>(report.bearerContextsCount()));
   return report;

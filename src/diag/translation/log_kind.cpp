@@ -56,9 +56,8 @@ std::span<const LogKind> logKinds() {
 }
 
 const LogKind* findLogKind(std::uint16_t code) {
-  const auto* const kind =
-      std::lower_bound(std::begin(kLogKinds), std::end(kLogKinds), code,
-                       [](const LogKind& row, std::uint16_t wanted) { return row.code < wanted; });
+  const auto* const kind = std::lower_bound(std::begin(kLogKinds), std::end(kLogKinds), code,
+                                            [](const LogKind& row, std::uint16_t wanted) { return row.code < wanted; });
   return kind != std::end(kLogKinds) && kind->code == code ? kind : nullptr;
 }
 
