@@ -33,6 +33,7 @@ constexpr const char* kExamples =
     "  vesk --replay drive.jsonl --speed 10   the same, ten times as fast\n"
     "  tail -f live.jsonl | vesk --replay -   the screens on a live pipe\n"
     "  vesk --headless --replay drive.jsonl   the diagnostic lines, no screens\n"
+    "  vesk --diag /dev/ttyUSB0               the screens on a real modem\n"
     "\n"
     "A recording has one event a line:\n"
     "  {\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"1003\"}\n"
@@ -165,6 +166,13 @@ class CommandLine {
     CLI::Option* replay =
         program_.add_option("--replay", run_.source.replay, "Feed it a recording, not simulated events; - is stdin")
             ->type_name("FILE");
+    CLI::Option* port = program_.add_option("--diag", run_.source.port, "Feed it a modem's diagnostic port")
+                            ->type_name("PORT")
+                            ->excludes(replay);
+    program_.add_option("--sim", run_.source.sim, "Take the packets of one of the modem's SIMs only, from 1")
+        ->type_name("N")
+        ->check(CLI::PositiveNumber.description(""))
+        ->needs(port);
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
     program_
         .add_option_function<std::string>(
@@ -180,7 +188,8 @@ class CommandLine {
     program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")
         ->type_name("N")
         ->check(CLI::NonNegativeNumber.description(""))
-        ->excludes(replay);
+        ->excludes(replay)
+        ->excludes(port);
     program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
     program_
         .add_option_function<double>(
@@ -243,89 +252,89 @@ class CommandLine {
   }
 
   void addImport() {
-    CLI::App* import = program_.add_subcommand("import", "Print a capture of a diagnostic port as a recording");
-    addRecording(*import, import_.path, "The capture; - or nothing for standard input");
-    import->add_option("--sim", import_.sim, "Take the packets of one SIM only, from 1")
+    CLI::App* command = program_.add_subcommand("import", "Print a capture of a diagnostic port as a recording");
+    addRecording(*command, import_.path, "The capture; - or nothing for standard input");
+    command->add_option("--sim", import_.sim, "Take the packets of one SIM only, from 1")
         ->type_name("N")
         ->check(CLI::PositiveNumber.description(""));
-    import->add_flag("--count", import_.countsOnly, "Print a table of what the capture holds instead");
-    addLogOption(*import, kDataLog);
-    import->footer(kImportExamples);
-    import->final_callback([this] { command_ = [this] { return runImport(import_);
-  }; });
-}  // namespace
-
-/// The help or the version.
-Outcome printAnswer(const CLI::ParseError& asked) {
-  std::ostringstream answer;
-  program_.exit(asked, answer, answer);
-  std::string text = answer.str();
-  if (text.ends_with('\n')) text.pop_back();
-  DataOutput output;
-  output.writeLine(text);
-  return output.finish(Outcome::done);
-}
-
-/// An option of the program that the subcommand would not heed; empty for none.
-[[nodiscard]] std::string optionBeforeCommand() const {
-  if (program_.get_subcommands().empty()) return "";
-  const auto given = program_.get_options([](const CLI::Option* each) { return each->count() > 0; });
-  const auto stray =
-      std::find_if(given.begin(), given.end(), [](const CLI::Option* each) { return !each->check_lname("log"); });
-  return stray == given.end() ? "" : (*stray)->get_name();
-}
-
-/// One line: what was wrong, what may have been meant, and where more is told.
-void tellMistake(const CLI::ParseError& error) {
-  const auto commands = program_.get_subcommands();
-  const CLI::App& command = commands.empty() ? program_ : *commands.front();
-  std::string line = "vesk: ";
-  const std::vector<std::string> unexpected = program_.remaining(true);
-  if (dynamic_cast<const CLI::ExtrasError*>(&error) != nullptr && !unexpected.empty()) {
-    line += inWords(unexpected, command);
-  } else {
-    line += error.what();
+    command->add_flag("--count", import_.countsOnly, "Print a table of what the capture holds instead");
+    addLogOption(*command, kDataLog);
+    command->footer(kImportExamples);
+    command->final_callback([this] { command_ = [this] { return runImport(import_); }; });
   }
-  line += commands.empty() ? "; see vesk --help" : "; see vesk " + command.get_name() + " --help";
-  tellUser(line);
-}
 
-std::string inWords(const std::vector<std::string>& unexpected, const CLI::App& command) const {
-  const auto option = std::find_if(unexpected.begin(), unexpected.end(),
-                                   [](const std::string& word) { return word.starts_with('-') && word != "-"; });
-  std::vector<std::string> names;
-  if (option != unexpected.end()) {
-    for (const CLI::Option* known : command.get_options([](const CLI::Option* each) { return each->nonpositional(); }))
-      names.push_back("--" + known->get_lnames().front());
-    const std::string name = option->substr(0, option->find('='));
-    return "no option " + name + suggestionFor(name, names);
+  /// The help or the version.
+  Outcome printAnswer(const CLI::ParseError& asked) {
+    std::ostringstream answer;
+    program_.exit(asked, answer, answer);
+    std::string text = answer.str();
+    if (text.ends_with('\n')) text.pop_back();
+    DataOutput output;
+    output.writeLine(text);
+    return output.finish(Outcome::done);
   }
-  const std::string& word = unexpected.front();
-  if (&command != &program_) return "an argument too many: " + word + " (quote a name that holds blanks)";
-  for (const CLI::App* known : program_.get_subcommands([](const CLI::App*) { return true; }))
-    names.push_back(known->get_name());
-  return "no subcommand " + word + suggestionFor(word, names);
-}
 
-static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {
-  command.add_option("FILE", path, description)->type_name("");
-}
+  /// An option of the program that the subcommand would not heed; empty for none.
+  [[nodiscard]] std::string optionBeforeCommand() const {
+    if (program_.get_subcommands().empty()) return "";
+    const auto given = program_.get_options([](const CLI::Option* each) { return each->count() > 0; });
+    const auto stray =
+        std::find_if(given.begin(), given.end(), [](const CLI::Option* each) { return !each->check_lname("log"); });
+    return stray == given.end() ? "" : (*stray)->get_name();
+  }
 
-void addLogOption(CLI::App& command, const std::string& usual) {
-  command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
-      ->type_name("TO")
-      ->default_str(usual);
-}
+  /// One line: what was wrong, what may have been meant, and where more is told.
+  void tellMistake(const CLI::ParseError& error) {
+    const auto commands = program_.get_subcommands();
+    const CLI::App& command = commands.empty() ? program_ : *commands.front();
+    std::string line = "vesk: ";
+    const std::vector<std::string> unexpected = program_.remaining(true);
+    if (dynamic_cast<const CLI::ExtrasError*>(&error) != nullptr && !unexpected.empty()) {
+      line += inWords(unexpected, command);
+    } else {
+      line += error.what();
+    }
+    line += commands.empty() ? "; see vesk --help" : "; see vesk " + command.get_name() + " --help";
+    tellUser(line);
+  }
 
-CLI::App program_{"Radio metrics of a cellular handset, decoded and shown"};
-RunOptions run_;
-ShowOptions show_;
-SimulateOptions simulate_;
-ImportOptions import_;
-std::optional<std::string> recording_;
-std::optional<std::string> logTo_;
-std::function<Outcome()> command_;
-};  // namespace vesk
+  std::string inWords(const std::vector<std::string>& unexpected, const CLI::App& command) const {
+    const auto option = std::find_if(unexpected.begin(), unexpected.end(),
+                                     [](const std::string& word) { return word.starts_with('-') && word != "-"; });
+    std::vector<std::string> names;
+    if (option != unexpected.end()) {
+      for (const CLI::Option* known :
+           command.get_options([](const CLI::Option* each) { return each->nonpositional(); }))
+        names.push_back("--" + known->get_lnames().front());
+      const std::string name = option->substr(0, option->find('='));
+      return "no option " + name + suggestionFor(name, names);
+    }
+    const std::string& word = unexpected.front();
+    if (&command != &program_) return "an argument too many: " + word + " (quote a name that holds blanks)";
+    for (const CLI::App* known : program_.get_subcommands([](const CLI::App*) { return true; }))
+      names.push_back(known->get_name());
+    return "no subcommand " + word + suggestionFor(word, names);
+  }
+
+  static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {
+    command.add_option("FILE", path, description)->type_name("");
+  }
+
+  void addLogOption(CLI::App& command, const std::string& usual) {
+    command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
+        ->type_name("TO")
+        ->default_str(usual);
+  }
+
+  CLI::App program_{"Radio metrics of a cellular handset, decoded and shown"};
+  RunOptions run_;
+  ShowOptions show_;
+  SimulateOptions simulate_;
+  ImportOptions import_;
+  std::optional<std::string> recording_;
+  std::optional<std::string> logTo_;
+  std::function<Outcome()> command_;
+};
 
 }  // namespace
 

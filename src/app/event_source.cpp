@@ -3,7 +3,9 @@
 #include <chrono>
 #include <cmath>
 #include <cstdio>
+#include <utility>
 
+#include "diag/port/port_service.h"
 #include "handset/handset_service.h"
 
 namespace vesk {
@@ -38,9 +40,46 @@ ShownState shown(const corvik::PlaybackState& state) {
   return {"replaying " + playingTime(state.position) + " of " + playingTime(*state.duration), true};
 }
 
+/// "ttyUSB0: 23 packets/s, 2 damaged", and what else has gone wrong.
+ShownState shown(const std::string& port, const diag::PortState& state) {
+  using Phase = diag::PortState::Phase;
+  std::string text = port.substr(port.rfind('/') + 1) + ": ";
+  switch (state.phase) {
+    case Phase::starting:
+      return {text + "starting"};
+    case Phase::unplugged:
+      return {text + "unplugged, waiting"};
+    case Phase::ended:
+      return {text + "ended"};
+    case Phase::silent:
+      text += "silent";
+      break;
+    case Phase::watching:
+      text += std::to_string(state.packetsPerSecond) + " packets/s";
+      break;
+  }
+  const std::pair<std::uint64_t, const char*> counts[] = {
+      {state.damaged, " damaged"}, {state.passedOver, " passed over"}, {state.dropped, " dropped"}};
+  for (const auto& [count, what] : counts) {
+    if (count > 0) text += ", " + std::to_string(count) + what;
+  }
+  return {text, true};
+}
+
+EventSource makePortSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+  diag::Port port(*options.port);
+  if (!port.isOpen()) return {nullptr, nullptr, port.failure()};
+  auto service = std::make_shared<diag::PortService>(std::move(port), options.sim, clock);
+  service->setRemarkHandler(std::move(handlers.remark));
+  service->setEndHandler([ended = std::move(handlers.ended)](const std::string& failure) { ended(failure); });
+  diag::PortService& watched = *service;
+  return {std::move(service), [&watched, port = *options.port] { return shown(port, watched.state()); }};
+}
+
 }  // namespace
 
 EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+  if (options.port) return makePortSource(options, clock, std::move(handlers));
   if (!options.replay) {
     const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
     const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();

@@ -14,8 +14,12 @@ namespace vesk {
 
 /// Which events the program is fed with.
 struct SourceOptions {
-  /// A recording; "-" is standard input. Without one a simulated handset is driven.
+  /// A recording; "-" is standard input.
   std::optional<std::string> replay;
+  /// A modem's diagnostic port. Without one and without a recording a simulated handset is driven.
+  std::optional<std::string> port;
+  /// Which SIM of the modem; absent for all.
+  std::optional<std::uint32_t> sim;
   /// Which drive of the handset.
   std::uint64_t seed = 1;
   corvik::Playback playback;
@@ -33,7 +37,7 @@ struct ShownState {
 struct EventSource {
   std::shared_ptr<corvik::Service> service;
   std::function<ShownState()> state;
-  /// Why the recording cannot be read at all.
+  /// Why the recording cannot be read at all, or the port not be opened.
   std::optional<std::string> failure{};
 };
 
@@ -41,6 +45,8 @@ struct EventSource {
 struct SourceHandlers {
   /// A line that is no event.
   std::function<void(const std::string& message)> badLine;
+  /// Something that the user should know, and no fault.
+  std::function<void(const std::string& remark)> remark;
   /// Everything has been delivered; `failure` tells why a recording could not be read to its end.
   std::function<void(const std::optional<std::string>& failure)> ended;
 };
