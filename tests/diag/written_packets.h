@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstdlib>
 #include <gtest/gtest.h>
 #include <string>
@@ -21,8 +22,20 @@ inline void putBits(Bytes& body, std::size_t at, std::size_t bytes, unsigned bit
   }
 }
 
+/// The bytes of a message, points between them passed over: "07.4171".
+inline Bytes messageOf(std::string_view hex) {
+  std::string digits(hex);
+  std::erase(digits, '.');
+  return bytesOf(digits);
+}
+
+/// The same with their number before them.
+inline std::string withLength(std::string_view hex) {
+  return hexOf(std::array{static_cast<std::uint8_t>(messageOf(hex).size())}) + std::string(hex);
+}
+
 /// A body from its fields: "b7=3 h4=185 w16=5780" are the byte, 16-bit and 32-bit numbers at an offset,
-/// "w16[10:12]=640" is 12 bits from bit 10 on, "x19=2A02" are bytes, "n19=0.1011.00" bits from the first byte's most
+/// "w16[10:12]=640" is 12 bits from bit 10 on, "x19=2A.02" are bytes, "n19=0.1011.00" bits from the first byte's most
 /// significant on. The offsets behind "@12" count from 12. The body is as long as its last field needs.
 inline Bytes bodyOf(std::string_view fields) {
   Bytes body;
@@ -48,7 +61,7 @@ inline Bytes bodyOf(std::string_view fields) {
     }
     const std::string value = rest + 1;
     if (kind == 'x') {
-      const Bytes more = bytesOf(value);
+      const Bytes more = messageOf(value);
       body.resize(std::max(body.size(), at));
       body.insert(body.end(), more.begin(), more.end());
     } else if (kind == 'n') {
