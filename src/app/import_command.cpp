@@ -57,7 +57,7 @@ class Importing {
     });
     writeEvents(capture);
     const diag::PacketCounts& counts = capture.counts();
-    const bool isCapture = content != Content::unknown || counts.logs().read + counts.logs().passedOver > 0;
+    const bool isCapture = content != Content::unknown || counts.logs().read > 0;
     if (!isCapture)
       return fail(capture.input().name() + " is no capture: it begins with neither frames nor log packets");
     if (options_.countsOnly) writePacketTable(output_, counts);
