@@ -173,6 +173,8 @@ class CommandLine {
         ->type_name("N")
         ->check(CLI::PositiveNumber.description(""))
         ->needs(port);
+    program_.add_option("--record", run_.source.record, "Keep what comes: of a port the capture, else a recording")
+        ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
     program_
         .add_option_function<std::string>(
@@ -258,6 +260,7 @@ class CommandLine {
         ->type_name("N")
         ->check(CLI::PositiveNumber.description(""));
     command->add_flag("--count", import_.countsOnly, "Print a table of what the capture holds instead");
+    command->add_flag("--layouts", import_.layoutsOnly, "Print a table of what can be read");
     addLogOption(*command, kDataLog);
     command->footer(kImportExamples);
     command->final_callback([this] { command_ = [this] { return runImport(import_); }; });

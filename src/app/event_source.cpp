@@ -5,8 +5,12 @@
 #include <cstdio>
 #include <utility>
 
+#include "app/recording_service.h"
+#include "diag/framing/frame.h"
 #include "diag/port/port_service.h"
 #include "handset/handset_service.h"
+#include "recording/record_file.h"
+#include "system/main_queue.h"
 
 namespace vesk {
 
@@ -66,33 +70,65 @@ ShownState shown(const std::string& port, const diag::PortState& state) {
   return {text, true};
 }
 
-EventSource makePortSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+/// Keeps every frame in `file`; `failed` is told, on the main queue, when that is no longer possible.
+diag::PortService::FrameHandler keepFrames(std::shared_ptr<RecordFile> file,
+                                           std::function<void(const std::string&)> failed) {
+  return [file = std::move(file), failed = std::move(failed),
+          frame = std::vector<std::uint8_t>()](std::span<const std::uint8_t> content) mutable {
+    if (file->failure()) return;
+    frame.clear();
+    diag::appendFrame(frame, content);
+    if (!file->append(frame)) MainQueue::shared().async([failed, reason = *file->failure()] { failed(reason); });
+  };
+}
+
+EventSource makePortSource(const SourceOptions& options, std::unique_ptr<RecordFile> file, const Clock& clock,
+                           SourceHandlers handlers) {
   diag::Port port(*options.port);
   if (!port.isOpen()) return {nullptr, nullptr, port.failure()};
   auto service = std::make_shared<diag::PortService>(std::move(port), options.sim, clock);
   service->setRemarkHandler(std::move(handlers.remark));
   service->setEndHandler([ended = std::move(handlers.ended)](const std::string& failure) { ended(failure); });
+  if (file != nullptr) service->setFrameHandler(keepFrames(std::move(file), std::move(handlers.badLine)));
   diag::PortService& watched = *service;
   return {std::move(service), [&watched, port = *options.port] { return shown(port, watched.state()); }};
 }
 
-}  // namespace
+EventSource makeSimulatedSource(const SourceOptions& options, const Clock& clock) {
+  const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
+  const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
+  return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
+          [] { return ShownState{"simulated"}; }, std::nullopt,
+          [&clock] { return std::chrono::duration<double>(clock.now().time_since_epoch()).count(); }};
+}
 
-EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
-  if (options.port) return makePortSource(options, clock, std::move(handlers));
-  if (!options.replay) {
-    const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
-    const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
-    return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
-            [] { return ShownState{"simulated"}; }};
-  }
+EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
   RecordingReader recording(*options.replay);
   const std::optional<std::string> failure = recording.failure();
   auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));
   service->setEndHandler(std::move(handlers.ended));
   corvik::RecordedService& recorded = *service;
-  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure};
+  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure,
+          [&recorded] { return recorded.state().position; }};
+}
+
+}  // namespace
+
+EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+  std::string reason;
+  std::unique_ptr<RecordFile> file;
+  if (options.record) {
+    file = RecordFile::create(*options.record, reason);
+    if (file == nullptr) return {nullptr, nullptr, reason};
+  }
+  if (options.port) return makePortSource(options, std::move(file), clock, std::move(handlers));
+  const auto failed = handlers.badLine;
+  EventSource source =
+      options.replay ? makeReplaySource(options, clock, std::move(handlers)) : makeSimulatedSource(options, clock);
+  if (file != nullptr)
+    source.service = std::make_shared<RecordingService>(source.service, std::move(file), source.seconds, failed);
+  return source;
 }
 
 }  // namespace vesk

@@ -20,6 +20,8 @@ struct SourceOptions {
   std::optional<std::string> port;
   /// Which SIM of the modem; absent for all.
   std::optional<std::uint32_t> sim;
+  /// Where what comes is kept: of a port the capture, of anything else a recording. Absent for nowhere.
+  std::optional<std::string> record;
   /// Which drive of the handset.
   std::uint64_t seed = 1;
   corvik::Playback playback;
@@ -37,13 +39,15 @@ struct ShownState {
 struct EventSource {
   std::shared_ptr<corvik::Service> service;
   std::function<ShownState()> state;
-  /// Why the recording cannot be read at all, or the port not be opened.
+  /// Why the recording cannot be read at all, the port not be opened, or nothing be kept.
   std::optional<std::string> failure{};
+  /// How far its own time has come, in seconds from some start; from any thread. Null for a port, whose packets know.
+  std::function<double()> seconds{};
 };
 
 /// What an event source tells; both on the main queue.
 struct SourceHandlers {
-  /// A line that is no event.
+  /// A line that is no event, or that what comes can no longer be kept.
   std::function<void(const std::string& message)> badLine;
   /// Something that the user should know, and no fault.
   std::function<void(const std::string& remark)> remark;

@@ -44,6 +44,10 @@ class Importing {
   explicit Importing(const ImportOptions& options) : options_(options) {}
 
   Outcome run() {
+    if (options_.layoutsOnly) {
+      writeLayoutTable(output_);
+      return output_.finish(Outcome::done);
+    }
     ByteInput input(options_.path.value_or("-"));
     const Content content = diag::tellContent(input);
     if (input.failure()) return fail(*input.failure());

@@ -15,6 +15,8 @@ struct ImportOptions {
   std::optional<std::uint32_t> sim;
   /// A table of what the capture holds, instead of its events.
   bool countsOnly = false;
+  /// A table of what can be read, and nothing is imported.
+  bool layoutsOnly = false;
 };
 
 /// Writes the events of a capture of a modem's diagnostic port to standard output, as a recording. What cannot be read

@@ -33,6 +33,22 @@ void writeCode(DataOutput& output, const diag::CodeTally& row) {
            kind == nullptr ? "not known" : std::string(kind->name), row.tally);
 }
 
+std::string textOf(const diag::Version& version) {
+  if (!version.number) return "all";
+  std::string text = std::to_string(*version.number);
+  if (version.subpacket)
+    text += ':' + std::to_string(version.subpacket->id) + '/' + std::to_string(version.subpacket->version);
+  return text;
+}
+
+std::string versionsOf(const diag::LogKind& kind, diag::Proof proof) {
+  std::string text;
+  for (const diag::Version& version : kind.versions()) {
+    if (version.proof == proof) text += (text.empty() ? "" : ",") + textOf(version);
+  }
+  return text.empty() ? kNone : text;
+}
+
 struct OtherKind {
   diag::PacketKind kind;
   const char* name;
@@ -58,6 +74,18 @@ void writePacketTable(DataOutput& output, const diag::PacketCounts& counts) {
   writeRow(output, "packets that are none",
            {.read = 0, .passedOver = 0, .damaged = counts.of(diag::PacketKind::damaged)});
   writeRow(output, "frames", {.read = 0, .passedOver = 0, .damaged = counts.damagedFrames()});
+}
+
+void writeLayoutTable(DataOutput& output) {
+  output.writeLine(
+      "code  name                                    proven                   by samples       by the book");
+  for (const diag::LogKind& kind : diag::logKinds()) {
+    char line[200];
+    std::snprintf(line, sizeof line, "%04X  %-38s  %-23s  %-15s  %s", kind.code, std::string(kind.name).c_str(),
+                  versionsOf(kind, diag::Proof::checked).c_str(), versionsOf(kind, diag::Proof::sample).c_str(),
+                  versionsOf(kind, diag::Proof::byTheBook).c_str());
+    output.writeLine(line);
+  }
 }
 
 }  // namespace vesk

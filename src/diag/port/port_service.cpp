@@ -69,8 +69,12 @@ void PortService::run(const std::stop_token& stop, EventStream& events) {
   if (!port_.isTerminal()) tell(port_.path() + " is no terminal, and used without terminal settings", events);
   nextLogOfState_ = clock_.now() + kBetweenLogsOfState;
   for (;;) {
-    const Ending ending = port_.isOpen() ? watch(stop, events) : Ending::portGone;
+    Ending ending = port_.isOpen() ? watch(stop, events) : Ending::portGone;
     if (ending == Ending::stopped) break;
+    if (ending == Ending::portGone && !hasWatched_) {
+      failure_ = port_.path() + ": it ended without an answer: not a diagnostic port, or just unplugged";
+      ending = Ending::failed;
+    }
     if (ending == Ending::failed && !hasWatched_) {
       if (onEnd_) events.afterDelivery([end = onEnd_, failure = failure_] { end(failure); });
       break;
@@ -118,6 +122,8 @@ bool PortService::sendAndTell(Session& session, EventStream& events) {
   for (const std::string& remark : session.takeRemarks())
     tell(port_.path() + ": " + remark, events);
   if (session.phase() == Session::Phase::watching) {
+    if (state().phase == PortState::Phase::starting)
+      SystemLog::write("%s: watching the logs of firmware %s", port_.path().c_str(), session.firmware().c_str());
     hasWatched_ = true;
     note(session.isSilent() ? PortState::Phase::silent : PortState::Phase::watching);
   }
