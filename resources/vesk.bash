@@ -79,13 +79,13 @@ _vesk_files() {
 
 _vesk() {
   local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
-  local command='' word skip='' arguments=() options='--replay --headless --speed --seed --loop --seconds --log --version'
+  local command='' word skip='' arguments=() options='--diag --sim --replay --record --headless --speed --seed --loop --seconds --log --version'
   COMPREPLY=()
 
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
     if [[ -n $skip ]]; then
       skip=''
-    elif [[ $word == --@(replay|speed|seed|seconds|log) ]]; then
+    elif [[ $word == --@(diag|sim|replay|record|speed|seed|seconds|log) ]]; then
       skip=1
     elif [[ $word != -?* && -z $command ]]; then
       command=$word
@@ -95,25 +95,27 @@ _vesk() {
   done
 
   case $previous in
-    --replay) _vesk_files && return ;;
+    --replay | --record) _vesk_files && return ;;
+    --diag) mapfile -t COMPREPLY < <(compgen -G "${cur:-/dev/}*") && return ;;
     --speed) _vesk_offer < <(printf '%s\n' 1 2 5 10 max) && return ;;
     --log)
       _vesk_files
       _vesk_offer < <(printf '%s\n' syslog stderr none)
       return
       ;;
-    --seed | --seconds) return ;;
+    --seed | --seconds | --sim) return ;;
   esac
 
   case $command in
     decode | stores) options='--log' ;;
     show) options='--json --log' ;;
     simulate) options='--seed --seconds --log' ;;
+    import) options='--sim --count --layouts --log' ;;
   esac
   if [[ $cur == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
   elif [[ -z $command ]]; then
-    mapfile -t COMPREPLY < <(compgen -W 'decode stores show simulate' -- "$cur")
+    mapfile -t COMPREPLY < <(compgen -W 'decode stores show simulate import' -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
     _vesk_offer < <(printf '%s\n' 'Device Info' LTE UMTS GSM)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then
