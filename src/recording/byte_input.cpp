@@ -16,6 +16,8 @@ namespace vesk {
 namespace {
 
 constexpr std::size_t kAtOnce = std::size_t{64} << 10;
+/// The first look is a short one, which mostly suffices.
+constexpr std::size_t kFirst = std::size_t{4} << 10;
 /// What every member that gzip writes begins with.
 constexpr std::array<std::uint8_t, 3> kCompressed = {0x1F, 0x8B, 0x08};
 
@@ -142,7 +144,7 @@ std::span<const std::uint8_t> ByteInput::lookFurther() {
 void ByteInput::begin() {
   while (!hasBegun_) {
     const std::size_t before = ahead_.size();
-    ahead_.resize(before + kAtOnce);
+    ahead_.resize(before + kFirst);
     const std::size_t count = readRaw(std::span(ahead_).subspan(before)).value_or(0);
     ahead_.resize(before + count);
     if (ahead_.empty()) return;

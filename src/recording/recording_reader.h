@@ -32,18 +32,20 @@ class RecordingReader {
   explicit RecordingReader(const std::string& path);
   /// Over an open descriptor, called `name` in messages.
   RecordingReader(FileDescriptor descriptor, std::string name, std::size_t longestLine = LineReader::kLongestLine);
+  /// Reads on in `input`.
+  explicit RecordingReader(ByteInput input, std::size_t longestLine = LineReader::kLongestLine);
 
-  /// See LineReader::BeforeRead: the place to write out what is buffered, or to wait with a way out.
-  void setBeforeRead(LineReader::BeforeRead beforeRead) { lines_.setBeforeRead(std::move(beforeRead)); }
+  /// See ByteInput::BeforeRead: the place to write out what is buffered, or to wait with a way out.
+  void setBeforeRead(ByteInput::BeforeRead beforeRead) { lines_.input().setBeforeRead(std::move(beforeRead)); }
 
   /// The next event, whose payload is valid until the next call, or what stands in its place. Blank lines are
   /// passed over. Nothing follows a failure; after the end of a file, what was appended to it since follows.
   [[nodiscard]] Step next();
 
   /// Why nothing can be read (any more).
-  [[nodiscard]] const std::optional<std::string>& failure() const { return failure_; }
+  [[nodiscard]] const std::optional<std::string>& failure() const { return lines_.input().failure(); }
   /// As shown to people: the path, or "standard input".
-  [[nodiscard]] const std::string& name() const { return name_; }
+  [[nodiscard]] const std::string& name() const { return lines_.input().name(); }
   /// The number of the last line that next() looked at, from 1.
   [[nodiscard]] std::size_t lineNumber() const { return lines_.lineNumber(); }
 
@@ -55,8 +57,6 @@ class RecordingReader {
  private:
   [[nodiscard]] BadLine badLine(std::string_view reason) const;
 
-  std::string name_;
-  std::optional<std::string> failure_;
   LineReader lines_;
   RecordedEventParser parser_;
 };
