@@ -10,6 +10,7 @@
 #include "diag/port/port_service.h"
 #include "handset/handset_service.h"
 #include "recording/record_file.h"
+#include "recording/recording_reader.h"
 #include "system/main_queue.h"
 
 namespace vesk {
@@ -78,7 +79,7 @@ diag::PortService::FrameHandler keepFrames(std::shared_ptr<RecordFile> file,
     if (file->failure()) return;
     frame.clear();
     diag::appendFrame(frame, content);
-    if (!file->append(frame)) MainQueue::shared().async([failed, reason = *file->failure()] { failed(reason); });
+    if (!file->append(frame)) MainQueue::shared().post([failed, reason = *file->failure()] { failed(reason); });
   };
 }
 
@@ -103,8 +104,8 @@ EventSource makeSimulatedSource(const SourceOptions& options, const Clock& clock
 }
 
 EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
-  RecordingReader recording(*options.replay);
-  const std::optional<std::string> failure = recording.failure();
+  auto recording = std::make_unique<RecordingReader>(*options.replay);
+  const std::optional<std::string> failure = recording->failure();
   auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));
   service->setEndHandler(std::move(handlers.ended));

@@ -9,6 +9,7 @@
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
+#include "recording/recording_reader.h"
 #include "system/clock.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
@@ -42,13 +43,14 @@ Outcome playRecording(const std::optional<std::string>& path,
   };
   std::shared_ptr<corvik::RecordedService> service;
   if (path) {
-    RecordingReader recording(*path);
-    if (recording.failure()) {
-      fail("vesk: " + *recording.failure());
+    auto recording = std::make_unique<RecordingReader>(*path);
+    if (recording->failure()) {
+      fail("vesk: " + *recording->failure());
       return outcome;
     }
-    const corvik::Playback playback{.speed = std::nullopt, .isOnMainThread = true};
-    service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, playback);
+    service =
+        std::make_shared<corvik::RecordedService>(std::move(recording), clock, corvik::Playback{.speed = std::nullopt},
+                                                  corvik::RecordedService::Runs::onMainThread);
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
       if (failure) fail("vesk: " + *failure);

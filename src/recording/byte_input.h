@@ -2,13 +2,13 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <functional>
 #include <memory>
 #include <optional>
 #include <span>
 #include <string>
 #include <vector>
 
+#include "recording/timed_events.h"
 #include "system/file_descriptor.h"
 
 namespace vesk {
@@ -16,9 +16,6 @@ namespace vesk {
 /// The bytes of a file or pipe, as they come; unpacked where they are compressed with gzip, in one member or several.
 class ByteInput {
  public:
-  /// Called before every read(2), which may block. False ends the reading as if the input had ended.
-  using BeforeRead = std::function<bool(int descriptor)>;
-
   /// Over the file at `path`; "-" is standard input. One that cannot be opened shows in failure().
   explicit ByteInput(const std::string& path);
   /// Over an open descriptor, called `name` in messages.
@@ -27,7 +24,7 @@ class ByteInput {
   ByteInput& operator=(ByteInput&& other) noexcept;
   ~ByteInput();
 
-  void setBeforeRead(BeforeRead beforeRead) { beforeRead_ = std::move(beforeRead); }
+  void setBeforeRead(TimedEvents::BeforeRead beforeRead) { beforeRead_ = std::move(beforeRead); }
 
   /// Puts at least one byte into `place` and returns how many; 0 at the end, behind which what was appended to a file
   /// since follows, and after a failure.
@@ -58,7 +55,7 @@ class ByteInput {
   FileDescriptor descriptor_;
   std::string name_;
   std::optional<std::string> failure_;
-  BeforeRead beforeRead_;
+  TimedEvents::BeforeRead beforeRead_;
   /// What was looked at and not taken yet.
   std::vector<std::uint8_t> ahead_;
   std::size_t taken_ = 0;

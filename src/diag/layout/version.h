@@ -9,7 +9,7 @@
 namespace vesk::diag {
 
 /// How far a layout is known to be true.
-enum class Proof {
+enum class Proof : std::uint8_t {
   /// By many packets of real captures.
   checked,
   /// By the few packets that were at hand.

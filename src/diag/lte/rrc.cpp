@@ -24,10 +24,11 @@ struct Layout {
   std::uint8_t version;
   Proof proof;
   Field pci;
-  /// Which channel the message went over, and the number that means DL-CCCH.
+  /// Which channel the message went over.
   Field channel;
-  std::uint8_t firstChannel;
   Field length;
+  /// The number of DL-CCCH.
+  std::uint8_t firstChannel;
   std::uint8_t message;
   /// Which part of a message this is.
   std::optional<Field> segment = {};
@@ -35,29 +36,29 @@ struct Layout {
 
 // clang-format off
 constexpr Layout kLayouts[] = {
-    //              PCI   channel, DL-CCCH  length  message
-    {2,  byTheBook, h(4), b(10),  5,        h(11),  13},
-    {3,  byTheBook, h(4), b(10),  5,        h(11),  13},
-    {4,  byTheBook, h(4), b(10),  5,        h(11),  13},
-    {6,  byTheBook, h(4), b(10),  5,        h(15),  17},
-    {7,  byTheBook, h(4), b(10),  5,        h(15),  17},
-    {8,  checked,   h(4), b(12),  5,        h(17),  19},
-    {9,  checked,   h(4), b(12), 12,        h(17),  19},
-    {12, byTheBook, h(4), b(12), 12,        h(17),  19},
-    {13, byTheBook, h(4), b(12),  5,        h(17),  19},
-    {14, byTheBook, h(4), b(12),  6,        h(17),  19},
-    {15, checked,   h(4), b(12),  6,        h(17),  19},
-    {16, byTheBook, h(4), b(12),  6,        h(17),  19},
-    {19, byTheBook, h(4), b(12),  8,        h(17),  19},
-    {20, checked,   h(4), b(12),  6,        h(17),  19},
-    {22, byTheBook, h(4), b(12),  5,        h(17),  19},
-    {24, byTheBook, h(4), b(12),  6,        h(17),  19},
-    {25, byTheBook, h(6), b(14),  6,        h(19),  21},
-    {26, checked,   h(6), b(14),  8,        h(19),  21},
-    {27, byTheBook, h(6), b(14),  8,        h(19),  21},
-    {29, byTheBook, h(6), b(14),  8,        h(19),  21},
-    {30, byTheBook, h(6), b(14),  8,        h(19),  24, b(23)},
-    {31, byTheBook, h(6), b(14),  8,        h(19),  24, b(23)},
+    //              PCI   channel length  DL-CCCH message
+    {2,  byTheBook, h(4), b(10),  h(11),   5,     13},
+    {3,  byTheBook, h(4), b(10),  h(11),   5,     13},
+    {4,  byTheBook, h(4), b(10),  h(11),   5,     13},
+    {6,  byTheBook, h(4), b(10),  h(15),   5,     17},
+    {7,  byTheBook, h(4), b(10),  h(15),   5,     17},
+    {8,  checked,   h(4), b(12),  h(17),   5,     19},
+    {9,  checked,   h(4), b(12),  h(17),  12,     19},
+    {12, byTheBook, h(4), b(12),  h(17),  12,     19},
+    {13, byTheBook, h(4), b(12),  h(17),   5,     19},
+    {14, byTheBook, h(4), b(12),  h(17),   6,     19},
+    {15, checked,   h(4), b(12),  h(17),   6,     19},
+    {16, byTheBook, h(4), b(12),  h(17),   6,     19},
+    {19, byTheBook, h(4), b(12),  h(17),   8,     19},
+    {20, checked,   h(4), b(12),  h(17),   6,     19},
+    {22, byTheBook, h(4), b(12),  h(17),   5,     19},
+    {24, byTheBook, h(4), b(12),  h(17),   6,     19},
+    {25, byTheBook, h(6), b(14),  h(19),   6,     21},
+    {26, checked,   h(6), b(14),  h(19),   8,     21},
+    {27, byTheBook, h(6), b(14),  h(19),   8,     21},
+    {29, byTheBook, h(6), b(14),  h(19),   8,     21},
+    {30, byTheBook, h(6), b(14),  h(19),   8,     24, b(23)},
+    {31, byTheBook, h(6), b(14),  h(19),   8,     24, b(23)},
 };
 // clang-format on
 constexpr auto kVersions = versionsOf(kLayouts);
