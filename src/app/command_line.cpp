@@ -164,15 +164,14 @@ class CommandLine {
  private:
   void addRunOptions() {
     CLI::Option* replay =
-        program_.add_option("--replay", run_.source.replay, "Feed it a recording, not simulated events; - is stdin")
+        program_.add_option("--replay", run_.source.replay, "Feed it a recording or a capture; - is stdin")
             ->type_name("FILE");
     CLI::Option* port = program_.add_option("--diag", run_.source.port, "Feed it a modem's diagnostic port")
                             ->type_name("PORT")
                             ->excludes(replay);
-    program_.add_option("--sim", run_.source.sim, "Take the packets of one of the modem's SIMs only, from 1")
+    program_.add_option("--sim", run_.source.sim, "Take one SIM's packets only, from 1: of a port or a capture")
         ->type_name("N")
-        ->check(CLI::PositiveNumber.description(""))
-        ->needs(port);
+        ->check(CLI::PositiveNumber.description(""));
     program_.add_option("--record", run_.source.record, "Keep what comes: of a port the capture, else a recording")
         ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
@@ -192,6 +191,8 @@ class CommandLine {
         ->check(CLI::NonNegativeNumber.description(""))
         ->excludes(replay)
         ->excludes(port);
+    program_.add_flag("--real-pauses", run_.source.playback.keepsPauses, "Do not shorten pauses of more than a minute")
+        ->needs(replay);
     program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
     program_
         .add_option_function<double>(

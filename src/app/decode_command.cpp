@@ -1,10 +1,11 @@
 #include "app/decode_command.h"
 
 #include <optional>
-#include <unistd.h>
+#include <string>
 #include <variant>
 
 #include "app/data_output.h"
+#include "app/events_input.h"
 #include "app/progress.h"
 #include "app/recording_hint.h"
 #include "messages/registry/metric_classes.h"
@@ -40,18 +41,29 @@ void appendDecodedEvent(std::string& out, const RecordedEvent& event) {
 /// Decodes a recording step by step; each step answers whether to go on.
 class Decoding {
  public:
-  explicit Decoding(const std::string& path) : path_(path), reader_(path) {
-    reader_.setBeforeRead([this](int) {
+  explicit Decoding(const std::string& path) : path_(path), input_(path, std::nullopt) {
+    input_.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();
     });
   }
 
   Outcome run() {
-    while (!output_.hasFailed() && std::visit(*this, reader_.next())) {
+    if (const std::optional<std::string> failure = input_.open()) {
+      fail("vesk: " + *failure);
+      return output_.finish(outcome_);
+    }
+    if (progress_.isPossible()) duration_ = input_.duration();
+    // A reader that is known is called directly.
+    if (RecordingReader* recording = input_.recording()) {
+      decode(*recording);
+    } else {
+      decode(input_);
     }
     progress_.hide();
     if (events_ == 0 && hasBadLines_) tellIsNoRecording(path_);
+    for (const std::string& remark : input_.remarks())
+      tellUser(remark);
     return output_.finish(outcome_);
   }
 
@@ -80,6 +92,12 @@ class Decoding {
  private:
   static constexpr std::uint64_t kEventsToProgress = 4096;
 
+  template <class Events>
+  void decode(Events& events) {
+    while (!output_.hasFailed() && std::visit(*this, events.next())) {
+    }
+  }
+
   void fail(const std::string& reason) {
     progress_.hide();
     tellUser(reason);
@@ -87,10 +105,10 @@ class Decoding {
   }
 
   const std::string& path_;
-  RecordingReader reader_;
+  EventsInput input_;
   DataOutput output_;
   Progress progress_{Progress::Output::meanwhile};
-  const std::optional<double> duration_ = progress_.isPossible() ? reader_.duration() : std::nullopt;
+  std::optional<double> duration_;
   std::uint64_t events_ = 0;
   bool hasBadLines_ = false;
   std::string line_;

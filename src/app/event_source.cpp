@@ -5,12 +5,12 @@
 #include <cstdio>
 #include <utility>
 
+#include "app/events_input.h"
 #include "app/recording_service.h"
 #include "diag/framing/frame.h"
 #include "diag/port/port_service.h"
 #include "handset/handset_service.h"
 #include "recording/record_file.h"
-#include "recording/recording_reader.h"
 #include "system/main_queue.h"
 
 namespace vesk {
@@ -29,7 +29,7 @@ std::string playingTime(double seconds) {
   return text;
 }
 
-ShownState shown(const corvik::PlaybackState& state) {
+ShownState shown(const corvik::PlaybackState& state, bool isLive) {
   using Phase = corvik::PlaybackState::Phase;
   switch (state.phase) {
     case Phase::notStarted:
@@ -40,9 +40,12 @@ ShownState shown(const corvik::PlaybackState& state) {
     case Phase::playing:
       break;
   }
-  // A pipe has no length, and is as good as live.
-  if (!state.duration) return {"live"};
-  return {"replaying " + playingTime(state.position) + " of " + playingTime(*state.duration), true};
+  // A pipe is as good as live.
+  if (isLive) return {"live"};
+  std::string text = "replaying " + playingTime(state.position);
+  if (state.duration) text += " of " + playingTime(*state.duration);
+  if (state.shortenedPause) text += ", shortening a pause of " + playingTime(*state.shortenedPause);
+  return {text, true};
 }
 
 /// "ttyUSB0: 23 packets/s, 2 damaged", and what else has gone wrong.
@@ -104,13 +107,23 @@ EventSource makeSimulatedSource(const SourceOptions& options, const Clock& clock
 }
 
 EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
-  auto recording = std::make_unique<RecordingReader>(*options.replay);
-  const std::optional<std::string> failure = recording->failure();
-  auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
+  auto opened = std::make_unique<EventsInput>(*options.replay, options.sim);
+  const EventsInput& input = *opened;
+  // What a pipe holds is waited for where it is played.
+  if (!input.isLive()) {
+    if (const auto failure = opened->open()) return {nullptr, nullptr, failure};
+    opened->measure();
+  }
+  auto service = std::make_shared<corvik::RecordedService>(std::move(opened), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));
-  service->setEndHandler(std::move(handlers.ended));
+  service->setEndHandler([&input, tell = std::move(handlers.remark),
+                          ended = std::move(handlers.ended)](const std::optional<std::string>& failure) {
+    for (const std::string& remark : input.remarks())
+      tell(remark);
+    ended(failure);
+  });
   corvik::RecordedService& recorded = *service;
-  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure,
+  return {std::move(service), [&recorded, &input] { return shown(recorded.state(), input.isLive()); }, std::nullopt,
           [&recorded] { return recorded.state().position; }};
 }
 

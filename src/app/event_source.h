@@ -14,11 +14,11 @@ namespace vesk {
 
 /// Which events the program is fed with.
 struct SourceOptions {
-  /// A recording; "-" is standard input.
+  /// A recording or a capture; "-" is standard input.
   std::optional<std::string> replay;
   /// A modem's diagnostic port. Without one and without a recording a simulated handset is driven.
   std::optional<std::string> port;
-  /// Which SIM of the modem; absent for all.
+  /// Which SIM of a port or a capture; absent for all.
   std::optional<std::uint32_t> sim;
   /// Where what comes is kept: of a port the capture, of anything else a recording. Absent for nowhere.
   std::optional<std::string> record;

@@ -1,6 +1,7 @@
 #include "app/import_command.h"
 
 #include <utility>
+#include <variant>
 
 #include "app/data_output.h"
 #include "app/packet_table.h"
@@ -9,6 +10,7 @@
 #include "diag/capture/capture_remarks.h"
 #include "diag/capture/content.h"
 #include "recording/byte_input.h"
+#include "recording/recorded_event.h"
 
 namespace vesk {
 
@@ -31,9 +33,8 @@ const char* whyNotImported(Content content) {
     case Content::text:
       return "is text, and no capture of a diagnostic port";
     case Content::networkCapture:
-      return "is a capture of a network (pcap), and not of a diagnostic port";
     case Content::archive:
-      return "is an archive or compressed in a way that is not read: unpack it first";
+      return diag::whyUnreadable(content);
   }
   return nullptr;
 }
@@ -55,39 +56,44 @@ class Importing {
 
     const CaptureForm form = content == Content::frames ? CaptureForm::frames : CaptureForm::packetList;
     diag::CaptureReader capture(std::move(input), form, options_.sim);
-    capture.input().setBeforeRead([this](int) {
+    capture.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();
     });
-    writeEvents(capture);
+    const std::optional<std::string> failure = writeEvents(capture);
     const diag::PacketCounts& counts = capture.counts();
     const bool isCapture = content != Content::unknown || counts.logs().read > 0;
-    if (!isCapture)
-      return fail(capture.input().name() + " is no capture: it begins with neither frames nor log packets");
+    if (!isCapture) return fail(capture.name() + " is no capture: it begins with neither frames nor log packets");
     if (options_.countsOnly) writePacketTable(output_, counts);
     for (const std::string& remark : remarksOn(capture))
       tellUser(remark);
-    if (capture.input().failure()) return fail(*capture.input().failure());
+    if (failure) return fail(*failure);
     return output_.finish(Outcome::done);
   }
 
  private:
   static constexpr std::uint64_t kEventsToProgress = 4096;
 
-  void writeEvents(diag::CaptureReader& capture) {
+  /// Why the capture could not be read to its end.
+  std::optional<std::string> writeEvents(diag::CaptureReader& capture) {
     std::string line;
     std::uint64_t events = 0;
-    while (const std::optional<RecordedEvent> event = capture.next()) {
+    TimedEvents::Step step = capture.next();
+    while (const auto* event = std::get_if<RecordedEvent>(&step)) {
       if (output_.hasFailed()) break;
       // So rarely that asking the clock costs nothing.
       if (++events % kEventsToProgress == 0) progress_.show(events, 0, std::nullopt);
-      if (options_.countsOnly) continue;
-      line.clear();
-      appendRecordedEvent(line, *event);
-      line.pop_back();
-      output_.writeLine(line);
+      if (!options_.countsOnly) {
+        line.clear();
+        appendRecordedEvent(line, *event);
+        line.pop_back();
+        output_.writeLine(line);
+      }
+      step = capture.next();
     }
     progress_.hide();
+    const auto* failure = std::get_if<ReadFailure>(&step);
+    return failure == nullptr ? std::nullopt : std::optional(failure->message);
   }
 
   Outcome fail(const std::string& reason) {

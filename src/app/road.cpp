@@ -4,12 +4,12 @@
 #include <memory>
 
 #include "app/app_delegate.h"
+#include "app/events_input.h"
 #include "app/progress.h"
 #include "app/recording_hint.h"
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
-#include "recording/recording_reader.h"
 #include "system/clock.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
@@ -41,16 +41,17 @@ Outcome playRecording(const std::optional<std::string>& path,
     tellUser(reason);
     outcome = Outcome::failed;
   };
+  const EventsInput* input = nullptr;
   std::shared_ptr<corvik::RecordedService> service;
   if (path) {
-    auto recording = std::make_unique<RecordingReader>(*path);
-    if (recording->failure()) {
-      fail("vesk: " + *recording->failure());
+    auto opened = std::make_unique<EventsInput>(*path, std::nullopt);
+    if (const auto failure = opened->open()) {
+      fail("vesk: " + *failure);
       return outcome;
     }
-    service =
-        std::make_shared<corvik::RecordedService>(std::move(recording), clock, corvik::Playback{.speed = std::nullopt},
-                                                  corvik::RecordedService::Runs::onMainThread);
+    input = opened.get();
+    service = std::make_shared<corvik::RecordedService>(
+        std::move(opened), clock, corvik::Playback{.speed = std::nullopt}, corvik::RecordedService::Runs::onMainThread);
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
       if (failure) fail("vesk: " + *failure);
@@ -77,6 +78,8 @@ Outcome playRecording(const std::optional<std::string>& path,
       loop.run();
       progress.hide();
       if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*path);
+      for (const std::string& remark : input->remarks())
+        tellUser(remark);
     }
     use(root);
   });

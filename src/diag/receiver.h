@@ -24,8 +24,11 @@ class Receiver {
   std::span<const Event> take(const LogPacket& packet);
   void noteDamagedFrame() { counts_.noteDamagedFrame(); }
   void noteDamagedPacket() { counts_.note(PacketKind::damaged); }
-  /// What comes from here on has nothing to do with what came before. The counts stay.
-  void forget() { translator_.emplace(); }
+  /// Forgets all that came.
+  void startOver() {
+    translator_.emplace();
+    counts_ = {};
+  }
 
   [[nodiscard]] const PacketCounts& counts() const { return counts_; }
 

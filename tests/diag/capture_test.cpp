@@ -61,7 +61,7 @@ Import import(const std::string& bytes, std::optional<std::uint32_t> sim = std::
   const CaptureForm form = tellContent(input) == Content::frames ? CaptureForm::frames : CaptureForm::packetList;
   CaptureReader capture(std::move(input), form, sim);
   Import result;
-  while (const auto event = capture.next())
+  for (auto step = capture.next(); const auto* event = std::get_if<RecordedEvent>(&step); step = capture.next())
     result.at.push_back(event->at);
   result.remarks = remarksOn(capture);
   return result;
@@ -175,10 +175,11 @@ TEST(Capture, IsUnpackedAsFarAsItIsWhole) {
     ByteInput input(fileWith(bytes), "c");
     CaptureReader reader(std::move(input), CaptureForm::frames, std::nullopt);
     std::size_t events = 0;
-    while (reader.next())
+    auto step = reader.next();
+    for (; std::holds_alternative<RecordedEvent>(step); step = reader.next())
       ++events;
     EXPECT_GT(events, 1000U);
-    EXPECT_EQ(reader.input().failure(),
+    EXPECT_EQ(std::get<ReadFailure>(step).message,
               std::string("c: its compressed data are ") + (isCutOff ? "cut off" : "damaged"));
   }
 }
@@ -186,10 +187,12 @@ TEST(Capture, IsUnpackedAsFarAsItIsWhole) {
 TEST(Capture, BeginsAgainAfterRewinding) {
   CaptureReader reader(ByteInput(fileWith(gzipped(textOf(stateFrame(kTicks) + stateFrame(kTicks + 800)))), "c"),
                        CaptureForm::frames, std::nullopt);
+  reader.measure();
+  EXPECT_EQ(reader.duration(), 1);
   for (int lap = 0; lap < 2; ++lap) {
-    EXPECT_EQ(reader.next().value().at, 0);
-    EXPECT_EQ(reader.next().value().at, 1);
-    EXPECT_FALSE(reader.next());
+    EXPECT_EQ(std::get<RecordedEvent>(reader.next()).at, 0);
+    EXPECT_EQ(std::get<RecordedEvent>(reader.next()).at, 1);
+    EXPECT_TRUE(std::holds_alternative<EndOfRecording>(reader.next()));
     ASSERT_TRUE(reader.rewind());
   }
 }

@@ -17,11 +17,16 @@ CaptureReader::CaptureReader(ByteInput input, CaptureForm form, std::optional<st
   if (form == CaptureForm::packetList) packets_.emplace<PacketListReader>();
 }
 
-std::optional<RecordedEvent> CaptureReader::next() {
+CaptureReader::Step CaptureReader::next() {
   while (waiting_.empty()) {
     const Events events = takePacket();
-    if (!events) return std::nullopt;
-    waiting_ = *events;
+    if (events) {
+      waiting_ = *events;
+    } else if (input_.failure()) {
+      return ReadFailure{*input_.failure()};
+    } else {
+      return EndOfRecording{};
+    }
   }
   const Event& event = waiting_.front();
   waiting_ = waiting_.subspan(1);
@@ -30,12 +35,21 @@ std::optional<RecordedEvent> CaptureReader::next() {
 
 bool CaptureReader::rewind() {
   if (!input_.rewind()) return false;
-  receiver_.forget();
+  receiver_.startOver();
   std::visit([](auto& packets) { packets = {}; }, packets_);
   time_ = {};
   hasEnded_ = isCutOff_ = false;
   waiting_ = {};
   return true;
+}
+
+void CaptureReader::measure() {
+  if (!rewind()) return;
+  std::optional<double> last;
+  for (Step step = next(); std::holds_alternative<RecordedEvent>(step); step = next())
+    last = std::get<RecordedEvent>(step).at;
+  duration_ = last;
+  static_cast<void>(rewind());
 }
 
 CaptureReader::Events CaptureReader::takePacket() {

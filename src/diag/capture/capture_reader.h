@@ -4,6 +4,8 @@
 #include <cstdint>
 #include <optional>
 #include <span>
+#include <string>
+#include <utility>
 #include <variant>
 #include <vector>
 
@@ -12,7 +14,7 @@
 #include "diag/modem_clock.h"
 #include "diag/receiver.h"
 #include "recording/byte_input.h"
-#include "recording/recorded_event.h"
+#include "recording/timed_events.h"
 
 namespace vesk::diag {
 
@@ -20,25 +22,28 @@ namespace vesk::diag {
 enum class CaptureForm { frames, packetList };
 
 /// Reads a capture event by event, as the recording it becomes: a file, or a pipe while it is being written. Memory
-/// does not grow with the capture. One thread at a time.
-class CaptureReader {
+/// does not grow with the capture.
+class CaptureReader final : public TimedEvents {
  public:
   /// Reads on in `input`; `sim` is the one whose packets are wanted, absent for all.
   CaptureReader(ByteInput input, CaptureForm form, std::optional<std::uint32_t> sim);
   CaptureReader(const CaptureReader&) = delete;
   CaptureReader& operator=(const CaptureReader&) = delete;
 
-  /// The next event, whose payload is valid until the next call; absent at the end, and when the input cannot be read
-  /// on: see input(). What is damaged is passed over, and counted.
-  [[nodiscard]] std::optional<RecordedEvent> next();
+  void setBeforeRead(BeforeRead beforeRead) override { input_.setBeforeRead(std::move(beforeRead)); }
+  /// What is damaged is passed over, and counted.
+  [[nodiscard]] Step next() override;
+  [[nodiscard]] bool rewind() override;
+  /// Absent until it was measured.
+  [[nodiscard]] std::optional<double> duration() const override { return duration_; }
+
+  /// Reads all of it to learn how long it takes, where there is a way back.
+  void measure();
 
   [[nodiscard]] const PacketCounts& counts() const { return receiver_.counts(); }
   /// Whether the capture ends within a packet, as where the program that wrote it was ended.
   [[nodiscard]] bool isCutOff() const { return isCutOff_; }
-  [[nodiscard]] const ByteInput& input() const { return input_; }
-  [[nodiscard]] ByteInput& input() { return input_; }
-  /// Back to the first event, all forgotten but the counts; false when there is no way back.
-  [[nodiscard]] bool rewind();
+  [[nodiscard]] const std::string& name() const { return input_.name(); }
 
  private:
   using Events = std::optional<std::span<const Event>>;
@@ -56,6 +61,7 @@ class CaptureReader {
   std::vector<std::uint8_t> buffer_;
   std::variant<FrameReader, PacketListReader> packets_;
   RecordingTime time_;
+  std::optional<double> duration_;
   bool hasEnded_ = false;
   bool isCutOff_ = false;
   /// Of the packet that was taken last.

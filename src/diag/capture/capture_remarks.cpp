@@ -64,7 +64,7 @@ Remark onNothingRead(const CaptureReader& capture) {
 std::vector<std::string> remarksOn(const CaptureReader& capture) {
   std::vector<std::string> remarks;
   for (const auto remarkOn : {onEnd, onDamage, onEncryption, onSims, onClock, onNothingRead}) {
-    if (const Remark remark = remarkOn(capture)) remarks.push_back(capture.input().name() + ": " + *remark);
+    if (const Remark remark = remarkOn(capture)) remarks.push_back(capture.name() + ": " + *remark);
   }
   return remarks;
 }

@@ -113,4 +113,21 @@ Content tellContent(ByteInput& input) {
   }
 }
 
+const char* whyUnreadable(Content content) {
+  switch (content) {
+    case Content::networkCapture:
+      return "is a capture of a network (pcap), and not of a diagnostic port";
+    case Content::archive:
+      return "is an archive or compressed in a way that is not read: unpack it first";
+    case Content::nothing:
+    case Content::frames:
+    case Content::packetList:
+    case Content::recording:
+    case Content::text:
+    case Content::unknown:
+      return nullptr;
+  }
+  return nullptr;
+}
+
 }  // namespace vesk::diag

@@ -25,4 +25,8 @@ enum class Content {
 /// pipe is waited for. Frames are found also behind what is none, as where a capture begins within one.
 [[nodiscard]] Content tellContent(ByteInput& input);
 
+/// What a file is that holds neither a capture nor a recording, and what to do: "is an archive, …". Null for one that
+/// may.
+[[nodiscard]] const char* whyUnreadable(Content content);
+
 }  // namespace vesk::diag
