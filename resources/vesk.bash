@@ -42,7 +42,7 @@ _vesk_files() {
 
 _vesk() {
   local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
-  local command='' word skip='' arguments=() options='--diag --sim --replay --record --headless --speed --seed --loop --seconds --log --version'
+  local command='' word skip='' arguments=() options='--diag --sim --replay --record --real-pauses --headless --speed --seed --loop --seconds --log --version'
   COMPREPLY=()
 
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
