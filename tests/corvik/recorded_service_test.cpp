@@ -153,6 +153,9 @@ TEST_F(RecordedServiceTest, ShortensPausesOfMoreThanAMinuteUnlessTheyAreKept) {
     EXPECT_EQ(service_->state().shortenedPause, keepsPauses ? std::nullopt : std::optional(61.0));
     EXPECT_EQ(next(1), Ids{3});
     EXPECT_EQ(service_->state().shortenedPause, std::nullopt);
+    while (!isEnded_)
+      loop_.run();
+    isEnded_ = false;
   }
 }
 
