@@ -23,7 +23,7 @@ constexpr std::uint16_t shifted(std::uint16_t checksum) {
 constexpr Tables makeTables() {
   Tables tables{};
   for (std::size_t byte = 0; byte < 256; ++byte) {
-    std::uint16_t effect = static_cast<std::uint16_t>(byte);
+    auto effect = static_cast<std::uint16_t>(byte);
     for (auto& table : tables)
       table[byte] = effect = shifted(effect);
   }
