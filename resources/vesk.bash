@@ -42,13 +42,13 @@ _vesk_files() {
 
 _vesk() {
   local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
-  local command='' word skip='' arguments=() options='--diag --sim --replay --record --real-pauses --headless --speed --seed --loop --seconds --log --version'
+  local command='' word skip='' arguments=() options='--diag --sim --replay --record --real-pauses --headless --speed --seed --loop --seconds --rule --rules --redact --log --version'
   COMPREPLY=()
 
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
     if [[ -n $skip ]]; then
       skip=''
-    elif [[ $word == --@(diag|sim|replay|record|speed|seed|seconds|log) ]]; then
+    elif [[ $word == --@(diag|sim|replay|record|speed|seed|seconds|log|rule|rules) ]]; then
       skip=1
     elif [[ $word != -?* && -z $command ]]; then
       command=$word
@@ -58,7 +58,7 @@ _vesk() {
   done
 
   case $previous in
-    --replay | --record) _vesk_files && return ;;
+    --replay | --record | --rules) _vesk_files && return ;;
     --diag) mapfile -t COMPREPLY < <(compgen -G "${cur:-/dev/}*") && return ;;
     --speed) _vesk_offer < <(printf '%s\n' 1 2 5 10 max) && return ;;
     --log)
@@ -66,19 +66,22 @@ _vesk() {
       _vesk_offer < <(printf '%s\n' syslog stderr none)
       return
       ;;
-    --seed | --seconds | --sim) return ;;
+    --seed | --seconds | --sim | --rule) return ;;
   esac
 
   case $command in
-    decode | stores) options='--log' ;;
-    show) options='--json --log' ;;
+    decode | stores) options='--redact --log' ;;
+    redact) options='--log' ;;
+    show | summary | readings) options='--json --redact --log' ;;
+    timeline) options='--json --rule --rules --redact --log' ;;
+    series) options='--csv --redact --log' ;;
     simulate) options='--seed --seconds --log' ;;
-    import) options='--sim --count --layouts --log' ;;
+    import) options='--sim --count --layouts --redact --log' ;;
   esac
   if [[ $cur == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
   elif [[ -z $command ]]; then
-    mapfile -t COMPREPLY < <(compgen -W 'decode stores show simulate import' -- "$cur")
+    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings redact simulate import' -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
     _vesk_offer < <(_vesk_areas)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then

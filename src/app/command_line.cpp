@@ -12,69 +12,25 @@
 #include <string>
 #include <vector>
 
+#include "app/command_examples.h"
 #include "app/data_output.h"
 #include "app/decode_command.h"
 #include "app/import_command.h"
+#include "app/readings_command.h"
+#include "app/redact_command.h"
 #include "app/run_command.h"
+#include "app/series_command.h"
 #include "app/show_command.h"
 #include "app/simulate_command.h"
 #include "app/stores_command.h"
 #include "app/suggestion.h"
+#include "app/summary_command.h"
+#include "app/timeline_command.h"
 #include "system/system_log.h"
 
 namespace vesk {
 
 namespace {
-
-constexpr const char* kExamples =
-    "Examples:\n"
-    "  vesk                                   walk the screens of a simulated drive\n"
-    "  vesk --replay drive.jsonl              the screens while a drive is replayed\n"
-    "  vesk --replay drive.jsonl --speed 10   the same, ten times as fast\n"
-    "  tail -f live.jsonl | vesk --replay -   the screens on a live pipe\n"
-    "  vesk --headless --replay drive.jsonl   the diagnostic lines, no screens\n"
-    "  vesk --diag /dev/ttyUSB0               the screens on a real modem\n"
-    "\n"
-    "A recording has one event a line:\n"
-    "  {\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"1003\"}\n"
-    "\n"
-    "Exit status: 0 done, 1 something failed, 2 wrong usage.\n"
-    "vesk SUBCOMMAND --help tells more of a subcommand.";
-
-constexpr const char* kDecodeExamples =
-    "One JSON object an event, on one line (here in two):\n"
-    "  {\"at\":12.5,\"metric\":\"0x3C4E04\",\"class\":\"KCellularLteRrcState\",\n"
-    "   \"status\":\"decoded\",\"fields\":{\"state\":\"KLTE_RRC_STATE_CONNECTED\"}}\n"
-    "The status is decoded, undecodable (the payload is damaged) or ignored (no\n"
-    "class knows the metric).\n"
-    "\n"
-    "Examples:\n"
-    "  vesk decode drive.jsonl | jq -r '.fields.state // empty'\n"
-    "  tail -f live.jsonl | vesk decode";
-
-constexpr const char* kStoresExamples =
-    "Examples:\n"
-    "  vesk stores drive.jsonl | jq .LTE.SelReselCellInfo\n"
-    "  vesk stores drive.jsonl | jq .dictionaries.myLTERRCStateDict.state";
-
-constexpr const char* kShowExamples =
-    "Examples:\n"
-    "  vesk show LTE \"Serving Cell Meas\" drive.jsonl\n"
-    "  vesk show UMTS \"Tx Power\" drive.jsonl --json | jq '.sections[].rows'";
-
-constexpr const char* kSimulateExamples =
-    "Examples:\n"
-    "  vesk simulate --seconds 600 > drive.jsonl\n"
-    "  vesk simulate --seed 7 | vesk show LTE \"RRC State\" -";
-
-constexpr const char* kImportExamples =
-    "A capture is what a program kept of a modem's diagnostic port: QMDL, .mi2log or\n"
-    "DLF, told by its content, also compressed with gzip. It becomes a recording.\n"
-    "\n"
-    "Examples:\n"
-    "  vesk import drive.qmdl > drive.jsonl\n"
-    "  vesk import --count drive.qmdl         what it holds, and what is read of it\n"
-    "  vesk import drive.qmdl | vesk show LTE \"RRC State\" -";
 
 /// So narrow that the descriptions beside the options end before column 80.
 constexpr std::size_t kOptionColumn = 20;
@@ -138,6 +94,11 @@ class CommandLine {
     addDecode();
     addStores();
     addShow();
+    addSummary();
+    addTimeline();
+    addSeries();
+    addReadings();
+    addRedact();
     addSimulate();
     addImport();
   }
@@ -172,8 +133,9 @@ class CommandLine {
     program_.add_option("--sim", run_.source.sim, "Take one SIM's packets only, from 1: of a port or a capture")
         ->type_name("N")
         ->check(CLI::PositiveNumber.description(""));
-    program_.add_option("--record", run_.source.record, "Keep what comes: of a port the capture, else a recording")
-        ->type_name("FILE");
+    CLI::Option* record =
+        program_.add_option("--record", run_.source.record, "Keep what comes: of a port the capture, else a recording")
+            ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
     program_
         .add_option_function<std::string>(
@@ -194,6 +156,10 @@ class CommandLine {
     program_.add_flag("--real-pauses", run_.source.playback.keepsPauses, "Do not shorten pauses of more than a minute")
         ->needs(replay);
     program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
+    addRedactOption(program_, run_.isRedacted);
+    // What is kept is what came, identities included.
+    program_.get_option("--redact")->excludes(record);
+    addRuleOptions(program_, run_.rules);
     program_
         .add_option_function<double>(
             "--seconds",
@@ -212,18 +178,18 @@ class CommandLine {
 
   void addDecode() {
     CLI::App* decode = program_.add_subcommand("decode", "Print the events of a recording, one JSON line each");
-    addRecording(*decode, recording_, "The recording; - or nothing for standard input");
+    addRecording(*decode, input_);
     addLogOption(*decode, kDataLog);
     decode->footer(kDecodeExamples);
-    decode->final_callback([this] { command_ = [this] { return runDecode(recording_.value_or("-")); }; });
+    decode->final_callback([this] { command_ = [this] { return runDecode(input_); }; });
   }
 
   void addStores() {
     CLI::App* stores = program_.add_subcommand("stores", "Print what the stores hold at the end of a recording");
-    addRecording(*stores, recording_, "The recording; - or nothing for standard input");
+    addRecording(*stores, input_);
     addLogOption(*stores, kDataLog);
     stores->footer(kStoresExamples);
-    stores->final_callback([this] { command_ = [this] { return runStores(recording_.value_or("-")); }; });
+    stores->final_callback([this] { command_ = [this] { return runStores(input_); }; });
   }
 
   void addShow() {
@@ -232,11 +198,56 @@ class CommandLine {
     show->add_option("CATEGORY", show_.category, "A line of the area's screen, as \"Tx Power\"")
         ->required()
         ->type_name("");
-    addRecording(*show, show_.path, "The recording; - is standard input, nothing: no events yet");
+    addRecordingIfAny(*show, show_.input);
     show->add_flag("--json", show_.asJson, "Print JSON");
     addLogOption(*show, kDataLog);
     show->footer(kShowExamples);
     show->final_callback([this] { command_ = [this] { return runShow(show_); }; });
+  }
+
+  void addSummary() {
+    CLI::App* summary = program_.add_subcommand("summary", "Print what a whole drive was, on 24 lines");
+    addRecording(*summary, input_);
+    summary->add_flag("--json", asJson_, "Print one JSON object");
+    addLogOption(*summary, kDataLog);
+    summary->footer(kSummaryExamples);
+    summary->final_callback([this] { command_ = [this] { return runSummary(input_, asJson_); }; });
+  }
+
+  void addTimeline() {
+    CLI::App* timeline = program_.add_subcommand("timeline", "Print what happened on a drive, one line an event");
+    addRecording(*timeline, timeline_.input);
+    timeline->add_flag("--json", timeline_.asJson, "Print JSON, one object a line");
+    addRuleOptions(*timeline, timeline_.rules);
+    addLogOption(*timeline, kDataLog);
+    timeline->footer(kTimelineExamples);
+    timeline->final_callback([this] { command_ = [this] { return runTimeline(timeline_); }; });
+  }
+
+  void addSeries() {
+    CLI::App* series = program_.add_subcommand("series", "Print the course of a drive's levels and powers");
+    addRecording(*series, input_);
+    series->add_flag("--csv", asCsv_, "Print CSV, with a header");
+    addLogOption(*series, kDataLog);
+    series->footer(kSeriesExamples);
+    series->final_callback([this] { command_ = [this] { return runSeries(input_, asCsv_); }; });
+  }
+
+  void addReadings() {
+    CLI::App* readings = program_.add_subcommand("readings", "Print what the values on the screens mean");
+    addRecording(*readings, input_);
+    readings->add_flag("--json", asJson_, "Print one JSON object");
+    addLogOption(*readings, kDataLog);
+    readings->footer(kReadingsExamples);
+    readings->final_callback([this] { command_ = [this] { return runReadings(input_, asJson_); }; });
+  }
+
+  void addRedact() {
+    CLI::App* redact = program_.add_subcommand("redact", "Print a recording without the subscriber's identities");
+    addFile(*redact, input_, "The recording; - or nothing for standard input");
+    addLogOption(*redact, kDataLog);
+    redact->footer(kRedactExamples);
+    redact->final_callback([this] { command_ = [this] { return runRedact(input_); }; });
   }
 
   void addSimulate() {
@@ -256,7 +267,9 @@ class CommandLine {
 
   void addImport() {
     CLI::App* command = program_.add_subcommand("import", "Print a capture of a diagnostic port as a recording");
-    addRecording(*command, import_.path, "The capture; - or nothing for standard input");
+    import_.input.path = "-";
+    addFile(*command, import_.input, "The capture; - or nothing for standard input");
+    addRedactOption(*command, import_.input.isRedacted);
     command->add_option("--sim", import_.sim, "Take the packets of one SIM only, from 1")
         ->type_name("N")
         ->check(CLI::PositiveNumber.description(""));
@@ -320,8 +333,32 @@ class CommandLine {
     return "no subcommand " + word + suggestionFor(word, names);
   }
 
-  static void addRecording(CLI::App& command, std::optional<std::string>& path, const std::string& description) {
-    command.add_option("FILE", path, description)->type_name("");
+  /// Standard input where no file is named.
+  static void addRecording(CLI::App& command, RecordingInput& input) {
+    input.path = "-";
+    addFile(command, input, "The recording; - or nothing for standard input");
+    addRedactOption(command, input.isRedacted);
+  }
+
+  static void addRecordingIfAny(CLI::App& command, RecordingInput& input) {
+    addFile(command, input, "The recording; - is standard input, nothing: no events yet");
+    addRedactOption(command, input.isRedacted);
+  }
+
+  static void addFile(CLI::App& command, RecordingInput& input, const std::string& description) {
+    command.add_option("FILE", input.path, description)->type_name("");
+  }
+
+  static void addRedactOption(CLI::App& command, bool& isRedacted) {
+    command.add_flag("--redact", isRedacted, "Without the subscriber's identities and addresses");
+  }
+
+  /// Each --rule takes one.
+  static void addRuleOptions(CLI::App& command, RuleInput& rules) {
+    command.add_option("--rule", rules.rules, "Tell when it fires: \"lte.rsrp < -110 for 10 s\", \"event drop\"")
+        ->type_name("RULE")
+        ->allow_extra_args(false);
+    command.add_option("--rules", rules.file, "A file of such rules, one a line")->type_name("FILE");
   }
 
   void addLogOption(CLI::App& command, const std::string& usual) {
@@ -335,7 +372,10 @@ class CommandLine {
   ShowOptions show_;
   SimulateOptions simulate_;
   ImportOptions import_;
-  std::optional<std::string> recording_;
+  RecordingInput input_;
+  TimelineOptions timeline_;
+  bool asJson_ = false;
+  bool asCsv_ = false;
   std::optional<std::string> logTo_;
   std::function<Outcome()> command_;
 };

@@ -1,11 +1,14 @@
 #include "app/import_command.h"
 
+#include <cstdint>
+#include <string>
 #include <utility>
 #include <variant>
 
 #include "app/data_output.h"
 #include "app/packet_table.h"
 #include "app/progress.h"
+#include "app/redaction.h"
 #include "diag/capture/capture_reader.h"
 #include "diag/capture/capture_remarks.h"
 #include "diag/capture/content.h"
@@ -49,7 +52,7 @@ class Importing {
       writeLayoutTable(output_);
       return output_.finish(Outcome::done);
     }
-    ByteInput input(options_.path.value_or("-"));
+    ByteInput input(options_.input.path.value_or("-"));
     const Content content = diag::tellContent(input);
     if (input.failure()) return fail(*input.failure());
     if (const char* reason = whyNotImported(content)) return fail(input.name() + ' ' + reason);
@@ -67,6 +70,7 @@ class Importing {
     if (options_.countsOnly) writePacketTable(output_, counts);
     for (const std::string& remark : remarksOn(capture))
       tellUser(remark);
+    redaction_.tellLeftOut();
     if (failure) return fail(*failure);
     return output_.finish(Outcome::done);
   }
@@ -76,7 +80,6 @@ class Importing {
 
   /// Why the capture could not be read to its end.
   std::optional<std::string> writeEvents(diag::CaptureReader& capture) {
-    std::string line;
     std::uint64_t events = 0;
     TimedEvents::Step step = capture.next();
     while (const auto* event = std::get_if<RecordedEvent>(&step)) {
@@ -84,10 +87,7 @@ class Importing {
       // So rarely that asking the clock costs nothing.
       if (++events % kEventsToProgress == 0) progress_.show(events, 0, std::nullopt);
       if (!options_.countsOnly) {
-        line.clear();
-        appendRecordedEvent(line, *event);
-        line.pop_back();
-        output_.writeLine(line);
+        write(*event);
       }
       step = capture.next();
     }
@@ -96,12 +96,26 @@ class Importing {
     return failure == nullptr ? std::nullopt : std::optional(failure->message);
   }
 
+  void write(const RecordedEvent& event) {
+    std::optional<Data> redacted;
+    if (options_.input.isRedacted) {
+      redacted = redaction_.redacted(event.metricId, event.payload);
+      if (!redacted) return;
+    }
+    line_.clear();
+    appendRecordedEvent(line_, {event.at, event.metricId, redacted ? redacted->bytes() : event.payload});
+    line_.pop_back();
+    output_.writeLine(line_);
+  }
+
   Outcome fail(const std::string& reason) {
     tellUser("vesk: " + reason);
     return output_.finish(Outcome::failed);
   }
 
   const ImportOptions& options_;
+  Redaction redaction_;
+  std::string line_;
   DataOutput output_;
   Progress progress_{Progress::Output::meanwhile};
 };

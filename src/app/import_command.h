@@ -2,15 +2,15 @@
 
 #include <cstdint>
 #include <optional>
-#include <string>
 
 #include "app/outcome.h"
+#include "app/recording_input.h"
 
 namespace vesk {
 
 struct ImportOptions {
-  /// Of the capture; absent or "-" is standard input.
-  std::optional<std::string> path;
+  /// The capture.
+  RecordingInput input;
   /// Which SIM; absent for all.
   std::optional<std::uint32_t> sim;
   /// A table of what the capture holds, instead of its events.

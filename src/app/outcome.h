@@ -9,7 +9,13 @@
 namespace vesk {
 
 /// How a command ends; the values are its exit statuses.
-enum class Outcome : int { done = 0, failed = 1, wrongUsage = 2 };
+enum class Outcome : int {
+  done = 0,
+  failed = 1,
+  wrongUsage = 2,
+  /// All went well or not: a rule fired.
+  ruleFired = 3,
+};
 
 /// Writes one line to standard error, control characters made visible. Waits for a slow reader.
 void tellUser(std::string_view line);

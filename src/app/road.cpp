@@ -7,6 +7,7 @@
 #include "app/events_input.h"
 #include "app/progress.h"
 #include "app/recording_hint.h"
+#include "app/redaction.h"
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
@@ -29,8 +30,8 @@ std::optional<std::string> whyNoMetricArrives(const NavigationController& root) 
   return "vesk: the metric configuration is missing or was refused, and no metric arrives; --log stderr tells more";
 }
 
-Outcome playRecording(const std::optional<std::string>& path,
-                      const std::function<void(NavigationController& root)>& use) {
+Outcome playRecording(const RecordingInput& input, const std::function<void(NavigationController& root)>& use,
+                      const std::function<void()>& beforePlaying) {
   OutputLines::setSink(nullptr);
   const SteadyClock clock;
   RunLoop loop(clock);
@@ -41,33 +42,41 @@ Outcome playRecording(const std::optional<std::string>& path,
     tellUser(reason);
     outcome = Outcome::failed;
   };
-  const EventsInput* input = nullptr;
+  Redaction redaction;
+  const EventsInput* events = nullptr;
   std::shared_ptr<corvik::RecordedService> service;
-  if (path) {
-    auto opened = std::make_unique<EventsInput>(*path, std::nullopt);
-    if (const auto failure = opened->open()) {
+  if (input.path) {
+    using Runs = corvik::RecordedService::Runs;
+    const bool isWatchedPipe = beforePlaying && *input.path == "-";
+    auto opened = std::make_unique<EventsInput>(*input.path, std::nullopt);
+    // What a pipe holds is waited for where it is played.
+    if (const auto failure = isWatchedPipe ? std::nullopt : opened->open()) {
       fail("vesk: " + *failure);
       return outcome;
     }
-    input = opened.get();
-    service = std::make_shared<corvik::RecordedService>(
-        std::move(opened), clock, corvik::Playback{.speed = std::nullopt}, corvik::RecordedService::Runs::onMainThread);
+    events = opened.get();
+    service =
+        std::make_shared<corvik::RecordedService>(std::move(opened), clock, corvik::Playback{.speed = std::nullopt},
+                                                  isWatchedPipe ? Runs::onThreadOfItsOwn : Runs::onMainThread);
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
       if (failure) fail("vesk: " + *failure);
       loop.stop();
     });
   }
-  corvik::installService(service);
+  const std::shared_ptr<corvik::Service> installed =
+      input.isRedacted && service != nullptr ? makeRedactedService(service, redaction) : service;
+  corvik::installService(installed);
 
   AppDelegate delegate;
   Application application(veskInterface(), delegate);
   const int status = application.run([&](NavigationController& root) {
-    if (path) {
+    if (input.path) {
       if (const auto reason = whyNoMetricArrives(root)) {
         fail(*reason);
         return;
       }
+      if (beforePlaying) beforePlaying();
       std::optional<Timer> ticker;
       if (progress.isPossible()) {
         ticker.emplace(loop, kProgressInterval, RunLoopMode::defaultMode, [&] {
@@ -77,15 +86,16 @@ Outcome playRecording(const std::optional<std::string>& path,
       }
       loop.run();
       progress.hide();
-      if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*path);
-      for (const std::string& remark : input->remarks())
+      if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*input.path);
+      for (const std::string& remark : events->remarks())
         tellUser(remark);
     }
     use(root);
   });
   if (status != 0) outcome = Outcome::failed;
   // The connection outlives all that the service was made of here.
-  if (service != nullptr) service->shutDown();
+  if (installed != nullptr) installed->shutDown();
+  redaction.tellLeftOut();
   return outcome;
 }
 

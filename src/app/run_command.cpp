@@ -3,12 +3,16 @@
 #include <memory>
 #include <string>
 #include <unistd.h>
+#include <utility>
+#include <vector>
 
 #include "app/app_delegate.h"
 #include "app/metric_arrivals.h"
+#include "app/redaction.h"
 #include "app/road.h"
 #include "app/stop_signals.h"
 #include "app/vesk_interface.h"
+#include "insight/insight.h"
 #include "intake/metric_validator.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
@@ -23,7 +27,9 @@ namespace {
 /// One run of the program, from the source of its events to what shows them.
 class Run {
  public:
-  explicit Run(const RunOptions& options) : options_(options), isHeadless_(options.isHeadless) {
+  Run(const RunOptions& options, std::vector<insight::Rule> rules)
+      : options_(options), isHeadless_(options.isHeadless), isJudging_(!rules.empty()) {
+    insight_.setRules(std::move(rules));
     if (options_.duration) end_ = clock_.now() + *options_.duration;
     boundTelling(stopSignal_, end_);
   }
@@ -37,7 +43,9 @@ class Run {
       tellUser("vesk: " + *source_.failure);
       return Outcome::failed;
     }
-    corvik::installService(source_.service);
+    const std::shared_ptr<corvik::Service> service =
+        options_.isRedacted ? makeRedactedService(source_.service, redaction_) : source_.service;
+    corvik::installService(service);
     if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
     if (isHeadless_) {
       printLines();
@@ -48,9 +56,10 @@ class Run {
     const int status = application.run([&](NavigationController& root) { mainLoop(application, root); });
     if (status != 0) outcome_ = Outcome::failed;
     // The connection outlives all that the service was made of here.
-    source_.service->shutDown();
+    service->shutDown();
+    redaction_.tellLeftOut();
     OutputLines::setSink(nullptr);
-    return outcome_;
+    return isHeadless_ && insight_.alerts() > 0 ? Outcome::ruleFired : outcome_;
   }
 
  private:
@@ -71,11 +80,22 @@ class Run {
     if (options_.duration) {
       end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
     }
+    if (isJudging_) judgeRules();
     if (!isHeadless_) openTerminal(application, root);
     const std::optional<std::string> reason = whyNoMetricArrives(root);
     if (reason) tell(*reason);
     if (!reason || !isHeadless_) loop_.run();
     closeTerminal();
+    MetricValidator::shared()->setEventObserver(nullptr);
+  }
+
+  /// Those that fire are told among the diagnostic lines.
+  void judgeRules() {
+    insight_.setStepHandler([](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
+      for (const insight::TimelineEvent& event : events)
+        if (event.kind == insight::EventKind::alert) OutputLines::print({"Alert:", textOf(event)});
+    });
+    insight_.observeEventsOf(*MetricValidator::shared());
   }
 
   void openTerminal(Application& application, NavigationController& root) {
@@ -153,6 +173,8 @@ class Run {
   const RunOptions& options_;
   const SteadyClock clock_;
   bool isHeadless_;
+  /// Whether there are rules.
+  bool isJudging_;
   /// When nobody is waited for any more; absent for never.
   std::optional<Clock::Instant> end_;
   Outcome outcome_ = Outcome::done;
@@ -161,7 +183,9 @@ class Run {
   const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
   MetricArrivals arrivals_{clock_};
+  Redaction redaction_;
   EventSource source_;
+  insight::Insight insight_;
   AppDelegate delegate_;
   std::unique_ptr<Terminal> terminal_;
 };
@@ -169,7 +193,9 @@ class Run {
 }  // namespace
 
 Outcome runProgram(const RunOptions& options) {
-  return Run(options).run();
+  auto rules = readRules(options.rules);
+  if (!rules) return Outcome::wrongUsage;
+  return Run(options, *std::move(rules)).run();
 }
 
 }  // namespace vesk

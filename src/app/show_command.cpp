@@ -179,7 +179,7 @@ void tellUnknownLabels(const ShowOptions& options) {
 Outcome runShow(const ShowOptions& options) {
   DataOutput output;
   tellUnknownLabels(options);
-  const Outcome outcome = playRecording(options.path, [&](NavigationController& root) {
+  const Outcome outcome = playRecording(options.input, [&](NavigationController& root) {
     openRow(root, options.area);
     openRow(root, options.category);
     const std::vector<ShownSection> sections = sectionsOf(topTable(root).tableView());

@@ -1,17 +1,17 @@
 #pragma once
 
-#include <optional>
 #include <string>
 
 #include "app/outcome.h"
+#include "app/recording_input.h"
 
 namespace vesk {
 
 struct ShowOptions {
   std::string area;
   std::string category;
-  /// "-" is standard input; without a recording the screen is as it is before any event.
-  std::optional<std::string> path;
+  /// Without a recording the screen is as it is before any event.
+  RecordingInput input;
   bool asJson = false;
 };
 

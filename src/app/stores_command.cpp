@@ -66,10 +66,11 @@ std::string storesAsJson(const Stores& stores) {
 
 }  // namespace
 
-Outcome runStores(const std::string& path) {
+Outcome runStores(const RecordingInput& input) {
   DataOutput output;
-  const Outcome outcome = playRecording(
-      path, [&](NavigationController& /*root*/) { output.writeLine(storesAsJson(MetricValidator::shared()->stores)); });
+  const Outcome outcome = playRecording(input, [&](NavigationController& /*root*/) {
+    output.writeLine(storesAsJson(MetricValidator::shared()->stores));
+  });
   return output.finish(outcome);
 }
 

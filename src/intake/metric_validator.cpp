@@ -32,6 +32,12 @@ void printRecord(std::string_view logText, const Dictionary& record) {
   if (OutputLines::isOpen()) OutputLines::print({logText, textOf(record)});
 }
 
+/// The record's timestamp while it is a number; absent when it is none that fits.
+std::optional<std::int64_t> millisecondsOf(const Record& record) {
+  const Value* timestamp = record.find("timestamp"_text);
+  return timestamp == nullptr ? std::nullopt : timestamp->integer();
+}
+
 }  // namespace
 
 const std::shared_ptr<MetricValidator>& MetricValidator::shared() {
@@ -61,26 +67,27 @@ void MetricValidator::eventsDidUpdate(const std::optional<Dictionary>& /*event*/
 }
 
 bool MetricValidator::validateMetric(const Dictionary& event) {
-  const Outcome outcome = take(event);
-  if (outcome == Outcome::stored) return true;
+  const TakenEvent taken = take(event);
+  if (eventObserver_) eventObserver_(taken);
+  if (taken.fate == EventFate::stored) return true;
   OutputLines::print({"I dont care for this Metric"});
   return false;
 }
 
-MetricValidator::Outcome MetricValidator::take(const Dictionary& event) {
+TakenEvent MetricValidator::take(const Dictionary& event) {
   const Value* id = event.find(metricIDKey);
   metricID = id == nullptr ? std::nullopt : id->integer();
   if (metricID && OutputLines::isOpen()) OutputLines::print({"Metric ID in Hex = ", hexadecimal(*metricID)});
 
   const HandledMetric* metric = metricID ? findHandledMetric(*metricID) : nullptr;
-  if (metric == nullptr) return Outcome::ignored;
+  if (metric == nullptr) return {.fate = EventFate::ignored, .metricId = metricID};
   std::optional<Record> record = metric->decode(payloadOf(event));
-  if (!record) return Outcome::undecodable;
-  store(*metric, std::move(*record));
-  return Outcome::stored;
+  if (!record) return {.fate = EventFate::undecodable, .metricId = metricID};
+  const auto timestamp = eventObserver_ ? millisecondsOf(*record) : std::nullopt;
+  return {EventFate::stored, metricID, timestamp, &store(*metric, std::move(*record))};
 }
 
-void MetricValidator::store(const HandledMetric& metric, Record newRecord) {
+const Record& MetricValidator::store(const HandledMetric& metric, Record newRecord) {
   Record& record = (stores.*metric.record).emplace(std::move(newRecord));
   const auto runExtraStep = [&] {
     if (metric.extraStep != nullptr) metric.extraStep({record, stores, dates_});
@@ -106,6 +113,7 @@ void MetricValidator::store(const HandledMetric& metric, Record newRecord) {
       runExtraStep();
       break;
   }
+  return record;
 }
 
 }  // namespace vesk

@@ -15,6 +15,27 @@ namespace vesk {
 
 struct HandledMetric;
 
+/// What became of a metric event.
+enum class EventFate {
+  stored,
+  /// Its metric is handled, its payload is no encoding of one.
+  undecodable,
+  /// Its metric is not handled.
+  ignored,
+};
+
+/// A metric event, told once the intake is done with it.
+struct TakenEvent {
+  EventFate fate;
+  /// Absent when the event had none.
+  std::optional<std::int64_t> metricId{};
+  /// What the record had under "timestamp" before that became a date: milliseconds since 1970-01-01 00:00:00 UTC.
+  /// Absent unless stored, and where the record has none that fits.
+  std::optional<std::int64_t> timestamp{};
+  /// The latest record of its kind; null unless stored.
+  const Record* record = nullptr;
+};
+
 /// Takes in every metric event: decodes it, keeps it as the latest record of its kind, and fills the technology
 /// stores. The one object of the process is shared(); everything happens on the main queue.
 class MetricValidator : public CorvikWrapperDelegate {
@@ -32,6 +53,9 @@ class MetricValidator : public CorvikWrapperDelegate {
     arrivalObserver_ = std::move(observer);
   }
 
+  /// `observer` is told of every metric event, stored or not; the stores are then as the event left them.
+  void setEventObserver(std::function<void(const TakenEvent&)> observer) { eventObserver_ = std::move(observer); }
+
   /// Decodes and stores the event. False, with nothing stored, for a metric that is not handled and for a payload that
   /// cannot be decoded.
   bool validateMetric(const Dictionary& event);
@@ -45,24 +69,16 @@ class MetricValidator : public CorvikWrapperDelegate {
   Stores stores;
 
  private:
-  /// What became of an event.
-  enum class Outcome {
-    stored,
-    /// Its payload is no encoding of its message.
-    undecodable,
-    /// Its metric is not handled, or it has none.
-    ignored,
-  };
-
   MetricValidator() = default;
 
-  Outcome take(const Dictionary& event);
+  TakenEvent take(const Dictionary& event);
   /// Keeps the record as the latest of its metric, and takes the metric's steps.
-  void store(const HandledMetric& metric, Record record);
+  const Record& store(const HandledMetric& metric, Record record);
 
   std::shared_ptr<CorvikWrapper> mySharedCorvikInstance;
   DateFormat dates_;
   std::function<void(std::int64_t)> arrivalObserver_;
+  std::function<void(const TakenEvent&)> eventObserver_;
 };
 
 }  // namespace vesk

@@ -4,10 +4,17 @@
 #include <array>
 
 #include "intake/metric_table.h"
+#include "messages/gsm/gsm.h"
+#include "messages/lte/lte.h"
+#include "messages/nas/nas.h"
+#include "messages/registry/metric_classes.h"
+#include "messages/wcdma/wcdma.h"
 
 namespace vesk {
 
 namespace {
+
+using namespace metrics;
 
 /// The latest record of a metric.
 template <auto record>
@@ -30,7 +37,7 @@ constexpr CategorySource record(std::string_view area, std::string_view category
 }
 
 /// A list of a technology store, with a section for each element.
-template <auto store, auto field>
+template <auto store, auto field, class Element>
 constexpr CategorySource list(std::string_view area, std::string_view category, std::string_view headerPrefix,
                               std::int64_t metric) {
   return {.area = area,
@@ -38,13 +45,14 @@ constexpr CategorySource list(std::string_view area, std::string_view category, 
           .kind = SourceKind::storeList,
           .list = [](const Stores& stores) { return stores.*store.*field; },
           .headerPrefix = headerPrefix,
+          .elementClass = Element::kClassName,
           .metric = metric};
 }
 
 /// The first element of such a list.
-template <auto store, auto field>
+template <auto store, auto field, class Element>
 constexpr CategorySource first(std::string_view area, std::string_view category, std::int64_t metric) {
-  CategorySource source = list<store, field>(area, category, {}, metric);
+  CategorySource source = list<store, field, Element>(area, category, {}, metric);
   source.kind = SourceKind::firstElement;
   return source;
 }
@@ -63,37 +71,44 @@ constexpr auto common = &Stores::myCommon;
 constexpr std::array kSources{
     placeholder("Device Info", "IMSI"),
     placeholder("Device Info", "IMEISV"),
-    list<common, &Common::simContents>("Device Info", "SIM Files", "SIM Content ", K_SIM_FILE_INFO),
+    list<common, &Common::simContents, ElementaryFile>("Device Info", "SIM Files", "SIM Content ", K_SIM_FILE_INFO),
 
     latest<&Stores::myLTEEMMContextDict>("LTE", "NAS"),
     latest<&Stores::myLTERRCStateDict>("LTE", "RRC State"),
     latest<&Stores::myLTESCellInfoDict>("LTE", "Serving Cell Info"),
-    first<lte, &LTE::RsrpRsrqSinr>("LTE", "Serving Cell Meas", K_LTE_RSRP_RSRQ_SINR),
-    list<lte, &LTE::TxPower>("LTE", "Tx Power", "TxPowerInfo ", K_LTE_TX_POWER),
+    first<lte, &LTE::RsrpRsrqSinr, RsrpRsrqSinr>("LTE", "Serving Cell Meas", K_LTE_RSRP_RSRQ_SINR),
+    list<lte, &LTE::TxPower, TxPowerInfo>("LTE", "Tx Power", "TxPowerInfo ", K_LTE_TX_POWER),
     record<lte, &LTE::SelReselCellInfo>("LTE", "Sel Resel Parameters", K_LTE_SEL_RESEL_INFO),
-    list<lte, &LTE::EutraNbrs>("LTE", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_LTE_SEL_RESEL_INFO),
+    list<lte, &LTE::EutraNbrs, NbrEutra>("LTE", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_LTE_SEL_RESEL_INFO),
     latest<&Stores::myLTECDRXConfigDict>("LTE", "C-DRX"),
-    list<lte, &LTE::EutraNbrsMeas>("LTE", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_LTE_INTRARAT_MEAS),
-    list<lte, &LTE::UtraNbrsMeas>("LTE", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_LTE_INTERRAT_MEAS),
-    list<lte, &LTE::GeraNbrsMeas>("LTE", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_LTE_INTERRAT_MEAS),
-    list<lte, &LTE::CAStatusList>("LTE", "CA Status", "Component Carrier ", K_LTE_CA_STATUS),
-    list<common, &Common::activeBearer>("LTE", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
+    list<lte, &LTE::EutraNbrsMeas, EgwErrcNbrEutraMeas>(
+        "LTE", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_LTE_INTRARAT_MEAS),
+    list<lte, &LTE::UtraNbrsMeas, EgwErrcNbrUtraMeas>(
+        "LTE", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_LTE_INTERRAT_MEAS),
+    list<lte, &LTE::GeraNbrsMeas, EgwErrcNbrGeranMeas>(
+        "LTE", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_LTE_INTERRAT_MEAS),
+    list<lte, &LTE::CAStatusList, SecondaryComponentCarrier>("LTE", "CA Status", "Component Carrier ", K_LTE_CA_STATUS),
+    list<common, &Common::activeBearer, BearerContext>("LTE", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 
     latest<&Stores::myGMMContextDict>("UMTS", "NAS GMM"),
     latest<&Stores::myMMContextDict>("UMTS", "NAS MM"),
     latest<&Stores::myUMTSRRCStateDict>("UMTS", "RRC State"),
     latest<&Stores::myUMTSRRCConfigDict>("UMTS", "RRC Configuration"),
     latest<&Stores::myUMTSCellInfoDict>("UMTS", "Serving Cell Info"),
-    list<umts, &UMTS::rXInfo>("UMTS", "Serving Cell Meas", "RxInfo ", K_UMTS_SCELL_MEAS),
-    list<umts, &UMTS::TxPower>("UMTS", "Tx Power", "TxPowerInfo ", K_UMTS_TX_POWER),
+    list<umts, &UMTS::rXInfo, RxInfo>("UMTS", "Serving Cell Meas", "RxInfo ", K_UMTS_SCELL_MEAS),
+    list<umts, &UMTS::TxPower, TxPowerInfo>("UMTS", "Tx Power", "TxPowerInfo ", K_UMTS_TX_POWER),
     record<umts, &UMTS::SelReselCellInfo>("UMTS", "Sel Resel Parameters", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::eUtraNbrs>("UMTS", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::utraNbrs>("UMTS", "UTRA Neighbor Info", "UTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::geraNbrs>("UMTS", "GSM Neighbor Info", "GSM Neighbor ", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::eUtraNbrMeas>("UMTS", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_UMTS_NCELL_MEAS),
-    list<umts, &UMTS::utraNbrMeas>("UMTS", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_UMTS_NCELL_MEAS),
-    list<umts, &UMTS::geraNbrMeas>("UMTS", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_UMTS_NCELL_MEAS),
-    list<common, &Common::activeBearer>("UMTS", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
+    list<umts, &UMTS::eUtraNbrs, EutraFreqInfo>(
+        "UMTS", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
+    list<umts, &UMTS::utraNbrs, UtraFreqInfo>("UMTS", "UTRA Neighbor Info", "UTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
+    list<umts, &UMTS::geraNbrs, GsmFreqInfo>("UMTS", "GSM Neighbor Info", "GSM Neighbor ", K_UMTS_SEL_RESEL_INFO),
+    list<umts, &UMTS::eUtraNbrMeas, LteCellMeasResult>(
+        "UMTS", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_UMTS_NCELL_MEAS),
+    list<umts, &UMTS::utraNbrMeas, UtraCellMeasResult>(
+        "UMTS", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_UMTS_NCELL_MEAS),
+    list<umts, &UMTS::geraNbrMeas, GsmCellMeasResult>(
+        "UMTS", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_UMTS_NCELL_MEAS),
+    list<common, &Common::activeBearer, BearerContext>("UMTS", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 
     latest<&Stores::myGMMContextDict>("GSM", "NAS GMM"),
     latest<&Stores::myMMContextDict>("GSM", "NAS MM"),
@@ -102,10 +117,10 @@ constexpr std::array kSources{
     latest<&Stores::myGSMIdleScellMeasDict>("GSM", "Idle Serv Cell Meas"),
     latest<&Stores::myGSMConnRfMeasDict>("GSM", "Connected Serv Cell Meas"),
     latest<&Stores::myGSMGPRSConfigDict>("GSM", "GSM GPRS Config"),
-    list<gsm, &GSM::eUtraNbrMeas>("GSM", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_GSM_NCELL_MEAS),
-    list<gsm, &GSM::utraNbrMeas>("GSM", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_GSM_NCELL_MEAS),
-    list<gsm, &GSM::geraNbrMeas>("GSM", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_GSM_NCELL_MEAS),
-    list<common, &Common::activeBearer>("GSM", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
+    list<gsm, &GSM::eUtraNbrMeas, LteNcellMeas>("GSM", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_GSM_NCELL_MEAS),
+    list<gsm, &GSM::utraNbrMeas, UmtsNcellMeas>("GSM", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_GSM_NCELL_MEAS),
+    list<gsm, &GSM::geraNbrMeas, GsmNcellMeas>("GSM", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_GSM_NCELL_MEAS),
+    list<common, &Common::activeBearer, BearerContext>("GSM", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 };
 // clang-format on
 
@@ -122,6 +137,32 @@ const CategorySource& sourceOf(std::string_view area, std::string_view category)
     return source.area == area && source.category == category;
   });
   return found == kSources.end() ? kUnknown : *found;
+}
+
+std::string_view messageClassOf(const CategorySource& source) {
+  if (!source.elementClass.empty()) return source.elementClass;
+  const MetricClass* metricClass = source.metric ? findMetricClass(*source.metric) : nullptr;
+  return metricClass == nullptr ? std::string_view{} : metricClass->name;
+}
+
+RecordList shownRecords(const CategorySource& source, const Stores& stores) {
+  RecordList records;
+  switch (source.kind) {
+    case SourceKind::metricRecord:
+      if (auto record = source.latestRecord(stores)) records.append(*std::move(record));
+      break;
+    case SourceKind::storeRecord:
+      records.append(source.storeRecord(stores));
+      break;
+    case SourceKind::storeList:
+      return source.list(stores);
+    case SourceKind::firstElement:
+      if (const RecordList list = source.list(stores); list.size() > 0) records.append(list[0]);
+      break;
+    case SourceKind::placeholder:
+      break;
+  }
+  return records;
 }
 
 }  // namespace vesk

@@ -34,6 +34,8 @@ struct CategorySource {
   RecordList (*list)(const Stores& stores) = nullptr;
   /// What stands before the number of an element in the header of its section.
   std::string_view headerPrefix{};
+  /// The message class of a list's elements.
+  std::string_view elementClass{};
   /// The metric that changes the source; absent for a placeholder.
   std::optional<std::int64_t> metric{};
 };
@@ -43,5 +45,12 @@ struct CategorySource {
 
 /// The source of a pair of labels. A pair that no menu has is a placeholder.
 [[nodiscard]] const CategorySource& sourceOf(std::string_view area, std::string_view category);
+
+/// What the source's records are decoded from: the message class of each; empty for a placeholder.
+[[nodiscard]] std::string_view messageClassOf(const CategorySource& source);
+
+/// The records that the source's screen shows, one a section; none for a placeholder, and for a kind of metric that has
+/// not come.
+[[nodiscard]] RecordList shownRecords(const CategorySource& source, const Stores& stores);
 
 }  // namespace vesk

@@ -12,7 +12,7 @@ namespace {
 template <class MetricMessage>
 constexpr MetricClass row() {
   return {kMetricId<MetricMessage>, MetricMessage::kClassName, &decodePayload<MetricMessage>,
-          &appendPayloadJson<MetricMessage>};
+          &appendPayloadJson<MetricMessage>, &decodeMessage<MetricMessage>};
 }
 
 constexpr MetricRows kMetricClasses(std::array{

@@ -1,11 +1,13 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <optional>
 #include <span>
 #include <string>
 #include <string_view>
 
+#include "messages/codec/proto_codable.h"
 #include "messages/codec/proto_reader.h"
 #include "values/value.h"
 
@@ -35,6 +37,14 @@ bool appendPayloadJson(std::string& out, std::span<const std::uint8_t> payload) 
   return true;
 }
 
+/// The message in `payload`, or null when the payload is no encoding of one.
+using DecodeMessage = std::shared_ptr<ProtoCodable> (*)(std::span<const std::uint8_t> payload);
+
+template <class MetricMessage>
+std::shared_ptr<ProtoCodable> decodeMessage(std::span<const std::uint8_t> payload) {
+  return MetricMessage::initWithData(payload);
+}
+
 /// A kind of metric and the class that decodes it.
 struct MetricClass {
   /// As an event carries it: 0x3C in the high byte, the registry's identifier in the low 16 bits.
@@ -42,6 +52,7 @@ struct MetricClass {
   std::string_view name;
   DecodePayload decode;
   AppendPayloadJson appendJson;
+  DecodeMessage decodeMessage;
 };
 
 /// The class of a metric, or null when no class decodes it.

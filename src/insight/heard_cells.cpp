@@ -1,0 +1,154 @@
+#include "insight/heard_cells.h"
+
+#include <algorithm>
+#include <array>
+#include <limits>
+#include <tuple>
+
+#include "insight/json_fields.h"
+
+namespace vesk::insight {
+
+namespace {
+
+std::optional<HeardKey> keyOf(const std::optional<ServingCell>& cell) {
+  if (!cell || (!cell->identity.channel && !cell->identity.code)) return std::nullopt;
+  return HeardKey{cell->technology, cell->identity.channel, cell->identity.code};
+}
+
+/// Unknown is weakest.
+double strengthOf(const std::optional<double>& level) {
+  return level.value_or(-std::numeric_limits<double>::infinity());
+}
+
+}  // namespace
+
+std::string_view nameOf(HeardRole role) {
+  constexpr std::array<std::string_view, 3> kNames{"serving", "secondary", "neighbour"};
+  return kNames[static_cast<std::size_t>(role)];
+}
+
+void HeardCells::take(const Report& report, const Timeline& timeline, std::int64_t now) {
+  const std::optional<HeardKey> serving = keyOf(timeline.mobility().cell());
+  if (serving != serving_) {
+    if (Row* left = serving_ ? find(*serving_, now) : nullptr) left->servedUntil = now;
+    serving_ = serving;
+  }
+  if (serving_) takeServing(report, timeline, now);
+  for (const CarrierReport& each : report.carriers)
+    if (each.level || timeline.carriers().isConfigured(each.index))
+      hear({Technology::lte, each.channel, each.code}, each.level, each.quality, now);
+  takeNeighbors(report.neighbors, now);
+}
+
+void HeardCells::takeNeighbors(std::span<const NeighborReport> neighbors, std::int64_t now) {
+  std::vector<NeighborReport> strongest;
+  if (neighbors.size() > kMostCells) {
+    strongest.assign(neighbors.begin(), neighbors.end());
+    std::nth_element(strongest.begin(), strongest.begin() + kMostCells, strongest.end(),
+                     [](const NeighborReport& one, const NeighborReport& other) {
+                       return strengthOf(one.level) > strengthOf(other.level);
+                     });
+    neighbors = std::span(strongest).first(kMostCells);
+  }
+  for (const NeighborReport& each : neighbors)
+    hear({each.technology, each.channel, each.code}, each.level, each.quality, now);
+}
+
+void HeardCells::takeServing(const Report& report, const Timeline& timeline, std::int64_t now) {
+  if (report.servingCell && !report.servingCell->identity.isUnknown()) {
+    if (Row* row = findOrAdd(*serving_, std::nullopt, now)) row->heardAt = now;
+  }
+  const auto level = report.kpis.find(levelOf(serving_->technology));
+  if (!level || !isOfServingCell(report, timeline.mobility().cell()->identity)) return;
+  const auto quality = qualityOf(serving_->technology);
+  hear(*serving_, level, quality ? report.kpis.find(*quality) : std::nullopt, now);
+}
+
+void HeardCells::hear(const HeardKey& key, const std::optional<double>& level, const std::optional<double>& quality,
+                      std::int64_t now) {
+  if (!key.channel && !key.code) return;
+  Row* row = findOrAdd(key, level, now);
+  if (row == nullptr) return;
+  row->level = level;
+  row->quality = quality;
+  row->heardAt = now;
+}
+
+HeardCells::Row* HeardCells::find(const HeardKey& key, std::int64_t now) {
+  const auto found = std::find_if(rows_.begin(), rows_.end(), [&](const Row& row) { return row.key == key; });
+  return found == rows_.end() || isOld(*found, now) ? nullptr : &*found;
+}
+
+HeardCells::Row* HeardCells::findOrAdd(const HeardKey& key, const std::optional<double>& level, std::int64_t now) {
+  if (Row* row = find(key, now)) return row;
+  Row* room = makeRoom(level, now);
+  if (room != nullptr) *room = {key, std::nullopt, std::nullopt, now, std::nullopt};
+  return room;
+}
+
+HeardCells::Row* HeardCells::makeRoom(const std::optional<double>& level, std::int64_t now) {
+  std::erase_if(rows_, [now](const Row& row) { return isOld(row, now); });
+  if (rows_.size() < kMostCells) return &rows_.emplace_back();
+  const auto weakest = std::min_element(rows_.begin(), rows_.end(), [this](const Row& one, const Row& other) {
+    return std::pair(one.key == serving_, strengthOf(one.level)) <
+           std::pair(other.key == serving_, strengthOf(other.level));
+  });
+  return strengthOf(weakest->level) < strengthOf(level) ? &*weakest : nullptr;
+}
+
+void HeardCells::forget() {
+  rows_.clear();
+  serving_.reset();
+}
+
+std::vector<HeardCell> HeardCells::cells(const Timeline& timeline, std::int64_t now) const {
+  const auto carriers = timeline.carriers().configured();
+  const auto roleOf = [&](const HeardKey& key) {
+    if (key == serving_) return HeardRole::serving;
+    const bool isSecondary =
+        key.technology == Technology::lte && std::any_of(carriers.begin(), carriers.end(), [&](const Carrier& each) {
+          return each.channel == key.channel && each.code == key.code;
+        });
+    return isSecondary ? HeardRole::secondary : HeardRole::neighbor;
+  };
+  const auto serving =
+      std::find_if(rows_.begin(), rows_.end(), [&](const Row& row) { return row.key == serving_ && !isOld(row, now); });
+  std::vector<HeardCell> cells;
+  for (const Row& row : rows_) {
+    if (isOld(row, now)) continue;
+    HeardCell& cell = cells.emplace_back(
+        HeardCell{row.key, roleOf(row.key), row.level, row.quality, std::nullopt, now - row.heardAt, std::nullopt});
+    const bool isComparable = serving != rows_.end() && serving->key.technology == row.key.technology;
+    if (isComparable && serving->level && row.level) cell.difference = *row.level - *serving->level;
+    if (cell.role == HeardRole::serving) {
+      cell.servedAgo = 0;
+    } else if (row.servedUntil) {
+      cell.servedAgo = now - *row.servedUntil;
+    }
+  }
+  const auto rank = [](const HeardCell& cell) {
+    return std::tuple(cell.role, cell.key.technology, -strengthOf(cell.level), cell.key.channel, cell.key.code);
+  };
+  std::sort(cells.begin(), cells.end(),
+            [&](const HeardCell& one, const HeardCell& other) { return rank(one) < rank(other); });
+  return cells;
+}
+
+void writeJson(JsonWriter& json, const std::vector<HeardCell>& cells) {
+  writeJsonArray(json, cells, [&](const HeardCell& cell) {
+    JsonObject fields(json);
+    writeField(json, fields, "technology", nameOf(cell.key.technology));
+    writeField(json, fields, "channel", cell.key.channel);
+    writeField(json, fields, "code", cell.key.code);
+    writeField(json, fields, "role", nameOf(cell.role));
+    writeField(json, fields, "level", cell.level);
+    writeField(json, fields, "quality", cell.quality);
+    writeField(json, fields, "difference", cell.difference);
+    writeField(json, fields, "age_ms", std::optional(cell.age));
+    writeField(json, fields, "served_ms_ago", cell.servedAgo);
+    fields.end();
+  });
+}
+
+}  // namespace vesk::insight

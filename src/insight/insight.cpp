@@ -1,0 +1,71 @@
+#include "insight/insight.h"
+
+namespace vesk::insight {
+
+void Insight::observeEventsOf(MetricValidator& intake) {
+  intake.setEventObserver([this, &intake](const TakenEvent& event) { observe(event, intake.stores); });
+}
+
+void Insight::startAnew() {
+  clock_ = {};
+  counts_ = {};
+  timeline_ = {};
+  heard_ = {};
+  summary_ = {};
+  judge_.forget();
+  trend_ = {};
+  happenings_.clear();
+}
+
+void Insight::observe(const TakenEvent& event, const Stores& stores) {
+  const std::uint64_t number = counts_.all++;
+  switch (event.fate) {
+    case EventFate::stored:
+      ++counts_.stored;
+      take(event, stores, number);
+      break;
+    case EventFate::undecodable:
+      ++counts_.undecodable;
+      break;
+    case EventFate::ignored:
+      ++counts_.ignored;
+      break;
+  }
+}
+
+void Insight::take(const TakenEvent& event, const Stores& stores, std::uint64_t number) {
+  const std::int64_t before = time();
+  const auto passing = clock_.take(event.timestamp);
+  if (!passing) {
+    ++counts_.untimed;
+    return;
+  }
+  if (passing->passed > 0) summary_.pass(passing->passed, before, timeline_);
+  events_.clear();
+  const Moment moment{time(), number};
+  Step step(moment, events_);
+  if (passing->gap) {
+    summary_.takeGap(*passing->gap);
+    timeline_.forget();
+    heard_.forget();
+    judge_.forget();
+    step.add(EventKind::gap, *passing->gap);
+  }
+  const Report& report = reader_.read(*event.metricId, *event.record, stores);
+  timeline_.take(report, step);
+  heard_.take(report, timeline_, moment.time);
+  judge_.judge(timeline_.kpis(), moment, events_);
+  summary_.take(report, events_, timeline_);
+  trend_.take(report.kpis, clock_.counted(), moment.time);
+  if (onStep_) onStep_(report, events_);
+  keep(events_);
+}
+
+void Insight::keep(const std::vector<TimelineEvent>& events) {
+  for (const TimelineEvent& event : events) {
+    if (happenings_.size() == kMostHappenings) happenings_.pop_front();
+    happenings_.push_back({event, clock_.counted()});
+  }
+}
+
+}  // namespace vesk::insight

@@ -1,0 +1,166 @@
+#include <algorithm>
+#include <array>
+
+#include "insight/plmn.h"
+#include "insight/report_fields.h"
+#include "insight/report_steps.h"
+#include "insight/rrc_states.h"
+
+namespace vesk::insight {
+
+namespace {
+
+/// Of 28 bits, on LTE and UMTS.
+constexpr std::int64_t kLastCellIdentity = 268'435'455;
+constexpr std::int64_t kLastAreaCode = 65'535;
+constexpr std::int64_t kFirstBearer = 5;
+constexpr std::int64_t kLastBearer = 15;
+
+std::optional<std::string> plmnOf(const Dictionary& record, const Text& mcc, const Text& mnc) {
+  return plmnText(record.find(mcc), record.find(mnc), record.find("num_mnc_digits"_text));
+}
+
+void readArea(Report& report, Area area, const std::optional<std::string>& plmn, const Integer& code) {
+  if (plmn && code) report.area = {area, *plmn + " " + std::to_string(*code)};
+}
+
+std::optional<CarrierState> carrierStateOf(const Dictionary& record) {
+  const auto name = nameIn(record, "state"_text);
+  if (name == "SCC_STATE_DECONFIGURED"_text) return CarrierState::released;
+  if (name == "SCC_STATE_CONFIGURED_DEACTIVATED"_text) return CarrierState::configured;
+  if (name == "SCC_STATE_ACTIVATED"_text) return CarrierState::activated;
+  return std::nullopt;
+}
+
+Number bandwidthOf(const Dictionary& record) {
+  constexpr std::array kCarrierBandwidths{1.4F, 3.0F, 5.0F, 10.0F, 15.0F, 20.0F};
+  const Value* value = record.find("dl_bandwidth"_text);
+  const std::optional<float> bandwidth = value == nullptr ? std::nullopt : value->exactFloat();
+  const bool isPossible = bandwidth && std::find(kCarrierBandwidths.begin(), kCarrierBandwidths.end(), *bandwidth) !=
+                                           kCarrierBandwidths.end();
+  return isPossible ? Number(*bandwidth) : std::nullopt;
+}
+
+}  // namespace
+
+void readLteServingCell(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  report.technology = Technology::lte;
+  report.servingCell = {Technology::lte,
+                        {earfcnOf(record, "dl_freq"_text), pciOf(record, "phy_cell_id"_text),
+                         integerIn(record, "cell_id"_text, 0, kLastCellIdentity)}};
+  readArea(report, Area::tracking, plmnOf(record, "sel_plmn_mcc"_text, "sel_plmn_mnc"_text),
+           integerIn(record, "tracking_area_code"_text, 0, kLastAreaCode));
+}
+
+void readUmtsServingCell(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  report.technology = Technology::umts;
+  report.servingCell = {Technology::umts,
+                        {uarfcnOf(record, "dl_uarfcn"_text), pscOf(record, "psc"_text),
+                         integerIn(record, "cell_id"_text, 0, kLastCellIdentity)}};
+  readArea(report, Area::location, plmnOf(record, "mcc"_text, "mnc"_text),
+           integerIn(record, "lac"_text, 0, kLastAreaCode));
+}
+
+void readGsmServingCell(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  report.technology = Technology::gsm;
+  report.servingCell = {Technology::gsm, {arfcnOf(record), bsicOf(record), anyInteger(record, "cell_id"_text)}};
+  readArea(report, Area::location, plmnOf(record, "mcc"_text, "mnc"_text),
+           integerIn(record, "lac"_text, 0, kLastAreaCode));
+  if (const auto state = nameIn(record, "state"_text)) report.rrc = {.technology = Technology::gsm, .state = *state};
+}
+
+void readLteRrcState(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  const auto state = nameIn(record, "state"_text);
+  if (!state) return;
+  if (state == "KLTE_RRC_STATE_ATMPT_CONNECTION"_text || state == "KLTE_RRC_STATE_CONNECTED"_text)
+    report.technology = Technology::lte;
+  auto cause = nameIn(record, "cause"_text);
+  if (cause == "KLTE_RRC_CAUSE_NA"_text) cause.reset();
+  report.rrc = {.technology = Technology::lte,
+                .state = *state,
+                .previous = nameIn(record, "prev_state"_text),
+                .previousDuration = integerOf(record, "prev_state_dur_ms"_text),
+                .cause = std::move(cause)};
+}
+
+void readUmtsRrcState(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  static const std::array kInUse{
+      "KWCDMA_RRC_CONN_STATE_CELL_DCH"_text,  "KWCDMA_RRC_CONN_STATE_CELL_FACH"_text,
+      "KWCDMA_RRC_CONN_STATE_CELL_PCH"_text,  "KWCDMA_RRC_CONN_STATE_URA_PCH"_text,
+      "KWCDMA_RRC_CONN_STATE_ESTABLISH"_text,
+  };
+  const auto state = nameIn(record, "state"_text);
+  if (!state) return;
+  if (std::find(kInUse.begin(), kInUse.end(), *state) != kInUse.end()) report.technology = Technology::umts;
+  const bool isIdle = rrcClassOf(Technology::umts, *state) == RrcClass::idle;
+  report.rrc = {.technology = Technology::umts,
+                .state = *state,
+                .cause = nameIn(record, isIdle ? "release_cause"_text : "establishment_cause"_text)};
+}
+
+void readCarriers(Report& report, const Dictionary& record, const Stores& stores) {
+  if (record.find("scc_list"_text) == nullptr) return;
+  Number level;
+  for (const Record& each : stores.myLTE.CAStatusList) {
+    report.carriers.push_back({.index = anyInteger(each, "index"_text),
+                               .state = carrierStateOf(each),
+                               .channel = earfcnOf(each, "dl_earfcn"_text),
+                               .code = pciOf(each, "pci"_text),
+                               .bandwidth = bandwidthOf(each),
+                               .level = levelOf(kRsrp, each, "rsrp"_text),
+                               .quality = levelOf(kRsrq, each, "rsrq"_text)});
+    if (!level) level = report.carriers.back().level;
+  }
+  report.kpis.add(Kpi::lteSccRsrp, level);
+}
+
+template <Registration registration>
+void readRegistration(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  report.registration = {registration, nameIn(record, "reg_status"_text), nameIn(record, "reg_proc"_text),
+                         nameIn(record, "reject_cause"_text)};
+}
+
+template void readRegistration<Registration::emm>(Report&, const Dictionary&, const Stores&);
+template void readRegistration<Registration::mm>(Report&, const Dictionary&, const Stores&);
+
+void readGmmContext(Report& report, const Dictionary& record, const Stores& stores) {
+  readRegistration<Registration::gmm>(report, record, stores);
+  const Value* value = record.find("rai"_text);
+  const Dictionary* rai = value == nullptr ? nullptr : value->dictionary();
+  if (rai == nullptr) return;
+  const auto plmn = encodedPlmnText(*rai);
+  const Integer lac = anyInteger(*rai, "lac"_text);
+  const Integer rac = anyInteger(*rai, "rac"_text);
+  if (plmn && lac && rac)
+    report.area = {Area::routing, *plmn + " " + std::to_string(*lac) + " " + std::to_string(*rac)};
+}
+
+void readBearers(Report& report, const Dictionary& record, const Stores& stores) {
+  if (record.find("bearer_contexts"_text) == nullptr) {
+    if (anyInteger(record, "bearer_context_count"_text) == 0) report.bearers.emplace();
+    return;
+  }
+  std::vector<Bearer>& bearers = report.bearers.emplace();
+  for (const Record& each : stores.myCommon.activeBearer) {
+    Integer number = integerIn(each, "nsapi"_text, kFirstBearer, kLastBearer);
+    if (!number) number = anyInteger(each, "cid"_text);
+    if (number) bearers.push_back({*number, nameIn(each, "apn"_text), nameIn(each, "pdp_type"_text)});
+  }
+}
+
+void readCdrx(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  if (const auto state = nameIn(record, "rrc_state"_text))
+    report.rrc = {.technology = Technology::lte, .state = *state, .isMention = true};
+  const Integer status = integerIn(record, "cdrx_config_status"_text, 0, 1);
+  if (!status) return;
+  report.cdrx = {*status == 1,
+                 {integerOf(record, "on_duration_ms"_text), integerOf(record, "drx_inactivity_ms"_text),
+                  integerOf(record, "long_drx_cycle_ms"_text), integerOf(record, "short_drx_cycle_ms"_text)}};
+}
+
+void readSimFiles(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  const Value* files = record.find("ef_list"_text);
+  if (files != nullptr && files->array() != nullptr) report.simFiles = files->array()->size();
+}
+
+}  // namespace vesk::insight

@@ -1,0 +1,73 @@
+#include "insight/summary.h"
+
+#include <variant>
+
+namespace vesk::insight {
+
+namespace {
+
+/// Those of which counts for how long their values were known.
+constexpr std::array kKpisOfTime{Kpi::lteRsrp,         Kpi::lteRsrq,   Kpi::lteSinr,  Kpi::ltePuschTxPower,
+                                 Kpi::ltePucchTxPower, Kpi::umtsRscp,  Kpi::umtsEcNo, Kpi::umtsTxPower,
+                                 Kpi::gsmRxLev,        Kpi::gsmTxPower};
+
+}  // namespace
+
+void Summary::pass(std::int64_t passed, std::int64_t from, const Timeline& timeline) {
+  const auto& technology = timeline.mobility().technology();
+  times_[technology ? indexOf(*technology) : kTechnologies.size()] += passed;
+  cells_.addTime(passed);
+  passKpis(passed, from, timeline.kpis());
+  if (!timeline.carriers().configured().empty()) carriersConfigured_ += passed;
+  if (timeline.carriers().isAnyActivated()) carriersActivated_ += passed;
+  if (timeline.registrations().noServiceSince()) noService_ += passed;
+}
+
+void Summary::passKpis(std::int64_t passed, std::int64_t from, const KnownKpis& known) {
+  for (const Kpi kpiOfTime : kKpisOfTime) {
+    const auto value = known.at(kpiOfTime, from);
+    if (!value) continue;
+    const KpiDescription& each = descriptionOf(kpiOfTime);
+    KpiSummary& kpi = kpis_[indexOf(each.kpi)];
+    kpi.known += passed;
+    if (each.isTransmitPower && *value >= kHighTxPower) kpi.high += passed;
+    if (const auto grade = gradeOf(*each.quantity, *value)) kpi.graded[static_cast<std::size_t>(*grade)] += passed;
+  }
+}
+
+void Summary::takeGap(const Gap& gap) {
+  if (gaps_.size() < kMostGaps) gaps_.push_back(gap);
+  cells_.leave();
+}
+
+void Summary::take(const Report& report, const std::vector<TimelineEvent>& events, const Timeline& timeline) {
+  for (const TimelineEvent& event : events) {
+    count(event);
+    takeCellEvent(event);
+  }
+  for (const auto& [kpi, value] : report.kpis)
+    kpis_[indexOf(kpi)].values.add(value);
+  const auto& serving = timeline.mobility().cell();
+  if (!serving) return;
+  if (report.servingCell) cells_.fillIn(serving->identity);
+  if (!report.kpis.empty() && isOfServingCell(report, serving->identity)) cells_.take(report.kpis);
+}
+
+void Summary::takeCellEvent(const TimelineEvent& event) {
+  if (event.kind == EventKind::technology) cells_.leave();
+  if (const auto* pingPong = std::get_if<PingPong>(&event.fields)) ++mobility_[indexOf(pingPong->technology)].pingPongs;
+  const auto* change = std::get_if<CellChange>(&event.fields);
+  if (change == nullptr) return;
+  MobilityCounts& counts = mobility_[indexOf(change->technology)];
+  if (event.kind == EventKind::handover) ++counts.handovers;
+  if (event.kind == EventKind::reselection) ++counts.reselections;
+  if (change->how == CellEntry::reestablishment) ++counts.reestablishments;
+  if (change->how == CellEntry::unknown) ++counts.unknown;
+  cells_.enter(change->technology, change->to);
+}
+
+std::int64_t Summary::time(const std::optional<Technology>& technology) const {
+  return times_[technology ? indexOf(*technology) : kTechnologies.size()];
+}
+
+}  // namespace vesk::insight

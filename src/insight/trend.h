@@ -1,0 +1,39 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <deque>
+
+#include "insight/kpis.h"
+
+namespace vesk::insight {
+
+/// What was reported of a KPI in one second.
+struct TrendPoint {
+  /// When the second began, in counted time of the drive, without its gaps: milliseconds.
+  std::int64_t position;
+  /// When it was reported first: milliseconds since 1970-01-01 00:00:00 UTC.
+  std::int64_t time;
+  double min;
+  double max;
+  double sum;
+  std::uint64_t count;
+
+  [[nodiscard]] double mean() const { return sum / static_cast<double>(count); }
+};
+
+/// The course of every KPI over the last hour of a drive.
+class Trend {
+ public:
+  void take(const KpiReport& report, std::int64_t position, std::int64_t time);
+  /// In the order of time.
+  [[nodiscard]] const std::deque<TrendPoint>& points(Kpi kpi) const { return points_[indexOf(kpi)]; }
+
+ private:
+  static constexpr std::int64_t kWidth = 1000;
+  static constexpr std::size_t kMostPoints = 3600;
+
+  std::array<std::deque<TrendPoint>, kKpiCount> points_;
+};
+
+}  // namespace vesk::insight
