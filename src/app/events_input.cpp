@@ -22,8 +22,8 @@ constexpr std::int64_t kMostMeasured = std::int64_t{64} << 20;
 
 EventsInput::EventsInput(const std::string& path, std::optional<std::uint32_t> sim) : sim_(sim), input_(path) {
   struct stat status {};
-  if (fstat(input_.descriptor(), &status) != 0) return;
-  isFile_ = S_ISREG(status.st_mode);
+  if (input_.failure() || fstat(input_.descriptor(), &status) != 0) return;
+  isLive_ = !S_ISREG(status.st_mode);
   size_ = status.st_size;
 }
 
@@ -48,7 +48,7 @@ std::optional<std::string> EventsInput::open() {
 }
 
 void EventsInput::measure() {
-  if (capture_ != nullptr && isFile_ && size_ <= kMostMeasured) capture_->measure();
+  if (capture_ != nullptr && !isLive_ && size_ <= kMostMeasured) capture_->measure();
 }
 
 std::vector<std::string> EventsInput::remarks() const {

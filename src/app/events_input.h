@@ -27,8 +27,8 @@ class EventsInput final : public TimedEvents {
   EventsInput(const EventsInput&) = delete;
   EventsInput& operator=(const EventsInput&) = delete;
 
-  /// Whether its end is elsewhere than in a file.
-  [[nodiscard]] bool isLive() const { return !isFile_; }
+  /// Whether it can be read, and its end is elsewhere than in a file.
+  [[nodiscard]] bool isLive() const { return isLive_; }
   /// Finds out what it holds, which next() does otherwise; a pipe is waited for. Why it cannot be read, as NAME:
   /// reason.
   std::optional<std::string> open();
@@ -48,7 +48,7 @@ class EventsInput final : public TimedEvents {
   std::optional<std::uint32_t> sim_;
   /// Before it is open.
   ByteInput input_;
-  bool isFile_ = false;
+  bool isLive_ = false;
   std::int64_t size_ = 0;
   std::unique_ptr<TimedEvents> reader_;
   /// The reader, as what it is.
