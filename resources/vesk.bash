@@ -42,13 +42,13 @@ _vesk_files() {
 
 _vesk() {
   local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
-  local command='' word skip='' arguments=() options='--replay --headless --speed --seed --loop --seconds --rule --rules --redact --log --version'
+  local command='' word skip='' arguments=() options='--diag --sim --replay --record --real-pauses --headless --speed --seed --loop --seconds --rule --rules --redact --log --version'
   COMPREPLY=()
 
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
     if [[ -n $skip ]]; then
       skip=''
-    elif [[ $word == --@(replay|speed|seed|seconds|log|rule|rules) ]]; then
+    elif [[ $word == --@(diag|sim|replay|record|speed|seed|seconds|log|rule|rules) ]]; then
       skip=1
     elif [[ $word != -?* && -z $command ]]; then
       command=$word
@@ -58,14 +58,15 @@ _vesk() {
   done
 
   case $previous in
-    --replay | --rules) _vesk_files && return ;;
+    --replay | --record | --rules) _vesk_files && return ;;
+    --diag) mapfile -t COMPREPLY < <(compgen -G "${cur:-/dev/}*") && return ;;
     --speed) _vesk_offer < <(printf '%s\n' 1 2 5 10 max) && return ;;
     --log)
       _vesk_files
       _vesk_offer < <(printf '%s\n' syslog stderr none)
       return
       ;;
-    --seed | --seconds | --rule) return ;;
+    --seed | --seconds | --sim | --rule) return ;;
   esac
 
   case $command in
@@ -75,11 +76,12 @@ _vesk() {
     timeline) options='--json --rule --rules --redact --log' ;;
     series) options='--csv --redact --log' ;;
     simulate) options='--seed --seconds --log' ;;
+    import) options='--sim --count --layouts --redact --log' ;;
   esac
   if [[ $cur == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
   elif [[ -z $command ]]; then
-    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings redact simulate' -- "$cur")
+    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings redact simulate import' -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
     _vesk_offer < <(_vesk_areas)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then

@@ -11,6 +11,7 @@ build     g++                 g++
 build     rapidjson-dev       /usr/include/rapidjson/reader.h
 build     libcli11-dev        /usr/include/CLI/CLI.hpp
 build     libncurses-dev      /usr/include/ncursesw/curses.h
+build     zlib1g-dev          /usr/include/zlib.h
 build     protobuf-compiler   protoc
 build     libprotobuf-dev     /usr/include/google/protobuf/message.h
 build     libprotoc-dev       /usr/include/google/protobuf/compiler/plugin.h
@@ -25,6 +26,8 @@ clang     clang-tidy          clang-tidy
 readme    groff               groff
 readme    jq                  jq
 readme    bsdutils            script
+captures  jq                  jq
+captures  diffutils           cmp
 readme    protobuf-compiler   protoc
 load      time                /usr/bin/time
 load      diffutils           cmp

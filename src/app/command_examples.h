@@ -10,6 +10,7 @@ inline constexpr const char* kExamples =
     "  vesk --replay drive.jsonl --speed 10   the same, ten times as fast\n"
     "  tail -f live.jsonl | vesk --replay -   the screens on a live pipe\n"
     "  vesk --headless --replay drive.jsonl   the diagnostic lines, no screens\n"
+    "  vesk --diag /dev/ttyUSB0               the screens on a real modem\n"
     "\n"
     "A recording has one event a line:\n"
     "  {\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"1003\"}\n"
@@ -81,5 +82,14 @@ inline constexpr const char* kSimulateExamples =
     "Examples:\n"
     "  vesk simulate --seconds 600 > drive.jsonl\n"
     "  vesk simulate --seed 7 | vesk show LTE \"RRC State\" -";
+
+inline constexpr const char* kImportExamples =
+    "A capture is what a program kept of a modem's diagnostic port: QMDL, .mi2log or\n"
+    "DLF, told by its content, also compressed with gzip. It becomes a recording.\n"
+    "\n"
+    "Examples:\n"
+    "  vesk import drive.qmdl > drive.jsonl\n"
+    "  vesk import --count drive.qmdl         what it holds, and what is read of it\n"
+    "  vesk import drive.qmdl | vesk show LTE \"RRC State\" -";
 
 }  // namespace vesk

@@ -15,6 +15,7 @@
 #include "app/command_examples.h"
 #include "app/commands/decode_command.h"
 #include "app/commands/drive_commands.h"
+#include "app/commands/import_command.h"
 #include "app/commands/readings_command.h"
 #include "app/commands/redact_command.h"
 #include "app/commands/run_command.h"
@@ -97,6 +98,7 @@ class CommandLine {
     addReadings();
     addRedact();
     addSimulate();
+    addImport();
   }
 
   Outcome run(int argc, const char* const* argv) {
@@ -121,7 +123,16 @@ class CommandLine {
  private:
   void addRunOptions() {
     CLI::Option* replay =
-        program_.add_option("--replay", run_.source.replay, "Feed it a recording, not simulated events; - is stdin")
+        program_.add_option("--replay", run_.source.replay, "Feed it a recording or a capture; - is stdin")
+            ->type_name("FILE");
+    CLI::Option* port = program_.add_option("--diag", run_.source.port, "Feed it a modem's diagnostic port")
+                            ->type_name("PORT")
+                            ->excludes(replay);
+    program_.add_option("--sim", run_.source.sim, "Take one SIM's packets only, from 1: of a port or a capture")
+        ->type_name("N")
+        ->check(CLI::PositiveNumber.description(""));
+    CLI::Option* record =
+        program_.add_option("--record", run_.source.record, "Keep what comes: of a port the capture, else a recording")
             ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
     program_
@@ -138,9 +149,14 @@ class CommandLine {
     program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")
         ->type_name("N")
         ->check(CLI::NonNegativeNumber.description(""))
-        ->excludes(replay);
+        ->excludes(replay)
+        ->excludes(port);
+    program_.add_flag("--real-pauses", run_.source.playback.keepsPauses, "Do not shorten pauses of more than a minute")
+        ->needs(replay);
     program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
     addRedactOption(program_, run_.isRedacted);
+    // What is kept is what came, identities included.
+    program_.get_option("--redact")->excludes(record);
     addRuleOptions(program_, run_.rules);
     program_
         .add_option_function<double>(
@@ -247,6 +263,21 @@ class CommandLine {
     simulate->final_callback([this] { command_ = [this] { return runSimulate(simulate_); }; });
   }
 
+  void addImport() {
+    CLI::App* command = program_.add_subcommand("import", "Print a capture of a diagnostic port as a recording");
+    import_.input.path = "-";
+    addFile(*command, import_.input, "The capture; - or nothing for standard input");
+    addRedactOption(*command, import_.input.isRedacted);
+    command->add_option("--sim", import_.sim, "Take the packets of one SIM only, from 1")
+        ->type_name("N")
+        ->check(CLI::PositiveNumber.description(""));
+    command->add_flag("--count", import_.countsOnly, "Print a table of what the capture holds instead");
+    command->add_flag("--layouts", import_.layoutsOnly, "Print a table of what can be read");
+    addLogOption(*command, kDataLog);
+    command->footer(kImportExamples);
+    command->final_callback([this] { command_ = [this] { return runImport(import_); }; });
+  }
+
   /// The help or the version.
   Outcome printAnswer(const CLI::ParseError& asked) {
     std::ostringstream answer;
@@ -338,6 +369,7 @@ class CommandLine {
   RunOptions run_;
   ShowOptions show_;
   SimulateOptions simulate_;
+  ImportOptions import_;
   RecordingInput input_;
   TimelineOptions timeline_;
   bool asJson_ = false;

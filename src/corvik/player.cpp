@@ -16,6 +16,10 @@ using vesk::TimedEvents;
 /// Longer waits are never meant; beyond this a time would not fit the clock.
 constexpr double kLongestWait = 1e9;
 
+/// Seconds of the recording: a pause beyond this is shortened to that.
+constexpr double kLongPause = 60;
+constexpr double kShortenedPause = 5;
+
 }  // namespace
 
 Player::Player(std::unique_ptr<TimedEvents> recording, const Clock& clock, Playback playback)
@@ -77,12 +81,15 @@ bool Player::waitForInput(int descriptor) {
 }
 
 void Player::waitUntil(double at) {
-  const double wait = std::clamp((at - at_) / *playback_.speed, 0.0, kLongestWait);
+  const double pause = at - at_;
+  const bool isShortened = pause > kLongPause && !playback_.keepsPauses;
+  const double wait = std::clamp((isShortened ? kShortenedPause : pause) / *playback_.speed, 0.0, kLongestWait);
   *due_ += std::chrono::duration_cast<Clock::Duration>(std::chrono::duration<double>(wait));
   at_ = at;
   {
     const std::lock_guard lock(stateLock_);
     next_ = NextEvent{at, *due_};
+    if (isShortened) state_.shortenedPause = pause;
   }
   clock_.sleepUntil(*due_, interrupt_);
 }
@@ -91,6 +98,7 @@ void Player::countEvent(double at) {
   ++eventsOfLap_;
   const std::lock_guard lock(stateLock_);
   next_.reset();
+  state_.shortenedPause.reset();
   state_.position = at;
   // A recording may have grown since its end was looked at.
   if (state_.duration) state_.duration = std::max(*state_.duration, at);

@@ -18,6 +18,8 @@ struct Playback {
   std::optional<double> speed = 1.0;
   /// From the start again at the end, where the recording has a way back.
   bool loops = false;
+  /// Pauses of more than a minute last as long as they did, not five seconds.
+  bool keepsPauses = false;
 };
 
 /// How far the playback has come: what a status bar shows.
@@ -37,6 +39,8 @@ struct PlaybackState {
   /// Seconds: "at" of the last event of all, where it can be known; never before the position.
   std::optional<double> duration;
   std::optional<double> speed;
+  /// Seconds: how long the pause was that is being shortened now.
+  std::optional<double> shortenedPause;
   std::size_t events = 0;
   std::size_t badLines = 0;
 };

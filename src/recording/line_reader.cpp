@@ -1,10 +1,8 @@
 #include "recording/line_reader.h"
 
 #include <algorithm>
-#include <cerrno>
+#include <cstdint>
 #include <cstring>
-#include <poll.h>
-#include <unistd.h>
 
 namespace vesk {
 
@@ -12,22 +10,10 @@ namespace {
 
 constexpr std::size_t kUsualCapacity = std::size_t{256} << 10;
 
-/// read(2), carried on after a signal and, on a descriptor that does not block, once there is something.
-ssize_t readSome(int descriptor, char* place, std::size_t room) {
-  for (;;) {
-    const ssize_t count = read(descriptor, place, room);
-    if (count >= 0 || (errno != EINTR && errno != EAGAIN)) return count;
-    if (errno == EAGAIN) {
-      pollfd waited{descriptor, POLLIN, 0};
-      poll(&waited, 1, -1);
-    }
-  }
-}
-
 }  // namespace
 
-LineReader::LineReader(FileDescriptor descriptor, std::size_t padding, std::size_t longestLine)
-    : descriptor_(std::move(descriptor)),
+LineReader::LineReader(ByteInput input, std::size_t padding, std::size_t longestLine)
+    : input_(std::move(input)),
       padding_(padding),
       longestLine_(longestLine),
       buffer_(std::make_unique_for_overwrite<char[]>(std::min(kUsualCapacity, longestLine + 1) + padding)),
@@ -67,11 +53,10 @@ LineReader::Found LineReader::take(std::size_t end, std::size_t next) {
 
 LineReader::Input LineReader::refill() {
   makeRoom();
-  if (beforeRead_ && !beforeRead_(descriptor_.get())) return Input::end;
-  const ssize_t count = readSome(descriptor_.get(), buffer_.get() + end_, capacity_ - end_);
-  if (count < 0) return Input::failure;
-  end_ += static_cast<std::size_t>(count);
-  return count == 0 ? Input::end : Input::more;
+  const std::size_t count = input_.read({reinterpret_cast<std::uint8_t*>(buffer_.get()) + end_, capacity_ - end_});
+  if (count == 0) return input_.failure() ? Input::failure : Input::end;
+  end_ += count;
+  return Input::more;
 }
 
 void LineReader::makeRoom() {
@@ -94,7 +79,7 @@ void LineReader::makeRoom() {
 }
 
 bool LineReader::rewind() {
-  if (lseek(descriptor_.get(), 0, SEEK_SET) != 0) return false;
+  if (!input_.rewind()) return false;
   begin_ = scanned_ = end_ = 0;
   isPassingOver_ = false;
   line_ = {};

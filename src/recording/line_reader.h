@@ -5,12 +5,11 @@
 #include <span>
 #include <utility>
 
-#include "recording/timed_events.h"
-#include "system/file_descriptor.h"
+#include "recording/byte_input.h"
 
 namespace vesk {
 
-/// Splits what a file descriptor yields into lines, each handed on as soon as its line feed has arrived. One
+/// Splits what an input yields into lines, each handed on as soon as its line feed has arrived. One
 /// buffer holds what was read; it grows only for a line that does not fit.
 class LineReader {
  public:
@@ -18,19 +17,18 @@ class LineReader {
   static constexpr std::size_t kLongestLine = std::size_t{8} << 20;
 
   /// `padding` bytes behind every line may be read, whatever they hold, and the first be overwritten.
-  LineReader(FileDescriptor descriptor, std::size_t padding, std::size_t longestLine = kLongestLine);
+  LineReader(ByteInput input, std::size_t padding, std::size_t longestLine = kLongestLine);
 
-  void setBeforeRead(TimedEvents::BeforeRead beforeRead) { beforeRead_ = std::move(beforeRead); }
-
-  /// Finds the next line. One beyond the longest is passed over without being kept. After a failure errno
-  /// tells why, and so it stays.
+  /// Finds the next line. One beyond the longest is passed over without being kept. After a failure the input tells
+  /// why, and so it stays.
   [[nodiscard]] Found next();
   /// The line found, without its line feed; valid, and to do with as one likes, until the next call.
   [[nodiscard]] std::span<char> line() const { return line_; }
   /// Its number, from 1.
   [[nodiscard]] std::size_t lineNumber() const { return lineNumber_; }
 
-  [[nodiscard]] int descriptor() const { return descriptor_.get(); }
+  [[nodiscard]] ByteInput& input() { return input_; }
+  [[nodiscard]] const ByteInput& input() const { return input_; }
   /// Back to the first line; false when the input has no way back.
   [[nodiscard]] bool rewind();
 
@@ -41,10 +39,9 @@ class LineReader {
   void makeRoom();
   Found take(std::size_t end, std::size_t next);
 
-  FileDescriptor descriptor_;
+  ByteInput input_;
   std::size_t padding_;
   std::size_t longestLine_;
-  TimedEvents::BeforeRead beforeRead_;
 
   std::unique_ptr<char[]> buffer_;
   std::size_t capacity_;

@@ -1,9 +1,6 @@
 #include "recording/recording_reader.h"
 
 #include <algorithm>
-#include <cerrno>
-#include <cstring>
-#include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <utility>
@@ -15,23 +12,6 @@ namespace {
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 /// How far from the end of a file its last event is looked for.
 constexpr off_t kTail = 65536;
-
-FileDescriptor openForReading(const std::string& path) {
-  if (path == "-") return FileDescriptor::borrowed(STDIN_FILENO);
-  return FileDescriptor(open(path.c_str(), O_RDONLY | O_CLOEXEC));
-}
-
-std::string inWords(const std::string& name, int error) {
-  return name + ": " + std::strerror(error);
-}
-
-/// A directory can be opened, and fails only when it is read.
-std::optional<std::string> whyUnreadable(const FileDescriptor& descriptor, const std::string& name) {
-  struct stat status {};
-  if (!descriptor.isOpen() || fstat(descriptor.get(), &status) != 0) return inWords(name, errno);
-  if (S_ISDIR(status.st_mode)) return inWords(name, EISDIR);
-  return std::nullopt;
-}
 
 std::string_view asText(std::span<char> line) {
   return {line.data(), line.size()};
@@ -48,23 +28,22 @@ bool isBlank(std::string_view line) {
 
 }  // namespace
 
-RecordingReader::RecordingReader(const std::string& path)
-    : RecordingReader(openForReading(path), path == "-" ? "standard input" : path) {}
+RecordingReader::RecordingReader(const std::string& path) : RecordingReader(ByteInput(path)) {}
 
 RecordingReader::RecordingReader(FileDescriptor descriptor, std::string name, std::size_t longestLine)
-    : name_(std::move(name)),
-      failure_(whyUnreadable(descriptor, name_)),
-      lines_(std::move(descriptor), RecordedEventParser::kPadding, longestLine) {}
+    : RecordingReader(ByteInput(std::move(descriptor), std::move(name)), longestLine) {}
+
+RecordingReader::RecordingReader(ByteInput input, std::size_t longestLine)
+    : lines_(std::move(input), RecordedEventParser::kPadding, longestLine) {}
 
 RecordingReader::Step RecordingReader::next() {
-  if (failure_) return ReadFailure{*failure_};
+  if (failure()) return ReadFailure{*failure()};
   for (;;) {
     switch (lines_.next()) {
       case LineReader::Found::end:
         return EndOfRecording{};
       case LineReader::Found::failure:
-        failure_ = inWords(name_, errno);
-        return ReadFailure{*failure_};
+        return ReadFailure{*failure()};
       case LineReader::Found::tooLongLine:
         return badLine("longer than a line may be");
       case LineReader::Found::line:
@@ -80,10 +59,10 @@ RecordingReader::Step RecordingReader::next() {
 
 std::optional<double> RecordingReader::duration() const {
   struct stat status {};
-  if (fstat(lines_.descriptor(), &status) != 0 || !S_ISREG(status.st_mode)) return std::nullopt;
+  if (fstat(lines_.input().descriptor(), &status) != 0 || !S_ISREG(status.st_mode)) return std::nullopt;
   const off_t start = std::max<off_t>(0, status.st_size - kTail);
   std::string tail(static_cast<std::size_t>(status.st_size - start), '\0');
-  const ssize_t count = pread(lines_.descriptor(), tail.data(), tail.size(), start);
+  const ssize_t count = pread(lines_.input().descriptor(), tail.data(), tail.size(), start);
   if (count < 0) return std::nullopt;
   const auto size = static_cast<std::size_t>(count);
   tail.resize(size + RecordedEventParser::kPadding);
@@ -101,7 +80,7 @@ std::optional<double> RecordingReader::duration() const {
 }
 
 BadLine RecordingReader::badLine(std::string_view reason) const {
-  return BadLine{name_ + ':' + std::to_string(lines_.lineNumber()) + ": " + std::string(reason)};
+  return BadLine{name() + ':' + std::to_string(lines_.lineNumber()) + ": " + std::string(reason)};
 }
 
 }  // namespace vesk

@@ -18,25 +18,25 @@ class RecordingReader final : public TimedEvents {
   explicit RecordingReader(const std::string& path);
   /// Over an open descriptor, called `name` in messages.
   RecordingReader(FileDescriptor descriptor, std::string name, std::size_t longestLine = LineReader::kLongestLine);
+  /// Reads on in `input`.
+  explicit RecordingReader(ByteInput input, std::size_t longestLine = LineReader::kLongestLine);
 
-  void setBeforeRead(BeforeRead beforeRead) override { lines_.setBeforeRead(std::move(beforeRead)); }
+  void setBeforeRead(BeforeRead beforeRead) override { lines_.input().setBeforeRead(std::move(beforeRead)); }
   /// Passes over blank lines.
   [[nodiscard]] Step next() override;
   [[nodiscard]] bool rewind() override { return lines_.rewind(); }
   [[nodiscard]] std::optional<double> duration() const override;
 
   /// Why nothing can be read (any more).
-  [[nodiscard]] const std::optional<std::string>& failure() const { return failure_; }
+  [[nodiscard]] const std::optional<std::string>& failure() const { return lines_.input().failure(); }
   /// As shown to people: the path, or "standard input".
-  [[nodiscard]] const std::string& name() const { return name_; }
+  [[nodiscard]] const std::string& name() const { return lines_.input().name(); }
   /// The number of the last line that next() looked at, from 1.
   [[nodiscard]] std::size_t lineNumber() const { return lines_.lineNumber(); }
 
  private:
   [[nodiscard]] BadLine badLine(std::string_view reason) const;
 
-  std::string name_;
-  std::optional<std::string> failure_;
   LineReader lines_;
   RecordedEventParser parser_;
 };

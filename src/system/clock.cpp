@@ -13,15 +13,19 @@ int pollTimeout(Clock::Duration left) {
   return static_cast<int>(std::clamp<milliseconds::rep>(wait, 0, std::numeric_limits<int>::max()));
 }
 
-void SteadyClock::sleepUntil(Instant instant, const WakeUp& interrupt) const {
+void Clock::sleepUntil(Instant instant, const WakeUp& interrupt) const {
+  if (instant <= now()) return;
+  pollfd waited{interrupt.descriptor(), POLLIN, 0};
+  waitUntil(instant, {&waited, 1});
+}
+
+void SteadyClock::waitUntil(std::optional<Instant> instant, std::span<pollfd> descriptors) const {
   for (;;) {
-    const Duration left = instant - now();
-    if (left <= Duration::zero()) return;
+    const Duration left = instant ? std::max(*instant - now(), Duration::zero()) : Duration::zero();
     const auto seconds = std::chrono::duration_cast<std::chrono::seconds>(left);
     const timespec timeout{seconds.count(), static_cast<long>((left - seconds).count())};
-    pollfd waited{interrupt.descriptor(), POLLIN, 0};
-    const int ready = ppoll(&waited, 1, &timeout, nullptr);
-    if (ready > 0 || (ready < 0 && errno != EINTR)) return;
+    const int ready = ppoll(descriptors.data(), descriptors.size(), instant ? &timeout : nullptr, nullptr);
+    if (ready >= 0 || errno != EINTR) return;
   }
 }
 

@@ -1,6 +1,9 @@
 #pragma once
 
 #include <chrono>
+#include <optional>
+#include <poll.h>
+#include <span>
 
 #include "system/wake_up.h"
 
@@ -15,8 +18,11 @@ class Clock {
 
   virtual ~Clock() = default;
   [[nodiscard]] virtual Instant now() const = 0;
+  /// Blocks the calling thread until `instant`, for ever where it is absent, or until one of the descriptors is ready:
+  /// their revents tell, as poll(2) leaves them.
+  virtual void waitUntil(std::optional<Instant> instant, std::span<pollfd> descriptors) const = 0;
   /// Blocks the calling thread until `instant`, or until `interrupt` is signalled.
-  virtual void sleepUntil(Instant instant, const WakeUp& interrupt) const = 0;
+  void sleepUntil(Instant instant, const WakeUp& interrupt) const;
 };
 
 /// How long poll(2) has to wait for what lies `left` ahead: in milliseconds, rounded up, for waking before the time
@@ -27,7 +33,7 @@ class Clock {
 class SteadyClock : public Clock {
  public:
   [[nodiscard]] Instant now() const override { return std::chrono::steady_clock::now(); }
-  void sleepUntil(Instant instant, const WakeUp& interrupt) const override;
+  void waitUntil(std::optional<Instant> instant, std::span<pollfd> descriptors) const override;
 };
 
 }  // namespace vesk

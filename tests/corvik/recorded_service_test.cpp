@@ -143,6 +143,22 @@ TEST_F(RecordedServiceTest, KeepsTheRecordingsPaceAndDoesNotWaitForAStepBack) {
     loop_.run();
 }
 
+TEST_F(RecordedServiceTest, ShortensPausesOfMoreThanAMinuteUnlessTheyAreKept) {
+  for (const bool keepsPauses : {false, true}) {
+    connect(vesk::fileWith(line(60, 2) + line(121, 3)), {.speed = 1.0, .keepsPauses = keepsPauses});
+    EXPECT_EQ(clock_.waitForSleeper(), 60s);
+    EXPECT_EQ(service_->state().shortenedPause, std::nullopt);
+    EXPECT_EQ(next(1), Ids{2});
+    EXPECT_EQ(clock_.waitForSleeper(), keepsPauses ? 61s : 5s);
+    EXPECT_EQ(service_->state().shortenedPause, keepsPauses ? std::nullopt : std::optional(61.0));
+    EXPECT_EQ(next(1), Ids{3});
+    EXPECT_EQ(service_->state().shortenedPause, std::nullopt);
+    while (!isEnded_)
+      loop_.run();
+    isEnded_ = false;
+  }
+}
+
 TEST_F(RecordedServiceTest, GoesRoundAndTellsBadLinesOnce) {
   connect(vesk::fileWith(line(1, 1) + "bad\n" + line(3, 2)), {1.0, true});
   EXPECT_EQ(next(1), Ids{1});
@@ -170,7 +186,7 @@ TEST_F(RecordedServiceTest, PlaysAPipeAsItIsWrittenAndIsInterruptedWhileItWaitsF
 }
 
 TEST_F(RecordedServiceTest, IsInterruptedWhileItWaitsForAnEventsTime) {
-  connect(vesk::fileWith(line(1e300, 1)), {1.0, false});
+  connect(vesk::fileWith(line(1e300, 1)), {.speed = 1.0, .keepsPauses = true});
   EXPECT_GT(clock_.waitForSleeper(), 1h);
   manager_.reset();
   EXPECT_TRUE(ids_.empty());

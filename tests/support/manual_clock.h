@@ -1,9 +1,12 @@
 #pragma once
 
+#include <algorithm>
 #include <condition_variable>
 #include <mutex>
 #include <optional>
 #include <poll.h>
+#include <span>
+#include <vector>
 
 #include "system/clock.h"
 
@@ -25,13 +28,17 @@ class ManualClock : public Clock {
   }
 
   /// For one thread at a time.
-  void sleepUntil(Instant instant, const WakeUp& interrupt) const override {
+  void waitUntil(std::optional<Instant> instant, std::span<pollfd> descriptors) const override {
+    std::vector<pollfd> polled(descriptors.begin(), descriptors.end());
+    polled.push_back({advanced_.descriptor(), POLLIN, 0});
     while (goToSleep(instant)) {
-      pollfd polled[] = {{interrupt.descriptor(), POLLIN, 0}, {advanced_.descriptor(), POLLIN, 0}};
-      poll(polled, 2, -1);
+      poll(polled.data(), polled.size(), -1);
       advanced_.clear();
-      if (polled[0].revents != 0) return;
+      std::copy(polled.begin(), polled.end() - 1, descriptors.begin());
+      if (std::any_of(descriptors.begin(), descriptors.end(), [](const pollfd& each) { return each.revents != 0; }))
+        return;
     }
+    poll(descriptors.data(), descriptors.size(), 0);
   }
 
   /// Blocks until a thread sleeps by this clock: how long it will.
@@ -42,10 +49,10 @@ class ManualClock : public Clock {
   }
 
  private:
-  [[nodiscard]] bool goToSleep(Instant instant) const {
+  [[nodiscard]] bool goToSleep(std::optional<Instant> instant) const {
     const std::lock_guard lock(mutex_);
-    if (instant <= now_) return false;
-    sleepingUntil_ = instant;
+    if (instant && *instant <= now_) return false;
+    sleepingUntil_ = instant.value_or(Instant::max());
     asleep_.notify_all();
     return true;
   }

@@ -6,6 +6,7 @@
 
 #include "app/output/data_output.h"
 #include "app/output/progress.h"
+#include "app/source/events_input.h"
 #include "app/source/recording_input.h"
 #include "app/source/redaction.h"
 #include "recording/recording_reader.h"
@@ -20,18 +21,32 @@ class EventLines {
   using Append = std::function<void(std::string& out, const RecordedEvent& event)>;
 
   EventLines(const RecordingInput& input, Append append)
-      : path_(input.path.value_or("-")), append_(std::move(append)), isRedacted_(input.isRedacted), reader_(path_) {
-    reader_.setBeforeRead([this](int) {
+      : path_(input.path.value_or("-")),
+        append_(std::move(append)),
+        isRedacted_(input.isRedacted),
+        input_(path_, std::nullopt) {
+    input_.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();
     });
   }
 
   Outcome run() {
-    while (!output_.hasFailed() && std::visit(*this, reader_.next())) {
+    if (const std::optional<std::string> failure = input_.open()) {
+      fail("vesk: " + *failure);
+      return output_.finish(outcome_);
+    }
+    if (progress_.isPossible()) duration_ = input_.duration();
+    // A reader that is known is called directly.
+    if (RecordingReader* recording = input_.recording()) {
+      readAll(*recording);
+    } else {
+      readAll(input_);
     }
     progress_.hide();
     if (events_ == 0 && hasBadLines_) tellIsNoRecording(path_);
+    for (const std::string& remark : input_.remarks())
+      tellUser(remark);
     redaction_.tellLeftOut();
     return output_.finish(outcome_);
   }
@@ -64,6 +79,12 @@ class EventLines {
  private:
   static constexpr std::uint64_t kEventsToProgress = 4096;
 
+  template <class Events>
+  void readAll(Events& events) {
+    while (!output_.hasFailed() && std::visit(*this, events.next())) {
+    }
+  }
+
   void write(const RecordedEvent& event) {
     line_.clear();
     append_(line_, event);
@@ -80,10 +101,10 @@ class EventLines {
   const Append append_;
   const bool isRedacted_;
   Redaction redaction_;
-  RecordingReader reader_;
+  EventsInput input_;
   DataOutput output_;
   Progress progress_{Progress::Output::meanwhile};
-  const std::optional<double> duration_ = progress_.isPossible() ? reader_.duration() : std::nullopt;
+  std::optional<double> duration_;
   std::uint64_t events_ = 0;
   bool hasBadLines_ = false;
   std::string line_;

@@ -37,6 +37,7 @@ class Run {
   Outcome run() {
     source_ = makeEventSource(options_.source, clock_,
                               {[this](const std::string& message) { tell(message); },
+                               [this](const std::string& remark) { show("vesk: " + remark); },
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
     if (source_.failure) {
       tellUser("vesk: " + *source_.failure);
@@ -152,6 +153,10 @@ class Run {
   void tell(const std::string& line) {
     outcome_ = Outcome::failed;
     if (!firstFault_) firstFault_ = line;
+    show(line);
+  }
+
+  void show(const std::string& line) {
     if (isHeadless_) {
       tellUser(line);
     } else {

@@ -3,9 +3,15 @@
 #include <chrono>
 #include <cmath>
 #include <cstdio>
+#include <utility>
 
+#include "app/source/events_input.h"
+#include "app/source/recording_service.h"
+#include "diag/framing/frame.h"
+#include "diag/port/port_service.h"
 #include "handset/handset_service.h"
-#include "recording/recording_reader.h"
+#include "recording/record_file.h"
+#include "system/main_queue.h"
 
 namespace vesk {
 
@@ -23,7 +29,7 @@ std::string playingTime(double seconds) {
   return text;
 }
 
-ShownState shown(const corvik::PlaybackState& state) {
+ShownState shown(const corvik::PlaybackState& state, bool isLive) {
   using Phase = corvik::PlaybackState::Phase;
   switch (state.phase) {
     case Phase::notStarted:
@@ -34,27 +40,109 @@ ShownState shown(const corvik::PlaybackState& state) {
     case Phase::playing:
       break;
   }
-  // A pipe has no length, and is as good as live.
-  if (!state.duration) return {"live"};
-  return {"replaying " + playingTime(state.position) + " of " + playingTime(*state.duration), true};
+  // A pipe is as good as live.
+  if (isLive) return {"live"};
+  std::string text = "replaying " + playingTime(state.position);
+  if (state.duration) text += " of " + playingTime(*state.duration);
+  if (state.shortenedPause) text += ", shortening a pause of " + playingTime(*state.shortenedPause);
+  return {text, true};
+}
+
+/// "ttyUSB0: 23 packets/s, 2 damaged", and what else has gone wrong.
+ShownState shown(const std::string& port, const diag::PortState& state) {
+  using Phase = diag::PortState::Phase;
+  std::string text = port.substr(port.rfind('/') + 1) + ": ";
+  switch (state.phase) {
+    case Phase::starting:
+      return {text + "starting"};
+    case Phase::unplugged:
+      return {text + "unplugged, waiting"};
+    case Phase::ended:
+      return {text + "ended"};
+    case Phase::silent:
+      text += "silent";
+      break;
+    case Phase::watching:
+      text += std::to_string(state.packetsPerSecond) + " packets/s";
+      break;
+  }
+  const std::pair<std::uint64_t, const char*> counts[] = {
+      {state.damaged, " damaged"}, {state.passedOver, " passed over"}, {state.dropped, " dropped"}};
+  for (const auto& [count, what] : counts) {
+    if (count > 0) text += ", " + std::to_string(count) + what;
+  }
+  return {text, true};
+}
+
+/// Keeps every frame in `file`; `failed` is told, on the main queue, when that is no longer possible.
+diag::PortService::FrameHandler keepFrames(std::shared_ptr<RecordFile> file,
+                                           std::function<void(const std::string&)> failed) {
+  return [file = std::move(file), failed = std::move(failed),
+          frame = std::vector<std::uint8_t>()](std::span<const std::uint8_t> content) mutable {
+    if (file->failure()) return;
+    frame.clear();
+    diag::appendFrame(frame, content);
+    if (!file->append(frame)) MainQueue::shared().post([failed, reason = *file->failure()] { failed(reason); });
+  };
+}
+
+EventSource makePortSource(const SourceOptions& options, std::unique_ptr<RecordFile> file, const Clock& clock,
+                           SourceHandlers handlers) {
+  diag::Port port(*options.port);
+  if (!port.isOpen()) return {nullptr, nullptr, port.failure()};
+  auto service = std::make_shared<diag::PortService>(std::move(port), options.sim, clock);
+  service->setRemarkHandler(std::move(handlers.remark));
+  service->setEndHandler([ended = std::move(handlers.ended)](const std::string& failure) { ended(failure); });
+  if (file != nullptr) service->setFrameHandler(keepFrames(std::move(file), std::move(handlers.badLine)));
+  diag::PortService& watched = *service;
+  return {std::move(service), [&watched, port = *options.port] { return shown(port, watched.state()); }};
+}
+
+EventSource makeSimulatedSource(const SourceOptions& options, const Clock& clock) {
+  const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
+  const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
+  return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
+          [] { return ShownState{"simulated"}; }, std::nullopt,
+          [&clock] { return std::chrono::duration<double>(clock.now().time_since_epoch()).count(); }};
+}
+
+EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+  auto opened = std::make_unique<EventsInput>(*options.replay, options.sim);
+  const EventsInput& input = *opened;
+  // What a pipe holds is waited for where it is played.
+  if (!input.isLive()) {
+    if (const auto failure = opened->open()) return {nullptr, nullptr, failure};
+    opened->measure();
+  }
+  auto service = std::make_shared<corvik::RecordedService>(std::move(opened), clock, options.playback);
+  service->setBadLineHandler(std::move(handlers.badLine));
+  service->setEndHandler([&input, tell = std::move(handlers.remark),
+                          ended = std::move(handlers.ended)](const std::optional<std::string>& failure) {
+    for (const std::string& remark : input.remarks())
+      tell(remark);
+    ended(failure);
+  });
+  corvik::RecordedService& recorded = *service;
+  return {std::move(service), [&recorded, &input] { return shown(recorded.state(), input.isLive()); }, std::nullopt,
+          [&recorded] { return recorded.state().position; }};
 }
 
 }  // namespace
 
 EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
-  if (!options.replay) {
-    const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
-    const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
-    return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
-            [] { return ShownState{"simulated"}; }};
+  std::string reason;
+  std::unique_ptr<RecordFile> file;
+  if (options.record) {
+    file = RecordFile::create(*options.record, reason);
+    if (file == nullptr) return {nullptr, nullptr, reason};
   }
-  auto recording = std::make_unique<RecordingReader>(*options.replay);
-  const std::optional<std::string> failure = recording->failure();
-  auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
-  service->setBadLineHandler(std::move(handlers.badLine));
-  service->setEndHandler(std::move(handlers.ended));
-  corvik::RecordedService& recorded = *service;
-  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure};
+  if (options.port) return makePortSource(options, std::move(file), clock, std::move(handlers));
+  const auto failed = handlers.badLine;
+  EventSource source =
+      options.replay ? makeReplaySource(options, clock, std::move(handlers)) : makeSimulatedSource(options, clock);
+  if (file != nullptr)
+    source.service = std::make_shared<RecordingService>(source.service, std::move(file), source.seconds, failed);
+  return source;
 }
 
 }  // namespace vesk

@@ -14,8 +14,14 @@ namespace vesk {
 
 /// Which events the program is fed with.
 struct SourceOptions {
-  /// A recording; "-" is standard input. Without one a simulated handset is driven.
+  /// A recording or a capture; "-" is standard input.
   std::optional<std::string> replay;
+  /// A modem's diagnostic port. Without one and without a recording a simulated handset is driven.
+  std::optional<std::string> port;
+  /// Which SIM of a port or a capture; absent for all.
+  std::optional<std::uint32_t> sim;
+  /// Where what comes is kept: of a port the capture, of anything else a recording. Absent for nowhere.
+  std::optional<std::string> record;
   /// Which drive of the handset.
   std::uint64_t seed = 1;
   corvik::Playback playback;
@@ -33,14 +39,18 @@ struct ShownState {
 struct EventSource {
   std::shared_ptr<corvik::Service> service;
   std::function<ShownState()> state;
-  /// Why the recording cannot be read at all.
+  /// Why the recording cannot be read at all, the port not be opened, or nothing be kept.
   std::optional<std::string> failure{};
+  /// How far its own time has come, in seconds from some start; from any thread. Null for a port, whose packets know.
+  std::function<double()> seconds{};
 };
 
 /// What an event source tells; both on the main queue.
 struct SourceHandlers {
-  /// A line that is no event.
+  /// A line that is no event, or that what comes can no longer be kept.
   std::function<void(const std::string& message)> badLine;
+  /// Something that the user should know, and no fault.
+  std::function<void(const std::string& remark)> remark;
   /// Everything has been delivered; `failure` tells why a recording could not be read to its end.
   std::function<void(const std::optional<std::string>& failure)> ended;
 };

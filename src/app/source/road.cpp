@@ -7,10 +7,10 @@
 #include "app/program/app_delegate.h"
 #include "app/program/root_navigation_controller.h"
 #include "app/program/vesk_interface.h"
+#include "app/source/events_input.h"
 #include "app/source/recording_input.h"
 #include "app/source/redaction.h"
 #include "corvik/recorded_service.h"
-#include "recording/recording_reader.h"
 #include "system/clock.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
@@ -43,17 +43,20 @@ Outcome playRecording(const RecordingInput& input, const std::function<void(Navi
     outcome = Outcome::failed;
   };
   Redaction redaction;
+  const EventsInput* events = nullptr;
   std::shared_ptr<corvik::RecordedService> service;
   if (input.path) {
-    auto recording = std::make_unique<RecordingReader>(*input.path);
-    if (recording->failure()) {
-      fail("vesk: " + *recording->failure());
-      return outcome;
-    }
     using Runs = corvik::RecordedService::Runs;
     const bool isWatchedPipe = beforePlaying && *input.path == "-";
+    auto opened = std::make_unique<EventsInput>(*input.path, std::nullopt);
+    // What a pipe holds is waited for where it is played.
+    if (const auto failure = isWatchedPipe ? std::nullopt : opened->open()) {
+      fail("vesk: " + *failure);
+      return outcome;
+    }
+    events = opened.get();
     service =
-        std::make_shared<corvik::RecordedService>(std::move(recording), clock, corvik::Playback{.speed = std::nullopt},
+        std::make_shared<corvik::RecordedService>(std::move(opened), clock, corvik::Playback{.speed = std::nullopt},
                                                   isWatchedPipe ? Runs::onThreadOfItsOwn : Runs::onMainThread);
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
@@ -84,6 +87,8 @@ Outcome playRecording(const RecordingInput& input, const std::function<void(Navi
       loop.run();
       progress.hide();
       if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*input.path);
+      for (const std::string& remark : events->remarks())
+        tellUser(remark);
     }
     use(root);
   });

@@ -1,0 +1,72 @@
+#include "diag/capture/capture_remarks.h"
+
+#include <cstdint>
+#include <optional>
+
+namespace vesk::diag {
+
+namespace {
+
+/// "1 frame", "2 frames".
+std::string counted(std::uint64_t count, const std::string& what) {
+  return std::to_string(count) + ' ' + what + (count == 1 ? "" : "s");
+}
+
+std::string listed(const std::vector<std::uint32_t>& sims) {
+  std::string text;
+  for (std::size_t index = 0; index < sims.size(); ++index) {
+    if (index > 0) text += index + 1 == sims.size() ? " and " : ", ";
+    text += std::to_string(sims[index]);
+  }
+  return text;
+}
+
+using Remark = std::optional<std::string>;
+
+Remark onEnd(const CaptureReader& capture) {
+  if (!capture.isCutOff()) return std::nullopt;
+  return "it ends within a packet, which is left out: was the program that wrote it ended?";
+}
+
+Remark onDamage(const CaptureReader& capture) {
+  const std::uint64_t count = capture.counts().damaged() - (capture.isCutOff() ? 1 : 0);
+  if (count == 0) return std::nullopt;
+  return counted(count, "damaged packet") + (count == 1 ? " was" : " were") + " passed over";
+}
+
+Remark onEncryption(const CaptureReader& capture) {
+  const std::uint64_t count = capture.counts().of(PacketKind::encryptedLog);
+  if (count == 0) return std::nullopt;
+  return counted(count, "log packet") + (count == 1 ? " is" : " are") +
+         " encrypted and cannot be read: the modem's maker has the key";
+}
+
+Remark onSims(const CaptureReader& capture) {
+  const PacketCounts& counts = capture.counts();
+  if (counts.sims().empty() && counts.ofOtherSims() > 0) return "no packet is of the SIM that --sim chooses";
+  if (counts.sims().size() < 2) return std::nullopt;
+  return "it holds the SIMs " + listed(counts.sims()) + ", and all are taken; --sim N takes one";
+}
+
+Remark onClock(const CaptureReader& capture) {
+  if (!capture.counts().hasUnsetClock()) return std::nullopt;
+  return "the modem's clock was not set by a network: dates are of 1980, and only the time between events is right";
+}
+
+Remark onNothingRead(const CaptureReader& capture) {
+  const PacketCounts& counts = capture.counts();
+  if (counts.logs().read > 0 || counts.passedOver() == 0) return std::nullopt;
+  return "nothing in it could be read; vesk import --count tells what it holds";
+}
+
+}  // namespace
+
+std::vector<std::string> remarksOn(const CaptureReader& capture) {
+  std::vector<std::string> remarks;
+  for (const auto remarkOn : {onEnd, onDamage, onEncryption, onSims, onClock, onNothingRead}) {
+    if (const Remark remark = remarkOn(capture)) remarks.push_back(capture.name() + ": " + *remark);
+  }
+  return remarks;
+}
+
+}  // namespace vesk::diag

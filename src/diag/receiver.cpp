@@ -1,0 +1,27 @@
+#include "diag/receiver.h"
+
+#include "diag/translation/log_kind.h"
+
+namespace vesk::diag {
+
+std::span<const Event> Receiver::take(const Packet& packet) {
+  if (packet.log) return take(*packet.log);
+  if (sim_ && packet.sim != *sim_) {
+    counts_.noteOtherSim();
+  } else {
+    counts_.note(packet.kind);
+  }
+  return {};
+}
+
+std::span<const Event> Receiver::take(const LogPacket& packet) {
+  if (sim_ && packet.sim != *sim_) {
+    counts_.noteOtherSim();
+    return {};
+  }
+  const Translation translation = translator_->translate(packet);
+  counts_.noteLog(packet, versionOf(packet), translation.reading);
+  return translation.events;
+}
+
+}  // namespace vesk::diag

@@ -1,0 +1,43 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <span>
+#include <vector>
+
+#include "diag/packet.h"
+#include "diag/translation/event_batch.h"
+#include "diag/translation/sim_state.h"
+
+namespace vesk::diag {
+
+/// What a packet has become.
+struct Translation {
+  Reading reading;
+  /// In the order in which they are to be told; valid until the next packet is translated.
+  std::span<const Event> events;
+};
+
+/// Makes metric events of log packets. Remembers of each SIM what later events are made of, and depends on nothing but
+/// the packets: no clock, no thread, no input or output.
+class Translator {
+ public:
+  [[nodiscard]] Translation translate(const LogPacket& packet);
+
+  /// A modem has a few SIMs. Of more, those that were heard of last are remembered.
+  static constexpr std::size_t kMostSims = 16;
+
+ private:
+  [[nodiscard]] SimState& stateOf(std::uint32_t sim);
+
+  struct Sim {
+    std::uint32_t number;
+    std::unique_ptr<SimState> state;
+  };
+  /// The one that was heard of last comes first.
+  std::vector<Sim> sims_;
+  EventBatch batch_;
+};
+
+}  // namespace vesk::diag
