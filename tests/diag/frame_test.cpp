@@ -68,6 +68,7 @@ TEST(Frame, IsDamagedOrNot) {
       {"7D 20 78 F0 7E", {"00"}},
       {"00 78 F0 7D 7E 00 78 F0 7E", {"damaged", "00"}},
       {"7D 7E", {"damaged"}},
+      {"5D 18 79 7E 7D 7D 18 79 7E", {"5D", "damaged"}},
       {"00 00 7E", {"damaged"}},
       {"00 78 F0", {"damaged"}},
       {"00 78 F0 7E 00", {"00", "damaged"}},

@@ -71,7 +71,7 @@ std::optional<Bytes> FrameReader::unescape(Bytes piece) {
   unescaped_.resize(piece.size());
   std::uint8_t* out = unescaped_.data();
   while (escape < piece.size()) {
-    if (escape + 1 == piece.size()) return std::nullopt;
+    if (escape + 1 == piece.size() || piece[escape + 1] == kEscape) return std::nullopt;
     std::copy_n(piece.data(), escape, out);
     out += escape;
     *out++ = piece[escape + 1] ^ kEscapedBit;

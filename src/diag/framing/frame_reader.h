@@ -33,7 +33,7 @@ class FrameReader {
  private:
   void keep(std::span<const std::uint8_t> bytes);
   [[nodiscard]] Frame read(std::span<const std::uint8_t> piece);
-  /// Absent where an escape is followed by nothing.
+  /// Absent where an escape is followed by nothing, or by another.
   [[nodiscard]] std::optional<std::span<const std::uint8_t>> unescape(std::span<const std::uint8_t> piece);
 
   std::span<const std::uint8_t> rest_;
