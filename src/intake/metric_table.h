@@ -50,5 +50,6 @@ inline constexpr std::int64_t kMetricOfRecord = [] {
 #define HANDLED_METRIC(constant, identifier, Message, record, ...) \
   template <>                                                      \
   inline constexpr std::int64_t kMetricOfRecord<&Stores::record> = constant;
+#include "messages/registry/metrics.def"
 
 }  // namespace vesk

@@ -28,6 +28,7 @@ struct Stores {
 template <SameButConst<Stores> S, class Visit>
 void visitLatestRecords(S& stores, Visit visit) {
 #define DECODED_METRIC(constant, identifier, Message, record) visit(#record, stores.record);
+#include "messages/registry/metrics.def"
 }
 
 /// Calls `visit(name, field)` for each field of all technology stores.
