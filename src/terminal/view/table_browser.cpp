@@ -3,19 +3,14 @@
 #include <algorithm>
 #include <utility>
 
+#include "terminal/view/text_search.h"
+
 namespace vesk {
 
 namespace {
 
-char lowered(char letter) {
-  return 'A' <= letter && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
-}
-
 bool contains(const std::optional<Text>& text, std::string_view part) {
-  if (!text) return false;
-  const std::string_view whole = text->view();
-  return std::search(whole.begin(), whole.end(), part.begin(), part.end(),
-                     [](char a, char b) { return lowered(a) == lowered(b); }) != whole.end();
+  return text && containsIgnoringCase(text->view(), part);
 }
 
 }  // namespace
@@ -200,6 +195,10 @@ void TableBrowser::page(int direction) {
   } else {
     selectFirst();
   }
+}
+
+std::optional<Text> TableBrowser::selectedName() {
+  return selection_ ? content_.row(*selection_).main : std::nullopt;
 }
 
 bool TableBrowser::selectLine(int line) {
