@@ -109,6 +109,7 @@ class Run {
         OutputLines::print({line});
       return;
     }
+    if (!isJudging_) insight_.observeEventsOf(*MetricValidator::shared());
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
       arrivals_.note(metricId);
       terminal_->setNeedsDisplay();
@@ -127,6 +128,7 @@ class Run {
     return {
         .sourceState = [this] { return sourceState(); },
         .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
+        .drive = &insight_,
         .diagnostics = &diagnostics_,
         .setTracking =
             [this](bool isTracking) { loop_.setMode(isTracking ? RunLoopMode::tracking : RunLoopMode::defaultMode); },

@@ -30,7 +30,7 @@ Terminal::Terminal(NavigationController& stack, const Clock& clock, Surroundings
       surroundings_(std::move(surroundings)),
       capabilities_(std::move(capabilities)),
       device_(std::move(terminal), {capabilities_.enterScreen, capabilities_.leaveScreen}),
-      presenter_(stack, surroundings_) {
+      presenter_(stack, surroundings_, capabilities_.signs) {
   stack_.setDisplayObserver([this] { setNeedsDisplay(); });
   if (surroundings_.diagnostics != nullptr) {
     surroundings_.diagnostics->setObserver([this] { setNeedsDisplay(); });
@@ -67,7 +67,7 @@ void Terminal::serve() {
     return;
   }
   const bool isUrgent = !events.empty() || arrived.isStopWanted || arrived.isContinued || arrived.isResized;
-  const bool isFrameDue = needsDisplay_ && now >= lastDrawn_ + kFrame;
+  const bool isFrameDue = needsDisplay_ && now >= nextFrame();
   const bool hasTimeChangedIt = presenter_.nextChange() && *presenter_.nextChange() <= now;
   if (isUrgent || isFrameDue || hasTimeChangedIt) {
     draw(clock_.now());
@@ -119,7 +119,7 @@ void Terminal::scheduleWakeUp(Clock::Instant now) {
   // The device tells by itself when a terminal that is behind has room again.
   if (!device_.isBehind()) {
     consider(presenter_.nextChange());
-    if (needsDisplay_) consider(lastDrawn_ + kFrame);
+    if (needsDisplay_) consider(nextFrame());
   }
   device_.wakeAfter(next ? std::optional(*next - now) : std::nullopt);
 }

@@ -27,6 +27,8 @@ class Terminal {
  public:
   /// However much happens, what nobody typed shows at most this often.
   static constexpr std::chrono::milliseconds kFrame{50};
+  /// The same of the screens that every event changes.
+  static constexpr std::chrono::milliseconds kPanelFrame{100};
 
   /// Takes the terminal over and draws the stack. Null when there is no terminal or it is too simple for
   /// screens; `reason` then says why in one line. `stack` and `clock` must outlive the terminal, and what
@@ -54,6 +56,10 @@ class Terminal {
   void suspend();
   void startAfresh();
   void draw(Clock::Instant now);
+  /// When what nobody typed may show next.
+  [[nodiscard]] Clock::Instant nextFrame() const {
+    return lastDrawn_ + (presenter_.showsPanel() ? kPanelFrame : kFrame);
+  }
   void scheduleWakeUp(Clock::Instant now);
 
   NavigationController& stack_;

@@ -86,6 +86,7 @@ std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, std
   const std::string leaveOtherScreen = textCapability("rmcup");
   found.leaveScreen += leaveOtherScreen.empty() ? found.clear : leaveOtherScreen;
   found.showsUtf8 = showsUtf8;
+  found.signs = signsOf(name, showsUtf8);
 
   const ColorDepth depth = colorDepthOf(tigetnum("colors"), environment("NO_COLOR"));
   const Palette palette = makePalette(depth, backgroundOf(environment("COLORFGBG")));

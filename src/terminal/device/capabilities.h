@@ -5,6 +5,7 @@
 #include <string>
 
 #include "terminal/device/palette.h"
+#include "terminal/device/signs.h"
 
 namespace vesk {
 
@@ -18,6 +19,7 @@ struct Capabilities {
   std::string enterScreen;  ///< takes the terminal over: its other screen, no cursor, no wrapping, mouse reports
   std::string leaveScreen;  ///< gives it back as it was
   bool showsUtf8 = true;
+  Signs signs = Signs::braille;
 
   /// The cursor to a place counted from 0.
   [[nodiscard]] std::string move(int column, int line) const;

@@ -4,6 +4,8 @@
 #include <utility>
 
 #include "terminal/device/column_width.h"
+#include "terminal/panels/kpi_look.h"
+#include "terminal/view/filter_typing.h"
 #include "terminal/view/freshness.h"
 #include "terminal/view/renderer.h"
 
@@ -12,14 +14,15 @@ namespace vesk {
 namespace {
 
 constexpr int kWheelLines = 3;
-
-void removeLastCharacter(std::string& text) {
-  while (!text.empty() && (static_cast<unsigned char>(text.back()) & 0xC0) == 0x80)
-    text.pop_back();
-  if (!text.empty()) text.pop_back();
-}
+/// The screens of the stack down to the values of a category.
+constexpr std::size_t kDepthOfMetrics = 3;
 
 }  // namespace
+
+Presenter::Presenter(NavigationController& stack, Surroundings surroundings, Signs signs)
+    : stack_(stack), surroundings_(std::move(surroundings)) {
+  if (surroundings_.drive != nullptr) panels_.emplace(*surroundings_.drive, surroundings_.goToEvent, signs);
+}
 
 void Presenter::resize(Size size) {
   size_ = size;
@@ -76,68 +79,64 @@ void Presenter::handleKey(const KeyEvent& event) {
   if (isTypingFilter_ && typeIntoFilter(event)) return;
   const std::optional<Action> action = actionOf(event);
   if (!action) return;
-  if (helpStart_) {
+  if (*action == Action::Area) {
+    helpStart_.reset();
+    openArea(event.character - U'1');
+  } else if (helpStart_) {
     performInHelp(*action);
   } else {
     perform(*action);
   }
 }
 
+const std::string* Presenter::filter() {
+  if (panel() != nullptr) return panel()->filter();
+  return browser() != nullptr ? &browser()->filter() : nullptr;
+}
+
+void Presenter::setFilter(std::string filter) {
+  if (panel() != nullptr) {
+    panel()->setFilter(std::move(filter));
+  } else if (browser() != nullptr) {
+    browser()->setFilter(std::move(filter));
+  }
+}
+
 /// False for the keys that mean the same while a filter is typed.
 bool Presenter::typeIntoFilter(const KeyEvent& event) {
-  TableBrowser* shown = browser();
-  if (shown == nullptr) return false;
-  std::string filter = shown->filter();
-  switch (event.key) {
-    case Key::Character:
-      if (event.modifiers.alt || event.modifiers.control) return true;
-      filter += nameOf({Key::Character, event.character});
-      shown->setFilter(std::move(filter));
-      return true;
-    case Key::Backspace:
-      if (filter.empty()) isTypingFilter_ = false;
-      removeLastCharacter(filter);
-      shown->setFilter(std::move(filter));
-      return true;
-    case Key::Enter:
-      isTypingFilter_ = false;
-      return true;
-    case Key::Escape:
-      isTypingFilter_ = false;
-      shown->setFilter({});
-      return true;
-    case Key::Left:
-    case Key::Right:
-      return true;
-    case Key::Tab:
-    case Key::Up:
-    case Key::Down:
-    case Key::PageUp:
-    case Key::PageDown:
-    case Key::Home:
-    case Key::End:
-    case Key::Insert:
-    case Key::Delete:
-      return false;
-  }
-  return false;
+  if (filter() == nullptr) return false;
+  std::optional<TypedFilter> typed = typeInto(*filter(), event);
+  if (!typed) return false;
+  isTypingFilter_ = typed->goesOn;
+  if (typed->filter != *filter()) setFilter(std::move(typed->filter));
+  return true;
+}
+
+/// Of the selected row of a screen of values.
+std::optional<insight::Kpi> Presenter::selectedKpi() {
+  const std::vector<std::string> titles = this->titles();
+  const auto name = titles.size() == kDepthOfMetrics && browser() != nullptr ? browser()->selectedName() : std::nullopt;
+  return name ? kpiOfRow(titles[1], titles[2], name->view()) : std::nullopt;
+}
+
+void Presenter::openArea(std::size_t index) {
+  if (panels_) panels_->close();
+  stack_.popToDepth(1);
+  followStack();
+  if (browser() != nullptr) browser()->screen().selectRow({0, index});
 }
 
 void Presenter::perform(Action action) {
-  TableBrowser* shown = browser();
+  if (panels_ && panels_->perform(action, action == Action::Trend ? selectedKpi() : std::nullopt)) {
+    isTypingFilter_ = false;
+    return;
+  }
   switch (action) {
     case Action::Help:
       helpStart_ = 0;
       return;
-    case Action::Open:
-      return open();
-    case Action::Back:
-      return goBack();
     case Action::Filter:
-      isTypingFilter_ = shown != nullptr;
-      return;
-    case Action::Freeze:
-      if (shown != nullptr) shown->setFrozen(!shown->isFrozen());
+      isTypingFilter_ = filter() != nullptr;
       return;
     case Action::Diagnostics:
       isPaneOpen_ = !isPaneOpen_;
@@ -150,25 +149,38 @@ void Presenter::perform(Action action) {
     case Action::Quit:
       if (surroundings_.quit) surroundings_.quit();
       return;
+    case Action::Open:
+    case Action::Back:
+    case Action::Freeze:
     case Action::Up:
-      if (shown != nullptr) shown->moveSelection(-1);
-      return;
     case Action::Down:
-      if (shown != nullptr) shown->moveSelection(+1);
-      return;
     case Action::PageUp:
-      if (shown != nullptr) shown->page(-1);
-      return;
     case Action::PageDown:
-      if (shown != nullptr) shown->page(+1);
-      return;
     case Action::First:
-      if (shown != nullptr) shown->selectFirst();
-      return;
     case Action::Last:
-      if (shown != nullptr) shown->selectLast();
+      return performOnTable(action);
+    case Action::Overview:
+    case Action::Trend:
+    case Action::Timeline:
+    case Action::Cells:
+    case Action::Sort:
+    case Action::Area:
       return;
   }
+}
+
+void Presenter::performOnTable(Action action) {
+  if (action == Action::Back) return goBack();
+  TableBrowser* shown = browser();
+  if (shown == nullptr) return;
+  if (action == Action::Open) open();
+  if (action == Action::Freeze) shown->setFrozen(!shown->isFrozen());
+  if (action == Action::Up) shown->moveSelection(-1);
+  if (action == Action::Down) shown->moveSelection(+1);
+  if (action == Action::PageUp) shown->page(-1);
+  if (action == Action::PageDown) shown->page(+1);
+  if (action == Action::First) shown->selectFirst();
+  if (action == Action::Last) shown->selectLast();
 }
 
 void Presenter::performInHelp(Action action) {
@@ -195,6 +207,12 @@ void Presenter::performInHelp(Action action) {
     case Action::Open:
     case Action::Filter:
     case Action::Freeze:
+    case Action::Overview:
+    case Action::Trend:
+    case Action::Timeline:
+    case Action::Cells:
+    case Action::Sort:
+    case Action::Area:
     case Action::Diagnostics:
     case Action::OlderLines:
     case Action::NewerLines:
@@ -242,6 +260,8 @@ void Presenter::handleMouse(const MouseEvent& event) {
         scrollPane(lines);
       } else if (helpStart_) {
         scrollHelp(lines);
+      } else if (panel() != nullptr) {
+        panel()->scroll(lines);
       } else if (shown != nullptr) {
         shown->scroll(lines);
       }
@@ -252,7 +272,7 @@ void Presenter::handleMouse(const MouseEvent& event) {
       held_ = event;
       return;
     case MouseAction::Drag:
-      if (!held_ || shown == nullptr || helpStart_) return;
+      if (!held_ || shown == nullptr || helpStart_ || panel() != nullptr) return;
       if (!isTracking_ && (event.line == held_->line || !regions().list.has(held_->line))) return;
       setTracking(true);
       shown->scroll(held_->line - event.line);
@@ -268,15 +288,26 @@ void Presenter::handleMouse(const MouseEvent& event) {
   }
 }
 
+/// Of the path: the table screens, then the panels over them.
+void Presenter::goToDepth(std::size_t depth) {
+  const std::size_t tables = stack_.stack().size();
+  if (panels_) panels_->close(depth > tables ? depth - tables : 0);
+  if (depth < tables) stack_.popToDepth(depth);
+}
+
 void Presenter::click(const MouseEvent& event) {
   const Regions regions = this->regions();
   if (event.line == regions.bar) {
     for (const PathSegment& segment : pathBar(statusWidth_).segments) {
       const int column = event.column - kBarMargin;
-      if (segment.column <= column && column < segment.end) stack_.popToDepth(segment.depth);
+      if (segment.column <= column && column < segment.end) goToDepth(segment.depth);
     }
   } else if (helpStart_) {
     helpStart_.reset();
+  } else if (panel() != nullptr) {
+    if (regions.panel(size_.columns).has(event.column, event.line)) {
+      panel()->click(event.column, event.line - regions.title);
+    }
   } else if (regions.list.has(event.line) && event.column < regions.listColumns) {
     TableBrowser* shown = browser();
     if (shown != nullptr && shown->selectLine(event.line - regions.list.start)) open();
@@ -293,7 +324,12 @@ std::vector<std::string> Presenter::titles() const {
 }
 
 PathBar Presenter::pathBar(int statusWidth) const {
-  return layOutPath(titles(), statusColumn(size_.columns, statusWidth) - 1 - kBarMargin);
+  std::vector<std::string> names = titles();
+  if (panels_) {
+    for (const Panel* each : panels_->shown())
+      names.emplace_back(each->title());
+  }
+  return layOutPath(names, statusColumn(size_.columns, statusWidth) - 1 - kBarMargin);
 }
 
 void Presenter::expectChange(std::optional<Clock::Instant> when) {
@@ -312,9 +348,23 @@ Picture Presenter::picture(Clock::Instant now) {
   statusWidth_ = textWidth(picture.status);
   picture.path = pathBar(statusWidth_);
 
+  picture.helpStart = helpStart_;
+  if (filter() != nullptr) picture.filter = *filter();
+  picture.isTypingFilter = isTypingFilter_ && filter() != nullptr;
+  if (panel() != nullptr) {
+    picture.panel = panel();
+    picture.hints = panel()->hints();
+    picture.isFrozen = panels_->isHeld();
+  } else {
+    fillTable(picture, now);
+  }
+  fillPane(picture);
+  return picture;
+}
+
+void Presenter::fillTable(Picture& picture, Clock::Instant now) {
   const std::vector<std::string> titles = this->titles();
   if (!titles.empty()) picture.title = titles.back();
-  constexpr std::size_t kDepthOfMetrics = 3;
   if (titles.size() == kDepthOfMetrics && surroundings_.arrivals) {
     if (const std::optional<Arrivals> arrivals = surroundings_.arrivals(titles[1], titles[2])) {
       Freshness freshness = freshnessOf(*arrivals, now);
@@ -322,16 +372,11 @@ Picture Presenter::picture(Clock::Instant now) {
       expectChange(freshness.nextChange);
     }
   }
-  picture.helpStart = helpStart_;
   if (TableBrowser* shown = browser()) {
     picture.isFrozen = shown->isFrozen();
     picture.lines = shown->lines();
     picture.extent = shown->scrollExtent();
-    picture.filter = shown->filter();
-    picture.isTypingFilter = isTypingFilter_;
   }
-  fillPane(picture);
-  return picture;
 }
 
 void Presenter::fillPane(Picture& picture) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <optional>
@@ -8,6 +9,7 @@
 
 #include "terminal/input/input_event.h"
 #include "terminal/input/key_bindings.h"
+#include "terminal/panels/panel_stack.h"
 #include "terminal/view/picture.h"
 #include "terminal/view/surroundings.h"
 #include "terminal/view/table_browser.h"
@@ -20,8 +22,7 @@ namespace vesk {
 class Presenter {
  public:
   /// `stack` must outlive the presenter.
-  Presenter(NavigationController& stack, Surroundings surroundings)
-      : stack_(stack), surroundings_(std::move(surroundings)) {}
+  Presenter(NavigationController& stack, Surroundings surroundings, Signs signs = Signs::braille);
 
   void resize(Size size);
   void handle(const InputEvent& event);
@@ -30,6 +31,8 @@ class Presenter {
 
   /// What shows at `now`, as of the toolkit's present state.
   [[nodiscard]] Picture picture(Clock::Instant now);
+  /// Whether what shows has a drawing for every event, which is not worth drawing as often as a table.
+  [[nodiscard]] bool showsPanel() const { return panel() != nullptr; }
   /// When the last picture will be another one by the passing of time alone.
   [[nodiscard]] std::optional<Clock::Instant> nextChange() const { return nextChange_; }
 
@@ -44,8 +47,11 @@ class Presenter {
   void handleMouse(const MouseEvent& event);
   void perform(Action action);
   void performInHelp(Action action);
+  void performOnTable(Action action);
   bool typeIntoFilter(const KeyEvent& event);
+  void openArea(std::size_t index);
   void click(const MouseEvent& event);
+  void goToDepth(std::size_t depth);
   void open();
   void goBack();
   void scrollHelp(int lines);
@@ -57,12 +63,20 @@ class Presenter {
   void followStack();
   [[nodiscard]] TableBrowser* browser() { return screens_.empty() ? nullptr : screens_.back().browser.get(); }
   [[nodiscard]] Regions regions() const { return Regions::of(size_, isPaneOpen_); }
+  [[nodiscard]] Panel* panel() const { return panels_ ? panels_->top() : nullptr; }
+  /// Of what shows; null where nothing can be filtered.
+  [[nodiscard]] const std::string* filter();
+  void setFilter(std::string filter);
+  [[nodiscard]] std::optional<insight::Kpi> selectedKpi();
   [[nodiscard]] std::vector<std::string> titles() const;
+  void fillTable(Picture& picture, Clock::Instant now);
   [[nodiscard]] PathBar pathBar(int statusWidth) const;
   void expectChange(std::optional<Clock::Instant> when);
 
   NavigationController& stack_;
   Surroundings surroundings_;
+  /// Absent without insight.
+  std::optional<PanelStack> panels_;
   Size size_;
   /// One for each screen of the stack, as of the last followStack.
   std::vector<Screen> screens_;

@@ -6,6 +6,7 @@
 #include <string>
 #include <string_view>
 
+#include "insight/present.h"
 #include "system/clock.h"
 #include "terminal/view/diagnostic_lines.h"
 
@@ -30,6 +31,10 @@ struct Surroundings {
   std::function<SourceState()> sourceState;
   /// Absent for an area and category that no metric feeds.
   std::function<std::optional<Arrivals>(std::string_view area, std::string_view category)> arrivals;
+  /// What the drive comes to, for the screens over the tables; without it there are none. Must outlive the terminal.
+  const insight::Present* drive = nullptr;
+  /// Goes to the moment of an event; absent where the source cannot.
+  std::function<void(const insight::TimelineEvent& event)> goToEvent{};
   /// Must outlive the terminal.
   DiagnosticLines* diagnostics = nullptr;
   /// While true, the user holds a list with the mouse: timers of the default mode wait.

@@ -197,6 +197,10 @@ void TableBrowser::page(int direction) {
   }
 }
 
+std::optional<Text> TableBrowser::selectedName() {
+  return selection_ ? content_.row(*selection_).main : std::nullopt;
+}
+
 bool TableBrowser::selectLine(int line) {
   const Position hit = moved(top_, line);
   if (hit.entry >= entries_.size() || !entries_[hit.entry].isRow) return false;

@@ -59,6 +59,8 @@ class TableBrowser {
   void page(int direction);
 
   [[nodiscard]] std::optional<IndexPath> selection() const { return selection_; }
+  /// The name in the selected row.
+  [[nodiscard]] std::optional<Text> selectedName();
   /// Selects the row that shows in a line of the viewport; false when none does.
   bool selectLine(int line);
 
