@@ -23,6 +23,14 @@ std::string playingTime(double seconds) {
   return text;
 }
 
+/// "×1", "×0.5", "×max".
+std::string speedText(const std::optional<double>& speed) {
+  if (!speed) return "×max";
+  char text[32];
+  std::snprintf(text, sizeof text, "×%g", *speed);
+  return text;
+}
+
 ShownState shown(const corvik::PlaybackState& state) {
   using Phase = corvik::PlaybackState::Phase;
   switch (state.phase) {
@@ -30,13 +38,17 @@ ShownState shown(const corvik::PlaybackState& state) {
     case Phase::waitingForInput:
       return {"waiting"};
     case Phase::ended:
-      return {"ended"};
+      return {"ended", false, 0};
     case Phase::playing:
       break;
   }
   // A pipe has no length, and is as good as live.
   if (!state.duration) return {"live"};
-  return {"replaying " + playingTime(state.position) + " of " + playingTime(*state.duration), true};
+  const std::string_view sign = state.isSeeking ? "▶▶ " : state.isHeld ? "▮▮ " : "▶ ";
+  const bool isMoving = !state.isHeld || state.isSeeking;
+  return {std::string(sign) + speedText(state.speed) + "  " + playingTime(state.position) + " of " +
+              playingTime(*state.duration),
+          isMoving, isMoving && !state.isSeeking ? state.speed.value_or(0) : 0};
 }
 
 }  // namespace
@@ -53,8 +65,9 @@ EventSource makeEventSource(const SourceOptions& options, const Clock& clock, So
   auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));
   service->setEndHandler(std::move(handlers.ended));
+  service->setSeekHandlers(std::move(handlers.seekBegun), std::move(handlers.seekEnded));
   corvik::RecordedService& recorded = *service;
-  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure};
+  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure, &recorded.player()};
 }
 
 }  // namespace vesk

@@ -7,9 +7,10 @@
 #include <vector>
 
 #include "app/app_delegate.h"
-#include "app/metric_arrivals.h"
 #include "app/redaction.h"
+#include "app/replay_control.h"
 #include "app/road.h"
+#include "app/shown_moment.h"
 #include "app/stop_signals.h"
 #include "app/vesk_interface.h"
 #include "insight/insight.h"
@@ -37,7 +38,9 @@ class Run {
   Outcome run() {
     source_ = makeEventSource(options_.source, clock_,
                               {[this](const std::string& message) { tell(message); },
-                               [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
+                               [this](const std::optional<std::string>& failure) { sourceEnded(failure); },
+                               [this](bool isFromStart) { seekBegun(isFromStart); }, [this] { seekEnded(); }});
+    control_.setPlayer(source_.player);
     if (source_.failure) {
       tellUser("vesk: " + *source_.failure);
       return Outcome::failed;
@@ -80,7 +83,9 @@ class Run {
       end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
     }
     if (isJudging_) judgeRules();
+    root_ = &root;
     if (!isHeadless_) openTerminal(application, root);
+    if (isJudging_ || !isHeadless_) insight_.observeEventsOf(*MetricValidator::shared());
     const std::optional<std::string> reason = whyNoMetricArrives(root);
     if (reason) tell(*reason);
     if (!reason || !isHeadless_) loop_.run();
@@ -88,13 +93,19 @@ class Run {
     MetricValidator::shared()->setEventObserver(nullptr);
   }
 
-  /// Those that fire are told among the diagnostic lines.
+  /// Those that fire are told among the diagnostic lines, and on the screens.
   void judgeRules() {
-    insight_.setStepHandler([](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
-      for (const insight::TimelineEvent& event : events)
-        if (event.kind == insight::EventKind::alert) OutputLines::print({"Alert:", textOf(event)});
-    });
-    insight_.observeEventsOf(*MetricValidator::shared());
+    insight_.setStepHandler(
+        [this](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
+          for (const insight::TimelineEvent& event : events)
+            if (event.kind == insight::EventKind::alert) tellAlert(textOf(event));
+        });
+  }
+
+  void tellAlert(const std::string& alert) {
+    if (isOnTheWay_) return;
+    OutputLines::print({"Alert:", alert});
+    if (terminal_ != nullptr) terminal_->tell("Alert: " + alert, true);
   }
 
   void openTerminal(Application& application, NavigationController& root) {
@@ -109,9 +120,8 @@ class Run {
         OutputLines::print({line});
       return;
     }
-    if (!isJudging_) insight_.observeEventsOf(*MetricValidator::shared());
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
-      arrivals_.note(metricId);
+      moment_.noteArrival(metricId);
       terminal_->setNeedsDisplay();
     });
     loop_.addInput(terminal_->descriptor(), [this] { terminal_->serve(); });
@@ -125,10 +135,13 @@ class Run {
   }
 
   Surroundings surroundings(Application& application) {
-    return {
+    Surroundings surroundings{
         .sourceState = [this] { return sourceState(); },
-        .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
+        .setHeld = [this](bool isHeld) { setHeld(isHeld); },
+        .changeSpeed = [this](int step) { changeSpeed(step); },
+        .jump = [this](std::chrono::seconds distance) { control_.jump(distance); },
         .drive = &insight_,
+        .goToEvent = [this](const insight::TimelineEvent& event) { control_.goTo(event); },
         .diagnostics = &diagnostics_,
         .setTracking =
             [this](bool isTracking) { loop_.setMode(isTracking ? RunLoopMode::tracking : RunLoopMode::defaultMode); },
@@ -142,12 +155,58 @@ class Run {
               }
             },
     };
+    moment_.addTo(surroundings);
+    return surroundings;
   }
 
   SourceState sourceState() {
     const ShownState shown = source_.state();
-    if (!shown.isMoving) return {shown.text};
-    return {shown.text, clock_.now() + std::chrono::seconds(1)};
+    std::optional<Clock::Instant> nextChange;
+    if (shown.isMoving) nextChange = clock_.now() + std::chrono::seconds(1);
+    return {shown.text, nextChange, moment_.date()};
+  }
+
+  void setHeld(bool isHeld) {
+    isHeld_ = isHeld;
+    moment_.keepTime();
+    control_.setHeld(isHeld);
+    if (!isOnTheWay_) showMoment();
+  }
+
+  void changeSpeed(int step) {
+    moment_.keepTime();
+    control_.changeSpeed(step);
+  }
+
+  /// What was shown stays until the moment that is sought has come.
+  void seekBegun(bool isFromStart) {
+    isOnTheWay_ = true;
+    if (terminal_ != nullptr) terminal_->setOnTheWay(true);
+    if (!moment_.isHeld()) moment_.hold();
+    OutputLines::setSink(nullptr);
+    if (!isFromStart) return;
+    MetricValidator& intake = *MetricValidator::shared();
+    intake.stores = {};
+    intake.metricID.reset();
+    insight_.startAnew();
+    moment_.startAnew();
+  }
+
+  void seekEnded() {
+    isOnTheWay_ = false;
+    OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    showMoment();
+    if (auto* table = dynamic_cast<TableViewController*>(root_->topViewController().get()))
+      table->tableView().reloadData();
+    if (terminal_ != nullptr) terminal_->setOnTheWay(false);
+  }
+
+  void showMoment() {
+    if (isHeld_) {
+      moment_.hold();
+    } else {
+      moment_.release();
+    }
   }
 
   /// To the user where there are no screens, and to the diagnostic lines where there are.
@@ -179,10 +238,18 @@ class Run {
   RunLoop loop_{clock_};
   const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
-  MetricArrivals arrivals_{clock_};
   Redaction redaction_;
   EventSource source_;
   insight::Insight insight_;
+  ShownMoment moment_{clock_, insight_, [this] { return source_.state().pace; }};
+  ReplayControl control_{[this](const std::string& reason) {
+    if (terminal_ != nullptr) terminal_->tell(reason, false);
+  }};
+  /// By the user.
+  bool isHeld_ = false;
+  /// To the moment that is sought.
+  bool isOnTheWay_ = false;
+  NavigationController* root_ = nullptr;
   AppDelegate delegate_;
   std::unique_ptr<Terminal> terminal_;
 };

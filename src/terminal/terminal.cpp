@@ -81,6 +81,23 @@ void Terminal::setNeedsDisplay() {
   scheduleWakeUp(clock_.now());
 }
 
+void Terminal::setOnTheWay(bool isOnTheWay) {
+  presenter_.setOnTheWay(isOnTheWay);
+  setNeedsDisplay();
+}
+
+void Terminal::tell(std::string notice, bool rings) {
+  constexpr std::chrono::seconds kShown{6};
+  constexpr std::chrono::seconds kQuiet{1};
+  const Clock::Instant now = clock_.now();
+  presenter_.tell(std::move(notice), now + kShown);
+  if (rings && now >= lastRung_ + kQuiet) {
+    device_.write("\a");
+    lastRung_ = now;
+  }
+  setNeedsDisplay();
+}
+
 void Terminal::suspend() {
   presenter_.forgetMouse();
   if (surroundings_.setInBackground) surroundings_.setInBackground(true);

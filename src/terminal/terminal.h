@@ -48,6 +48,11 @@ class Terminal {
   /// Takes the input, follows the terminal's size and the stopping of the program, draws what is to be drawn.
   void serve();
 
+  /// While the replay goes to another moment, what shows stays as it is; then it is that of the moment.
+  void setOnTheWay(bool isOnTheWay);
+  /// Shows a line for some seconds, and rings where it is worth looking up for.
+  void tell(std::string notice, bool rings);
+
   /// Something that shows may have changed: the stack, the source's state, the arrivals. Cheap, so call it as
   /// often as it is true. The stack and the diagnostic lines tell it by themselves.
   void setNeedsDisplay();
@@ -73,6 +78,7 @@ class Terminal {
   Grid shown_;
   bool needsDisplay_ = false;
   bool isServing_ = false;
+  Clock::Instant lastRung_;
   Clock::Instant lastDrawn_;
 };
 

@@ -19,7 +19,12 @@ const KeyBinding kBindings[] = {
     {Action::Open, {{Key::Enter}, {Key::Right}, letter(U'l')}, "open", "open the selected row"},
     {Action::Back, {{Key::Escape}, {Key::Left}, letter(U'h'), {Key::Backspace}}, "back", "clear the filter, go back"},
     {Action::Filter, {letter(U'/')}, "filter", "show only rows with what is typed"},
-    {Action::Freeze, {letter(U'f')}, "freeze", "hold the screen; intake goes on"},
+    {Action::Freeze, {letter(U' '), letter(U'f')}, "hold", "hold all that shows, and the replay; intake goes on"},
+    {Action::Backward, {letter(U'<')}, "", "10 s back in the replay"},
+    {Action::Forward, {letter(U'>')}, "", "10 s forward in the replay"},
+    {Action::Faster, {letter(U'+')}, "", "a faster replay"},
+    {Action::Slower, {letter(U'-')}, "", "a slower replay"},
+    {Action::Readings, {letter(U'u')}, "", "show or hide what the values mean"},
     {Action::Overview, {letter(U'o')}, "overview", "where the phone is and how it is doing, on one screen"},
     {Action::Trend, {letter(U't')}, "trend", "the course of the selected figure"},
     {Action::Timeline, {letter(U'e')}, "events", "what happened and when; Enter shows all fields"},
@@ -72,6 +77,7 @@ std::optional<Action> actionOf(const KeyEvent& event) {
 std::string nameOf(const BoundKey& key) {
   switch (key.key) {
     case Key::Character: {
+      if (key.character == U' ') return "Space";
       std::string name;
       appendCodePoint(name, key.character);
       return name;

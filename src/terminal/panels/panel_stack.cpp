@@ -13,7 +13,6 @@ PanelStack::PanelStack(const insight::Present& drive, TimelinePanel::GoToEvent g
 
 void PanelStack::close(std::size_t count) {
   if (shown_.size() > count) shown_.resize(count);
-  if (shown_.empty()) setHeld(false);
 }
 
 void PanelStack::show(Panel& panel) {
@@ -52,10 +51,6 @@ bool PanelStack::perform(Action action, std::optional<insight::Kpi> rowKpi) {
       if (top() == nullptr) return false;
       if (!top()->perform(action)) close(shown_.size() - 1);
       return true;
-    case Action::Freeze:
-      if (top() == nullptr) return false;
-      setHeld(!isHeld());
-      return true;
     case Action::Open:
     case Action::Sort:
     case Action::Up:
@@ -68,6 +63,12 @@ bool PanelStack::perform(Action action, std::optional<insight::Kpi> rowKpi) {
       return top() != nullptr;
     case Action::Help:
     case Action::Filter:
+    case Action::Freeze:
+    case Action::Backward:
+    case Action::Forward:
+    case Action::Faster:
+    case Action::Slower:
+    case Action::Readings:
     case Action::Diagnostics:
     case Action::OlderLines:
     case Action::NewerLines:

@@ -36,7 +36,6 @@ class PanelStack : private PanelOpener {
 
   /// Holds what the panels show while the drive goes on.
   void setHeld(bool isHeld) { drive_.setHeld(isHeld); }
-  [[nodiscard]] bool isHeld() const { return drive_.isHeld(); }
 
  private:
   void openTrend(insight::Kpi kpi) override;

@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "terminal/input/key_bindings.h"
+#include "values/utf8.h"
 
 namespace vesk {
 
@@ -19,7 +19,7 @@ void removeLastCharacter(std::string& text) {
 std::optional<TypedFilter> typeInto(std::string filter, const KeyEvent& event) {
   switch (event.key) {
     case Key::Character:
-      if (!event.modifiers.alt && !event.modifiers.control) filter += nameOf({Key::Character, event.character});
+      if (!event.modifiers.alt && !event.modifiers.control) appendCodePoint(filter, event.character);
       return TypedFilter{std::move(filter), true};
     case Key::Backspace: {
       const bool goesOn = !filter.empty();

@@ -66,6 +66,9 @@ struct Picture {
   Panel* panel = nullptr;
   std::span<const Action> hints = tableHints();
 
+  /// In the place of the hints; empty for none.
+  std::string notice{};
+
   std::string filter{};
   bool isTypingFilter = false;
 

@@ -14,6 +14,7 @@ namespace vesk {
 namespace {
 
 constexpr int kWheelLines = 3;
+constexpr std::chrono::seconds kJump{10};
 /// The screens of the stack down to the values of a category.
 constexpr std::size_t kDepthOfMetrics = 3;
 
@@ -48,21 +49,64 @@ void Presenter::followStack() {
   if (differs != screens_.end() || screens_.size() < stack.size()) {
     isTypingFilter_ = false;
     screens_.erase(differs, screens_.end());
-    for (std::size_t depth = screens_.size(); depth < stack.size(); ++depth) {
-      auto* table = dynamic_cast<TableViewController*>(stack[depth].get());
-      screens_.push_back({stack[depth], table != nullptr ? std::make_unique<TableBrowser>(*table) : nullptr});
-    }
+    for (std::size_t depth = screens_.size(); depth < stack.size(); ++depth)
+      addScreen(stack[depth]);
     for (const Screen& screen : screens_) {
-      if (screen.browser == nullptr) continue;
-      if (screen.browser->isFrozen()) screen.browser->setFrozen(false);
-      if (!screen.browser->filter().empty()) screen.browser->setFilter({});
+      if (screen.browser != nullptr && !screen.browser->filter().empty()) screen.browser->setFilter({});
     }
   }
   if (TableBrowser* shown = browser()) {
     const Regions regions = this->regions();
     shown->setViewport({regions.listColumns, std::max(regions.list.count(), 1)});
     shown->follow();
+    noteArrivals(screens_.back(), *shown);
+    if (isHolding() && !shown->isFrozen()) shown->setFrozen(true);
   }
+}
+
+void Presenter::addScreen(const std::shared_ptr<ViewController>& controller) {
+  Screen& screen = screens_.emplace_back(Screen{controller, nullptr});
+  auto* table = dynamic_cast<TableViewController*>(controller.get());
+  if (table == nullptr) return;
+  TableContent::ReadingOf readingOf;
+  if (screens_.size() == kDepthOfMetrics && surroundings_.reading) {
+    readingOf = [this, titles = titles()](IndexPath at, std::string_view name) {
+      return surroundings_.reading(titles[1], titles[2], at, name);
+    };
+  }
+  screen.browser = std::make_unique<TableBrowser>(*table, std::move(readingOf));
+}
+
+/// The rows are as old as what had come when they were taken over, however much has come since.
+void Presenter::noteArrivals(Screen& screen, const TableBrowser& shown) {
+  if (screens_.size() != kDepthOfMetrics || !surroundings_.arrivals || screen.reload == shown.reloadCount()) return;
+  screen.reload = shown.reloadCount();
+  const std::vector<std::string> titles = this->titles();
+  screen.arrivals = surroundings_.arrivals(titles[1], titles[2]);
+}
+
+void Presenter::hold(bool isHeld) {
+  for (const Screen& screen : screens_)
+    if (screen.browser != nullptr) screen.browser->setFrozen(isHeld);
+  if (panels_) panels_->setHeld(isHeld);
+}
+
+void Presenter::toggleHold() {
+  isHeld_ = !isHeld_;
+  if (surroundings_.setHeld) surroundings_.setHeld(isHeld_);
+  hold(isHolding());
+}
+
+void Presenter::setOnTheWay(bool isOnTheWay) {
+  if (!std::exchange(isOnTheWay_, isOnTheWay) && !isOnTheWay) return;
+  if (!isOnTheWay) hold(false);
+  followStack();
+  hold(isHolding());
+}
+
+void Presenter::tell(std::string notice, Clock::Instant until) {
+  notice_ = std::move(notice);
+  noticeEnd_ = until;
 }
 
 void Presenter::handle(const InputEvent& event) {
@@ -149,9 +193,21 @@ void Presenter::perform(Action action) {
     case Action::Quit:
       if (surroundings_.quit) surroundings_.quit();
       return;
+    case Action::Freeze:
+      return toggleHold();
+    case Action::Backward:
+      return jump(-kJump);
+    case Action::Forward:
+      return jump(+kJump);
+    case Action::Faster:
+      return changeSpeed(+1);
+    case Action::Slower:
+      return changeSpeed(-1);
+    case Action::Readings:
+      showsReadings_ = !showsReadings_;
+      return;
     case Action::Open:
     case Action::Back:
-    case Action::Freeze:
     case Action::Up:
     case Action::Down:
     case Action::PageUp:
@@ -174,13 +230,20 @@ void Presenter::performOnTable(Action action) {
   TableBrowser* shown = browser();
   if (shown == nullptr) return;
   if (action == Action::Open) open();
-  if (action == Action::Freeze) shown->setFrozen(!shown->isFrozen());
   if (action == Action::Up) shown->moveSelection(-1);
   if (action == Action::Down) shown->moveSelection(+1);
   if (action == Action::PageUp) shown->page(-1);
   if (action == Action::PageDown) shown->page(+1);
   if (action == Action::First) shown->selectFirst();
   if (action == Action::Last) shown->selectLast();
+}
+
+void Presenter::jump(std::chrono::seconds distance) {
+  if (surroundings_.jump) surroundings_.jump(distance);
+}
+
+void Presenter::changeSpeed(int step) {
+  if (surroundings_.changeSpeed) surroundings_.changeSpeed(step);
 }
 
 void Presenter::performInHelp(Action action) {
@@ -207,6 +270,11 @@ void Presenter::performInHelp(Action action) {
     case Action::Open:
     case Action::Filter:
     case Action::Freeze:
+    case Action::Backward:
+    case Action::Forward:
+    case Action::Faster:
+    case Action::Slower:
+    case Action::Readings:
     case Action::Overview:
     case Action::Trend:
     case Action::Timeline:
@@ -343,18 +411,23 @@ Picture Presenter::picture(Clock::Instant now) {
   if (surroundings_.sourceState) {
     SourceState state = surroundings_.sourceState();
     picture.status = std::move(state.text);
+    if (!state.date.empty()) picture.status += dateBehind(picture.status, state.date);
     expectChange(state.nextChange);
   }
   statusWidth_ = textWidth(picture.status);
+  if (noticeEnd_ && now < *noticeEnd_) {
+    picture.notice = notice_;
+    expectChange(noticeEnd_);
+  }
   picture.path = pathBar(statusWidth_);
 
   picture.helpStart = helpStart_;
+  picture.isFrozen = isHeld_;
   if (filter() != nullptr) picture.filter = *filter();
   picture.isTypingFilter = isTypingFilter_ && filter() != nullptr;
   if (panel() != nullptr) {
     picture.panel = panel();
     picture.hints = panel()->hints();
-    picture.isFrozen = panels_->isHeld();
   } else {
     fillTable(picture, now);
   }
@@ -365,17 +438,61 @@ Picture Presenter::picture(Clock::Instant now) {
 void Presenter::fillTable(Picture& picture, Clock::Instant now) {
   const std::vector<std::string> titles = this->titles();
   if (!titles.empty()) picture.title = titles.back();
-  if (titles.size() == kDepthOfMetrics && surroundings_.arrivals) {
-    if (const std::optional<Arrivals> arrivals = surroundings_.arrivals(titles[1], titles[2])) {
-      Freshness freshness = freshnessOf(*arrivals, now);
-      picture.freshness = std::move(freshness.text);
-      expectChange(freshness.nextChange);
-    }
+  if (titles.size() == kDepthOfMetrics && screens_.back().arrivals) {
+    picture.freshness = timeBound(freshnessOf(*screens_.back().arrivals, driveTime()), now);
+    const std::string instead = technologyInstead(titles[1], titles[2]);
+    if (!instead.empty()) picture.freshness += ", the handset is on " + instead;
   }
   if (TableBrowser* shown = browser()) {
-    picture.isFrozen = shown->isFrozen();
-    picture.lines = shown->lines();
+    picture.lines = shown->lines(showsReadings_);
     picture.extent = shown->scrollExtent();
+  }
+  if (titles.size() == kDepthOfMetrics - 1) addHeadlines(picture, titles[1], now);
+}
+
+/// What the drive's date takes behind the status; nothing where the path would lose by it.
+std::string Presenter::dateBehind(std::string_view status, std::string_view date) const {
+  constexpr int kGap = 2;
+  const std::string behind = std::string(kGap, ' ') + std::string(date);
+  const int width = textWidth(status) + textWidth(behind);
+  return pathBar(width).text == pathBar(0).text && width + kBarMargin + kGap < size_.columns ? behind : std::string();
+}
+
+std::chrono::milliseconds Presenter::driveTime() const {
+  return surroundings_.driveMoment ? surroundings_.driveMoment().time : std::chrono::milliseconds(0);
+}
+
+/// The text, which is to be written anew when it is another one.
+std::string Presenter::timeBound(Freshness freshness, Clock::Instant now) {
+  const double pace = surroundings_.driveMoment ? surroundings_.driveMoment().pace : 0;
+  if (freshness.untilChange && pace > 0)
+    expectChange(now + std::chrono::duration_cast<Clock::Duration>(*freshness.untilChange / pace));
+  return std::move(freshness.text);
+}
+
+std::string Presenter::technologyInstead(std::string_view area, std::string_view category) const {
+  return surroundings_.technologyInstead ? surroundings_.technologyInstead(area, category) : std::string();
+}
+
+/// Each category's most telling value and its age, or as much of it as fits.
+void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Instant now) {
+  constexpr int kGap = 2;
+  if (!surroundings_.headline || !surroundings_.arrivals) return;
+  for (ListLine& line : picture.lines) {
+    if (!line.isFirstOfRow) continue;
+    const std::string_view category = line.text.name;
+    const std::optional<Arrivals> arrivals = surroundings_.arrivals(area, category);
+    if (!arrivals || !arrivals->last) continue;
+    const std::string headline = surroundings_.headline(area, category);
+    const std::string age = timeBound(ageOf(*arrivals, driveTime()), now);
+    const std::string instead = technologyInstead(area, category);
+    const int room = rowTextEnd(regions().listColumns, line.hasDisclosure) - kRowGutter - textWidth(category) - kGap;
+    const std::string both = headline.empty() ? age : headline + "  " + age;
+    for (const std::string& note : {both + (instead.empty() ? "" : ", now " + instead), both, age}) {
+      if (textWidth(note) > room) continue;
+      line.note = note;
+      break;
+    }
   }
 }
 

@@ -87,7 +87,7 @@ class Renderer {
 
   /// Where the columns before the mark end.
   int drawFrozenMark() {
-    constexpr std::string_view kMark = " FROZEN ";
+    constexpr std::string_view kMark = " HELD ";
     const int end = width() - 1;
     if (!picture_.isFrozen) return end;
     const int start = end - static_cast<int>(kMark.size());
@@ -113,9 +113,11 @@ class Renderer {
   void drawRowLine(int line, const ListLine& row) {
     Role name = Role::Plain;
     Role value = row.isChanged ? Role::Changed : Role::Value;
+    Role aside = Role::Faint;
     if (row.isSelected) {
       name = Role::Selected;
       value = row.isChanged ? Role::SelectedChanged : Role::Selected;
+      aside = Role::Selected;
       grid_.fill(0, line, Role::Selected, regions_.listColumns);
     }
     const int end = rowTextEnd(regions_.listColumns, row.hasDisclosure);
@@ -125,8 +127,10 @@ class Renderer {
       writeRowText(kRowGutter + *row.text.valueIndent, line, row.text.value, value, end, row.text.isCut);
     } else if (row.text.value.empty()) {
       writeRowText(kRowGutter, line, row.text.name, name, end, row.text.isCut);
+      if (!row.note.empty()) grid_.write(end - textWidth(row.note), line, row.note, aside, end);
     } else {
-      drawNameAndValue(line, row.text, name, value, end);
+      drawNameAndValue(line, row.text, name, value, row.text.valueEnd.value_or(end));
+      if (!row.text.reading.empty()) grid_.write(*row.text.valueEnd + kRowGap, line, row.text.reading, aside, end);
     }
   }
 
@@ -196,6 +200,10 @@ class Renderer {
   void drawHints() {
     const int line = regions_.hints;
     int column = kBarMargin;
+    if (!picture_.notice.empty()) {
+      writeCut(column, line, picture_.notice, Role::Alarm, width());
+      return;
+    }
     if (picture_.isTypingFilter || !picture_.filter.empty()) {
       column = grid_.write(column, line, "/", Role::Prompt, width());
       column = writeCut(column, line, picture_.filter, Role::Prompt, width() / 2);
