@@ -20,8 +20,8 @@ class Insight : public Present {
  public:
   using StepHandler = std::function<void(const Report& report, const std::vector<TimelineEvent>& events)>;
 
-  /// Takes an event that `intake` has just taken; its stores are read.
-  void observe(const TakenEvent& event, const MetricValidator& intake);
+  /// Takes an event that the intake has just taken into `stores`.
+  void observe(const TakenEvent& event, const Stores& stores);
   /// Has `intake` tell it every event, for as long as both live.
   void observeEventsOf(MetricValidator& intake);
 
@@ -38,7 +38,7 @@ class Insight : public Present {
   [[nodiscard]] std::uint64_t alerts() const { return judge_.fired(); }
 
  private:
-  void take(const TakenEvent& event, const MetricValidator& intake, std::uint64_t number);
+  void take(const TakenEvent& event, const Stores& stores, std::uint64_t number);
 
   ReportReader reader_;
   Summary summary_;

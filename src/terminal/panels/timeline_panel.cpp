@@ -8,7 +8,7 @@
 #include "terminal/panels/cell_words.h"
 #include "terminal/panels/event_fields.h"
 #include "terminal/panels/event_row.h"
-#include "terminal/view/text_search.h"
+#include "values/ascii.h"
 
 namespace vesk {
 

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <utility>
 
-#include "terminal/view/text_search.h"
+#include "values/ascii.h"
 
 namespace vesk {
 
