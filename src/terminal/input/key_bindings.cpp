@@ -32,7 +32,7 @@ const KeyBinding kBindings[] = {
     {Action::Sort, {letter(U's')}, "sort", "sort the cells by the next column"},
     {Action::Area,
      {letter(U'1'), letter(U'2'), letter(U'3'), letter(U'4')},
-     "areas",
+     "to 4 areas",
      "open an area of the first screen"},
     {Action::Diagnostics, {letter(U'd')}, "lines", "show or hide the diagnostic lines"},
     {Action::OlderLines, {letter(U'[')}, "", "older diagnostic lines"},

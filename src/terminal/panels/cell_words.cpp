@@ -69,7 +69,8 @@ std::string dateText(std::int64_t time) {
 }
 
 std::string lastingText(std::int64_t milliseconds) {
-  return insight::durationText(static_cast<std::uint64_t>(std::max<std::int64_t>(milliseconds, 0)));
+  const auto shown = static_cast<std::uint64_t>(std::max<std::int64_t>(milliseconds, 0));
+  return shown < 1000 ? "0." + std::to_string(shown / 100) + " s" : insight::durationText(shown);
 }
 
 }  // namespace vesk

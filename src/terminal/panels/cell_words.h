@@ -25,7 +25,7 @@ namespace vesk {
 /// "2018-01-20 21:53:05 UTC", of milliseconds since 1970-01-01 00:00:00 UTC.
 [[nodiscard]] std::string dateText(std::int64_t time);
 
-/// "4.7 s"; nothing for a negative duration.
+/// "0.3 s", "4.7 s", "12 min 03 s".
 [[nodiscard]] std::string lastingText(std::int64_t milliseconds);
 
 }  // namespace vesk

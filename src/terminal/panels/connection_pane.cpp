@@ -50,11 +50,15 @@ ConnectionLine registrationLine(const insight::Present& drive, insight::Registra
   return line;
 }
 
+/// "10 of 320 ms, short 80, inactivity 100".
 ConnectionLine drxLine(const insight::Present& drive) {
   const auto& parameters = drive.timeline().connectedDrx().parameters();
-  return {"C-DRX", parameters ? textOf(insight::TimelineEvent{
-                                    {}, insight::EventKind::cdrxSetUp, insight::CdrxChange{parameters}})
-                              : "off"};
+  if (!parameters) return {"C-DRX", "off"};
+  const auto part = [](std::string_view before, const std::optional<std::int64_t>& number) {
+    return number ? std::string(before) + std::to_string(*number) : "";
+  };
+  return {"C-DRX", "on" + part(" ", parameters->onDuration) + part(" of ", parameters->longCycle) + " ms" +
+                       part(", short ", parameters->shortCycle) + part(", inactivity ", parameters->inactivity)};
 }
 
 ConnectionLine carriersLine(const insight::Present& drive) {

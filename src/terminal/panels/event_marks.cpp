@@ -1,8 +1,10 @@
 #include "terminal/panels/event_marks.h"
 
 #include <algorithm>
+#include <array>
 #include <iterator>
 #include <optional>
+#include <variant>
 
 namespace vesk {
 
@@ -40,15 +42,24 @@ std::span<const EventMark> eventMarks() {
   return kMarks;
 }
 
-const EventMark* markOf(EventKind kind) {
-  const auto* found =
-      std::find_if(std::begin(kMarks), std::end(kMarks), [&](const EventMark& mark) { return isMarkOf(mark, kind); });
+const EventMark* markOf(const insight::TimelineEvent& event) {
+  const auto* technology = std::get_if<insight::TechnologyChange>(&event.fields);
+  const auto* cell = std::get_if<insight::CellChange>(&event.fields);
+  if ((technology != nullptr && !technology->from) || (cell != nullptr && !cell->from)) return nullptr;
+  const auto* found = std::find_if(std::begin(kMarks), std::end(kMarks),
+                                   [&](const EventMark& mark) { return isMarkOf(mark, event.kind); });
   return found == std::end(kMarks) ? nullptr : found;
 }
 
-Role roleOf(EventKind kind) {
-  const EventMark* mark = markOf(kind);
+Role roleOf(const insight::TimelineEvent& event) {
+  const EventMark* mark = markOf(event);
   return mark == nullptr ? Role::Value : mark->role;
+}
+
+bool isNotable(EventKind kind) {
+  constexpr std::array kOrdinary{EventKind::rrc, EventKind::cdrxSetUp, EventKind::cdrxReleased, EventKind::bearerUp,
+                                 EventKind::bearerDown};
+  return std::find(kOrdinary.begin(), kOrdinary.end(), kind) == kOrdinary.end();
 }
 
 void drawMarks(const Canvas& canvas, int column, int line, const insight::Present& drive, const TrendSpan& span,
@@ -56,7 +67,7 @@ void drawMarks(const Canvas& canvas, int column, int line, const insight::Presen
   std::vector<const EventMark*> marks(static_cast<std::size_t>(span.slots / slotsPerColumn), nullptr);
   for (auto each = firstSince(drive, span.start); each != drive.happenings().end(); ++each) {
     const auto slot = span.slotOf(each->position);
-    const EventMark* mark = markOf(each->event.kind);
+    const EventMark* mark = markOf(each->event);
     if (!slot || mark == nullptr) continue;
     const EventMark*& place = marks[static_cast<std::size_t>(*slot / slotsPerColumn)];
     if (place == nullptr || mark < place) place = mark;
@@ -76,7 +87,7 @@ std::vector<std::int64_t> breaksOf(const insight::Present& drive) {
 std::size_t countSince(const insight::Present& drive, const EventMark& mark, std::int64_t start) {
   return static_cast<std::size_t>(
       std::count_if(firstSince(drive, start), drive.happenings().end(),
-                    [&](const insight::Happening& each) { return isMarkOf(mark, each.event.kind); }));
+                    [&](const insight::Happening& each) { return markOf(each.event) == &mark; }));
 }
 
 }  // namespace vesk

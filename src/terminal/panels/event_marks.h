@@ -24,11 +24,14 @@ struct EventMark {
 /// The one that matters most first.
 [[nodiscard]] std::span<const EventMark> eventMarks();
 
-/// Null for an event that bears none.
-[[nodiscard]] const EventMark* markOf(insight::EventKind kind);
+/// Null for an event that bears none, as the first technology and the first cell of a stretch: they are no changes.
+[[nodiscard]] const EventMark* markOf(const insight::TimelineEvent& event);
 
 /// How the event's kind is written in lists.
-[[nodiscard]] Role roleOf(insight::EventKind kind);
+[[nodiscard]] Role roleOf(const insight::TimelineEvent& event);
+/// Whether it is told where there is room for the most important alone. Connections, discontinuous reception and
+/// bearers come and go all the time.
+[[nodiscard]] bool isNotable(insight::EventKind kind);
 
 /// Draws on one line which events happened when: of those in one place the mark that matters most. A place is
 /// `slotsPerColumn` slots of the span.

@@ -14,7 +14,7 @@ void drawEventRow(const Canvas& canvas, int line, const insight::TimelineEvent& 
   const auto roleFor = [&](Role role) { return isSelected ? Role::Selected : role; };
   if (isSelected) canvas.fill(line, Role::Selected);
   const std::string time = insight::timeOfDay(event.moment.time);
-  const Role role = roleOf(event.kind);
+  const Role role = roleOf(event);
   int column = canvas.write(1, line, isRoomy ? time : time.substr(0, 8), roleFor(Role::Faint)) + 2;
   const int kindEnd = canvas.write(column, line, nameOf(event.kind), roleFor(role));
   column = isRoomy ? column + kLongestKind + 2 : kindEnd + 1;

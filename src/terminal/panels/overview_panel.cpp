@@ -78,7 +78,7 @@ void OverviewPanel::drawTitle(const Canvas& canvas, const Pane& pane) const {
                pane.box.column + pane.box.columns - 1);
 }
 
-void OverviewPanel::drawPane(const Canvas& canvas, PaneKind kind) const {
+void OverviewPanel::drawPane(const Canvas& canvas, PaneKind kind) {
   switch (kind) {
     case PaneKind::serving:
       return drawServing(canvas, drive_.present(), selectedKpi());
@@ -129,11 +129,15 @@ void OverviewPanel::drawCells(const Canvas& canvas) const {
   }
 }
 
-void OverviewPanel::drawHappenings(const Canvas& canvas) const {
+void OverviewPanel::drawHappenings(const Canvas& canvas) {
   const auto& happenings = drive_.present().happenings();
-  int line = 0;
-  for (auto each = happenings.rbegin(); each != happenings.rend() && line < canvas.lines(); ++each)
-    drawEventRow(canvas, line++, each->event, false);
+  shownEvents_.clear();
+  for (std::size_t index = happenings.size(); index-- > 0 && static_cast<int>(shownEvents_.size()) < canvas.lines();) {
+    const insight::TimelineEvent& event = happenings[index].event;
+    if (!isNotable(event.kind)) continue;
+    drawEventRow(canvas, static_cast<int>(shownEvents_.size()), event, false);
+    shownEvents_.push_back(drive_.present().happenedBefore() + index);
+  }
 }
 
 bool OverviewPanel::perform(Action action) {
@@ -168,10 +172,9 @@ void OverviewPanel::click(int column, int line) {
       case PaneKind::cells:
         return opener_.openCells();
       case PaneKind::happenings: {
-        const auto kept = drive_.present().happenings().size();
-        const auto back = static_cast<std::size_t>(row) + 1;
-        if (back > kept) return;
-        return opener_.openTimeline(drive_.present().happenedBefore() + kept - back);
+        if (row < static_cast<int>(shownEvents_.size()))
+          opener_.openTimeline(shownEvents_[static_cast<std::size_t>(row)]);
+        return;
       }
     }
   }

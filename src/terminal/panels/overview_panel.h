@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <vector>
 
 #include "terminal/panels/overview_layout.h"
 #include "terminal/panels/panel.h"
@@ -27,12 +28,12 @@ class OverviewPanel : public Panel {
   /// Absent while the technology is unknown.
   [[nodiscard]] std::optional<insight::Kpi> selectedKpi() const;
   void moveSelection(int step);
-  void drawPane(const Canvas& canvas, PaneKind kind) const;
+  void drawPane(const Canvas& canvas, PaneKind kind);
   void drawTitle(const Canvas& canvas, const Pane& pane) const;
   void drawTrend(const Canvas& canvas) const;
   void drawRecent(const Canvas& canvas) const;
   void drawCells(const Canvas& canvas) const;
-  void drawHappenings(const Canvas& canvas) const;
+  void drawHappenings(const Canvas& canvas);
 
   const ShownDrive& drive_;
   Signs signs_;
@@ -41,6 +42,8 @@ class OverviewPanel : public Panel {
   std::size_t selected_ = 0;
   /// As it was drawn last.
   OverviewLayout layout_;
+  /// The numbers of the events that were drawn, from above.
+  std::vector<std::uint64_t> shownEvents_;
 };
 
 }  // namespace vesk

@@ -66,15 +66,15 @@ void drawKpi(const Canvas& canvas, int line, const insight::Present& drive, Kpi 
   if (!value) return drawUnknown(canvas, line, drive, kpi);
   canvas.writeRight(kBarColumn - 1, line, valueText(kpi, *value), roleOf(kpi, *value));
   const bool isRoomy = canvas.columns() >= kRoomyColumns;
-  const int barEnd = kBarColumn + (isRoomy ? 20 : 10);
+  constexpr int kRangeColumn = 12;
+  const int barEnd = kBarColumn + (isRoomy ? std::clamp(canvas.columns() - kRoomyColumns, 20, 40) : 10);
   drawLevelBar(canvas, kBarColumn, line, barEnd - kBarColumn, kpi, *value);
   const int gradeEnd = canvas.write(barEnd + 1, line, gradeText(kpi, *value), roleOf(kpi, *value));
   const auto range = valuesSince(drive.trend().points(kpi), drive.clock().counted() - kRangeLength);
   if (!isRoomy || !range) return;
   const std::string text = "60 s " + insight::numberText(range->min) + "…" + insight::numberText(range->max);
-  if (gradeEnd + 1 + textWidth(text) < canvas.columns()) {
-    canvas.writeRight(canvas.columns() - 1, line, text, Role::Faint);
-  }
+  const int column = std::max(gradeEnd + 2, barEnd + kRangeColumn);
+  if (column + textWidth(text) <= canvas.columns()) canvas.write(column, line, text, Role::Faint);
 }
 
 /// "RRC CONNECTED 23 s   serves 4.4 s   age 0.3 s".

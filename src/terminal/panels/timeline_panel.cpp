@@ -65,13 +65,16 @@ void TimelinePanel::draw(const Canvas& canvas) {
 }
 
 void TimelinePanel::drawDetails(const Canvas& canvas) const {
-  constexpr int kValueColumn = 14;
   canvas.fill(0, Role::PaneHeader);
   canvas.write(1, 0, goToEvent_ ? "Fields; Enter goes to this moment" : "Fields", Role::PaneHeader);
+  const auto fields = fieldsOf(eventOf(rows_[static_cast<std::size_t>(window_.selected())]));
+  int keyWidth = 0;
+  for (const auto& [key, value] : fields)
+    keyWidth = std::max(keyWidth, textWidth(key));
   int line = 0;
-  for (const auto& [key, value] : fieldsOf(eventOf(rows_[static_cast<std::size_t>(window_.selected())]))) {
+  for (const auto& [key, value] : fields) {
     canvas.write(2, ++line, key, Role::Plain);
-    canvas.write(kValueColumn, line, value, Role::Value);
+    canvas.write(2 + keyWidth + 2, line, value, Role::Value);
   }
 }
 

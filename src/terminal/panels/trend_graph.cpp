@@ -88,17 +88,17 @@ class DotField {
   std::vector<unsigned> cells_;
 };
 
-void drawDots(const Canvas& canvas, const Slots& slots, const TrendScale& scale, insight::Kpi kpi) {
+/// `cuts` are the slots that no line leads to from the one before.
+void drawDots(const Canvas& canvas, const Slots& slots, const std::vector<bool>& cuts, const TrendScale& scale,
+              insight::Kpi kpi) {
   DotField dots(canvas.columns(), canvas.lines());
   const auto rowOf = [&](double value) {
     return static_cast<int>(std::floor((value - scale.low) / scale.step * kDotRows));
   };
   std::optional<int> before;
   for (std::size_t slot = 0; slot < slots.size(); ++slot) {
-    if (!slots[slot]) {
-      before.reset();
-      continue;
-    }
+    if (!slots[slot] || cuts[slot]) before.reset();
+    if (!slots[slot]) continue;
     const int mean = rowOf(slots[slot]->mean());
     const int low = std::min(rowOf(slots[slot]->min), before ? std::min(*before, mean) : mean);
     const int high = std::max(rowOf(slots[slot]->max), before ? std::max(*before, mean) : mean);
@@ -121,7 +121,7 @@ void drawScale(const Canvas& canvas, const TrendScale& scale, int rows) {
 }  // namespace
 
 TrendScale TrendScale::covering(double min, double max, int rows) {
-  constexpr std::array kSteps{0.5, 1.0, 2.0, 5.0, 10.0, 20.0, 50.0, 100.0};
+  constexpr std::array kSteps{1.0, 2.0, 5.0, 10.0, 20.0, 50.0, 100.0};
   for (const double step : kSteps) {
     const double low = std::ceil(min / step - 1) * step;
     if (low + rows * step >= max) {
@@ -153,7 +153,8 @@ void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const
   const int rows = canvas.lines() - 1;
   if (rows < 1) return;
   drawMarks(canvas, kScaleColumns, rows, drive, span, isDotted() ? kDotColumns : 1);
-  const Slots slots = slotValues(drive.trend().points(kpi), span, breaksOf(drive));
+  const std::vector<std::int64_t> breaks = breaksOf(drive);
+  const Slots slots = slotValues(drive.trend().points(kpi), span, breaks);
   std::optional<TrendValues> range;
   for (const auto& values : slots) {
     if (!values) continue;
@@ -169,7 +170,10 @@ void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const
   drawScale(canvas, scale, rows);
   const Canvas field = canvas.part({kScaleColumns, 0, canvas.columns() - kScaleColumns, rows});
   if (isDotted()) {
-    drawDots(field, slots, scale, kpi);
+    std::vector<bool> cuts(slots.size());
+    for (const std::int64_t each : breaks)
+      if (const auto slot = span.slotOf(each)) cuts[static_cast<std::size_t>(*slot)] = true;
+    drawDots(field, slots, cuts, scale, kpi);
   } else {
     drawBars(field, slots, scale, kpi, signs);
   }
