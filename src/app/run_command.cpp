@@ -1,5 +1,6 @@
 #include "app/run_command.h"
 
+#include <algorithm>
 #include <memory>
 #include <string>
 #include <unistd.h>
@@ -7,6 +8,7 @@
 #include <vector>
 
 #include "app/app_delegate.h"
+#include "app/configuration.h"
 #include "app/redaction.h"
 #include "app/replay_control.h"
 #include "app/road.h"
@@ -15,6 +17,7 @@
 #include "app/vesk_interface.h"
 #include "insight/insight.h"
 #include "intake/metric_validator.h"
+#include "screens/vesk_view_items.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
 #include "system/timer.h"
@@ -28,8 +31,11 @@ namespace {
 /// One run of the program, from the source of its events to what shows them.
 class Run {
  public:
-  Run(const RunOptions& options, std::vector<insight::Rule> rules)
-      : options_(options), isHeadless_(options.isHeadless), isJudging_(!rules.empty()) {
+  Run(const RunOptions& options, bool isHeadless, Configuration configuration, std::vector<insight::Rule> rules)
+      : options_(options),
+        isHeadless_(isHeadless),
+        isJudging_(!rules.empty()),
+        configuration_(std::move(configuration)) {
     insight_.setRules(std::move(rules));
     if (options_.duration) end_ = clock_.now() + *options_.duration;
     boundTelling(stopSignal_, end_);
@@ -48,7 +54,6 @@ class Run {
     const std::shared_ptr<corvik::Service> service =
         options_.isRedacted ? makeRedactedService(source_.service, redaction_) : source_.service;
     corvik::installService(service);
-    if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
     if (isHeadless_) {
       printLines();
     } else {
@@ -110,7 +115,7 @@ class Run {
 
   void openTerminal(Application& application, NavigationController& root) {
     std::string reason;
-    terminal_ = Terminal::open(root, clock_, surroundings(application), reason);
+    terminal_ = Terminal::open(root, clock_, surroundings(application), configuration_.appearance, reason);
     if (terminal_ == nullptr) {
       tellUser("vesk: " + reason + "; running without screens");
       isHeadless_ = true;
@@ -124,7 +129,22 @@ class Run {
       moment_.noteArrival(metricId);
       terminal_->setNeedsDisplay();
     });
+    showStart(root);
     loop_.addInput(terminal_->descriptor(), [this] { terminal_->serve(); });
+  }
+
+  void showStart(NavigationController& root) {
+    const StartView& start = configuration_.start;
+    const auto open = [&](std::string_view label, const std::vector<Text>& labels) {
+      auto* menu = dynamic_cast<TableViewController*>(root.topViewController().get());
+      const auto found = std::find(labels.begin(), labels.end(), Text::copy(label));
+      if (menu != nullptr && found != labels.end())
+        menu->selectRow({0, static_cast<std::size_t>(found - labels.begin())});
+    };
+    const VeskViewItems& menu = VeskViewItems::shared();
+    if (!start.area.empty()) open(start.area, menu.launchViewItemNames);
+    if (!start.category.empty()) open(start.category, menu.categoriesOf(start.area));
+    if (start.action) terminal_->perform(*start.action);
   }
 
   void closeTerminal() {
@@ -231,6 +251,7 @@ class Run {
   bool isHeadless_;
   /// Whether there are rules.
   bool isJudging_;
+  Configuration configuration_;
   /// When nobody is waited for any more; absent for never.
   std::optional<Clock::Instant> end_;
   Outcome outcome_ = Outcome::done;
@@ -259,7 +280,11 @@ class Run {
 Outcome runProgram(const RunOptions& options) {
   auto rules = readRules(options.rules);
   if (!rules) return Outcome::wrongUsage;
-  return Run(options, *std::move(rules)).run();
+  const bool isHeadless = options.isHeadless || isatty(STDOUT_FILENO) == 0;
+  auto configuration = isHeadless ? Configuration{} : readConfiguration(configurationPath());
+  if (!configuration) return Outcome::wrongUsage;
+  rules->insert(rules->begin(), configuration->rules.begin(), configuration->rules.end());
+  return Run(options, isHeadless, *std::move(configuration), *std::move(rules)).run();
 }
 
 }  // namespace vesk

@@ -11,13 +11,14 @@
 namespace vesk {
 
 std::unique_ptr<Terminal> Terminal::open(NavigationController& stack, const Clock& clock, Surroundings surroundings,
-                                         std::string& reason) {
+                                         const Appearance& appearance, std::string& reason) {
   std::optional<FileDescriptor> terminal = TerminalDevice::openControllingTerminal();
   if (!terminal) {
     reason = "there is no terminal to show screens on";
     return nullptr;
   }
-  std::optional<Capabilities> capabilities = readCapabilities(terminal->get(), setUpCharacterLocale(), reason);
+  std::optional<Capabilities> capabilities =
+      readCapabilities(terminal->get(), setUpCharacterLocale(), appearance, reason);
   if (!capabilities) return nullptr;
   return std::make_unique<Terminal>(stack, clock, std::move(surroundings), std::move(*terminal),
                                     std::move(*capabilities));
@@ -79,6 +80,12 @@ void Terminal::serve() {
 void Terminal::setNeedsDisplay() {
   if (std::exchange(needsDisplay_, true) || isServing_) return;
   scheduleWakeUp(clock_.now());
+}
+
+void Terminal::perform(Action action) {
+  const BoundKey& key = *bindingOf(action).keys.begin();
+  presenter_.handle(KeyEvent{.key = key.key, .character = key.character});
+  setNeedsDisplay();
 }
 
 void Terminal::setOnTheWay(bool isOnTheWay) {

@@ -34,7 +34,8 @@ class Terminal {
   /// screens; `reason` then says why in one line. `stack` and `clock` must outlive the terminal, and what
   /// `surroundings` calls too. Takes the locale of the environment for characters.
   [[nodiscard]] static std::unique_ptr<Terminal> open(NavigationController& stack, const Clock& clock,
-                                                      Surroundings surroundings, std::string& reason);
+                                                      Surroundings surroundings, const Appearance& appearance,
+                                                      std::string& reason);
   /// The same on a terminal that is open already.
   Terminal(NavigationController& stack, const Clock& clock, Surroundings surroundings, FileDescriptor terminal,
            Capabilities capabilities);
@@ -48,6 +49,8 @@ class Terminal {
   /// Takes the input, follows the terminal's size and the stopping of the program, draws what is to be drawn.
   void serve();
 
+  /// Does what the key of `action` does.
+  void perform(Action action);
   /// While the replay goes to another moment, what shows stays as it is; then it is that of the moment.
   void setOnTheWay(bool isOnTheWay);
   /// Shows a line for some seconds, and rings where it is worth looking up for.

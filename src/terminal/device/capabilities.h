@@ -4,6 +4,7 @@
 #include <optional>
 #include <string>
 
+#include "terminal/device/appearance.h"
 #include "terminal/device/palette.h"
 #include "terminal/device/signs.h"
 
@@ -27,6 +28,7 @@ struct Capabilities {
 
 /// Reads the terminfo entry of TERM for the terminal at `descriptor`. Absent when the terminal is unknown or
 /// too simple for screens; `reason` then says why in one line.
-[[nodiscard]] std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, std::string& reason);
+[[nodiscard]] std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, const Appearance& appearance,
+                                                           std::string& reason);
 
 }  // namespace vesk
