@@ -206,7 +206,7 @@ TEST(Picture, KeepsThePlaceInThePaneWhileLinesCome) {
 
 TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   FakeInterface interface;
-  Desk desk(interface.stack(), {80, 24});
+  Desk desk(interface.stack(), {80, 27});
   desk.type(U"?");
   EXPECT_EQ(desk.picture(), R"(
 | Vesk
@@ -216,23 +216,26 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
 |  Esc ← h Backspace  clear the filter, go back
 |  /                  show only rows with what is typed
 |  f                  hold the screen; intake goes on
+|  o                  where the phone is and how it is doing, on one screen
+|  t                  the course of the selected figure
+|  e                  what happened and when; Enter shows all fields
+|  c                  the cells heard
+|  s                  sort the cells by the next column
+|  1 2 3 4            open an area of the first screen
 |  d                  show or hide the diagnostic lines
 |  [                  older diagnostic lines
 |  ]                  newer diagnostic lines
 |  q                  end the program
-|  ↑ k                one row up
-|  ↓ j                one row down
-|  PgUp               one page up
-|  PgDn               one page down
+|  ↑ k                one row up; on a trend: the figure before
+|  ↓ j                one row down; on a trend: the next figure
+|  PgUp               one page up; on a trend: a longer time
+|  PgDn               one page down; on a trend: a shorter time
 |  Home               the first row
 |  End                the last row
 |  click              select and open a row; on the path: go back
 |  wheel, drag        scroll
 |
-|
-|
-|
-| ? help  Enter open  Esc back  / filter  f freeze  d lines  q quit
+| ? help  Enter open  Esc back  / filter  f freeze  d lines  o overview  q quit
 )");
   desk.resize({40, 10});
   desk.press(Key::End);
