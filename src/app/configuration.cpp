@@ -41,11 +41,28 @@ class Reading {
   explicit Reading(const std::string& path) : path_(path) {}
 
   std::optional<Configuration> read() {
+    take();
+    std::stable_sort(mistakes_.begin(), mistakes_.end(),
+                     [](const Mistake& one, const Mistake& other) { return one.line < other.line; });
+    for (const Mistake& each : mistakes_)
+      tellUser("vesk: " + path_ + ":" + std::to_string(each.line) + ": " + each.reason);
+    return mistakes_.empty() ? std::optional(std::move(configuration_)) : std::nullopt;
+  }
+
+ private:
+  struct Mistake {
+    toml::source_index line;
+    std::string reason;
+  };
+  struct Key {
+    std::string_view name;
+    void (Reading::*take)(const toml::node& value);
+  };
+  static const std::array<Key, 4> kKeys;
+
+  void take() {
     const toml::parse_result parsed = toml::parse_file(path_);
-    if (!parsed) {
-      tell(parsed.error().source().begin.line, std::string(parsed.error().description()));
-      return std::nullopt;
-    }
+    if (!parsed) return tell(parsed.error().source().begin.line, std::string(parsed.error().description()));
     for (const auto& [key, value] : parsed.table()) {
       const auto* known =
           std::find_if(kKeys.begin(), kKeys.end(), [&](const Key& each) { return each.name == key.str(); });
@@ -56,15 +73,7 @@ class Reading {
              "unknown key " + std::string(key.str()) + ": expected start, signs, rules or [colors]");
       }
     }
-    return isSound_ ? std::optional(std::move(configuration_)) : std::nullopt;
   }
-
- private:
-  struct Key {
-    std::string_view name;
-    void (Reading::*take)(const toml::node& value);
-  };
-  static const std::array<Key, 4> kKeys;
 
   void takeStart(const toml::node& value) {
     const std::string_view name = value.value_or(std::string_view());
@@ -126,15 +135,12 @@ class Reading {
     }
   }
 
-  void tell(const toml::node& place, const std::string& reason) { tell(place.source().begin.line, reason); }
-  void tell(toml::source_index line, const std::string& reason) {
-    tellUser("vesk: " + path_ + ":" + std::to_string(line) + ": " + reason);
-    isSound_ = false;
-  }
+  void tell(const toml::node& place, std::string reason) { tell(place.source().begin.line, std::move(reason)); }
+  void tell(toml::source_index line, std::string reason) { mistakes_.push_back({line, std::move(reason)}); }
 
   const std::string& path_;
   Configuration configuration_;
-  bool isSound_ = true;
+  std::vector<Mistake> mistakes_;
 };
 
 const std::array<Reading::Key, 4> Reading::kKeys{Key{"start", &Reading::takeStart}, Key{"signs", &Reading::takeSigns},

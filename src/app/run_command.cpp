@@ -205,9 +205,7 @@ class Run {
     if (!moment_.isHeld()) moment_.hold();
     OutputLines::setSink(nullptr);
     if (!isFromStart) return;
-    MetricValidator& intake = *MetricValidator::shared();
-    intake.stores = {};
-    intake.metricID.reset();
+    MetricValidator::shared()->startAnew();
     insight_.startAnew();
     moment_.startAnew();
   }

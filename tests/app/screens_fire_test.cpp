@@ -113,7 +113,7 @@ void openEachCategory(NavigationController& stack, Use use) {
 TEST_F(ScreensUnderFire, NothingOfAPayloadReachesTheTerminalAsAControl) {
   setenv("TERM", "xterm-256color", 1);
   std::string reason;
-  const std::optional<Capabilities> terminal = readCapabilities(STDOUT_FILENO, kHasUtf8Locale, reason);
+  const std::optional<Capabilities> terminal = readCapabilities(STDOUT_FILENO, kHasUtf8Locale, {}, reason);
   ASSERT_TRUE(terminal.has_value()) << reason;
   DiagnosticLines lines;
   const auto output = OutputLines::setSink(std::make_unique<DiagnosticSink>(lines));

@@ -104,7 +104,7 @@ TEST_F(PanelsTest, AnOrdinaryOverviewHasTrendAndEvents) {
 |│ 21:52:50.000  handover       PCI 316 B17 5815 -> PCI 338 B17 5815, -112 dBm,…│
 |│ 21:52:40.000  area           TAI 310-410 19980                               │
 |└──────────────────────────────────────────────────────────────────────────────┘
-| ? help  Esc back  1 to 4 areas  t trend  e events  c cells  f freeze  q quit
+| ? help  Esc back  1 to 4 areas  t trend  e events  c cells  Space hold  q quit
 )");
 }
 
@@ -188,7 +188,7 @@ TEST_F(PanelsTest, HeldPanelsStandStillWhileTheDriveGoesOn) {
   show(smallDrive(), {80, 24});
   desk_->type(U"of");
   const std::string held = desk_->picture();
-  EXPECT_NE(held.find("FROZEN"), std::string::npos);
+  EXPECT_NE(held.find("HELD"), std::string::npos);
   drive_.play({lteLevel(26'000, -70)});
   EXPECT_EQ(desk_->picture(), held);
   desk_->type(U"f");

@@ -110,9 +110,9 @@ TEST(Picture, MarksValuesThatChangedAtTheLastReloadForThatReload) {
   EXPECT_EQ(desk.line(4), "  tx_power                           2");
 }
 
-TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
+TEST(Picture, TellsHowOldTheRowsAreInTheDrivesTimeAndHowOftenTheMetricCame) {
   FakeInterface interface;
-  interface.showFields(kTxPower, power("1"));
+  FakeTableScreen& fields = interface.showFields(kTxPower, power("1"));
   std::optional<Arrivals> arrivals = Arrivals{};
   std::string asked;
   Surroundings surroundings;
@@ -120,6 +120,8 @@ TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
     asked = std::string(area) + "/" + std::string(category);
     return arrivals;
   };
+  DriveMoment moment{std::chrono::hours(1000), 2};
+  surroundings.driveMoment = [&] { return moment; };
   Desk desk(interface.stack(), {40, 10}, surroundings);
   EXPECT_EQ(desk.line(1), "  Tx Power  never");
   EXPECT_EQ(asked, "LTE/Tx Power");
@@ -127,21 +129,27 @@ TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
 
   using namespace std::chrono_literals;
   struct {
-    Clock::Duration age;
+    std::chrono::milliseconds age;
     std::uint64_t count;
     std::string text;
-    Clock::Duration next;
+    std::chrono::milliseconds next;
   } const cases[] = {
       {0s, 1, "0 s ago, once", 1s},           {2900ms, 14, "2 s ago, 14 times", 3s},
       {59999ms, 2, "59 s ago, 2 times", 60s}, {125s, 2, "2 min ago, 2 times", 180s},
       {3h + 1s, 2, "3 h ago, 2 times", 4h},   {49h, 2, "2 d ago, 2 times", 72h},
   };
   for (const auto& each : cases) {
-    arrivals = Arrivals{desk.now() - each.age, each.count};
+    arrivals = Arrivals{moment.time - each.age, each.count};
+    fields.tableView().reloadData();
     EXPECT_EQ(desk.line(1), "  Tx Power  " + each.text);
-    EXPECT_EQ(desk.presenter().nextChange(), desk.now() - each.age + each.next);
+    EXPECT_EQ(desk.presenter().nextChange(), desk.now() + Clock::Duration(each.next - each.age) / 2);
   }
+  arrivals = Arrivals{moment.time, 15};
+  moment = {moment.time + 24h, 0};
+  EXPECT_EQ(desk.line(1), "  Tx Power  3 d ago, 2 times");
+  EXPECT_EQ(desk.presenter().nextChange(), std::nullopt);
   arrivals = std::nullopt;
+  fields.tableView().reloadData();
   EXPECT_EQ(desk.line(1), "  Tx Power");
   asked.clear();
   interface.stack().pop();
@@ -206,7 +214,7 @@ TEST(Picture, KeepsThePlaceInThePaneWhileLinesCome) {
 
 TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   FakeInterface interface;
-  Desk desk(interface.stack(), {80, 27});
+  Desk desk(interface.stack(), {80, 32});
   desk.type(U"?");
   EXPECT_EQ(desk.picture(), R"(
 | Vesk
@@ -215,7 +223,12 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
 |  Enter → l          open the selected row
 |  Esc ← h Backspace  clear the filter, go back
 |  /                  show only rows with what is typed
-|  f                  hold the screen; intake goes on
+|  Space f            hold all that shows, and the replay; intake goes on
+|  <                  10 s back in the replay
+|  >                  10 s forward in the replay
+|  +                  a faster replay
+|  -                  a slower replay
+|  u                  show or hide what the values mean
 |  o                  where the phone is and how it is doing, on one screen
 |  t                  the course of the selected figure
 |  e                  what happened and when; Enter shows all fields
@@ -235,7 +248,7 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
 |  click              select and open a row; on the path: go back
 |  wheel, drag        scroll
 |
-| ? help  Enter open  Esc back  / filter  f freeze  d lines  o overview  q quit
+| ? help  Enter open  Esc back  / filter  Space hold  d lines  o overview  q quit
 )");
   desk.resize({40, 10});
   desk.press(Key::End);

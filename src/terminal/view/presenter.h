@@ -19,7 +19,7 @@
 
 namespace vesk {
 
-/// What stands between the keys and the screens: it turns events into selection, scrolling, filter, freeze
+/// What stands between the keys and the screens: it turns events into selection, scrolling, filter, hold
 /// and panes, calls the toolkit for the rest, and says what shows. It knows no terminal. Main queue only.
 class Presenter {
  public:
