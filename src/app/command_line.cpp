@@ -13,18 +13,16 @@
 #include <vector>
 
 #include "app/command_examples.h"
-#include "app/data_output.h"
-#include "app/decode_command.h"
-#include "app/readings_command.h"
-#include "app/redact_command.h"
-#include "app/run_command.h"
-#include "app/series_command.h"
-#include "app/show_command.h"
-#include "app/simulate_command.h"
-#include "app/stores_command.h"
-#include "app/suggestion.h"
-#include "app/summary_command.h"
-#include "app/timeline_command.h"
+#include "app/commands/decode_command.h"
+#include "app/commands/drive_commands.h"
+#include "app/commands/readings_command.h"
+#include "app/commands/redact_command.h"
+#include "app/commands/run_command.h"
+#include "app/commands/show_command.h"
+#include "app/commands/simulate_command.h"
+#include "app/commands/stores_command.h"
+#include "app/commands/suggestion.h"
+#include "app/output/data_output.h"
 #include "system/system_log.h"
 
 namespace vesk {

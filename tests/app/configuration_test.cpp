@@ -1,4 +1,4 @@
-#include "app/configuration.h"
+#include "app/program/configuration.h"
 
 #include <cstdio>
 #include <fstream>

@@ -2,7 +2,7 @@
 #include <string>
 #include <vector>
 
-#include "app/replay_control.h"
+#include "app/source/replay_control.h"
 #include "corvik/recorded_service.h"
 #include "handset/driven_events.h"
 #include "insight/insight.h"

@@ -1,0 +1,73 @@
+#include "app/source/event_source.h"
+
+#include <chrono>
+#include <cmath>
+#include <cstdio>
+
+#include "handset/handset_service.h"
+#include "recording/recording_reader.h"
+
+namespace vesk {
+
+namespace {
+
+/// Minutes and seconds, as in 3:07; hours in front when there are some.
+std::string playingTime(double seconds) {
+  const auto whole = static_cast<long>(std::floor(seconds));
+  char text[32];
+  if (whole < 3600) {
+    std::snprintf(text, sizeof text, "%ld:%02ld", whole / 60, whole % 60);
+  } else {
+    std::snprintf(text, sizeof text, "%ld:%02ld:%02ld", whole / 3600, whole / 60 % 60, whole % 60);
+  }
+  return text;
+}
+
+/// "×1", "×0.5", "×max".
+std::string speedText(const std::optional<double>& speed) {
+  if (!speed) return "×max";
+  char text[32];
+  std::snprintf(text, sizeof text, "×%g", *speed);
+  return text;
+}
+
+ShownState shown(const corvik::PlaybackState& state) {
+  using Phase = corvik::PlaybackState::Phase;
+  switch (state.phase) {
+    case Phase::notStarted:
+    case Phase::waitingForInput:
+      return {"waiting"};
+    case Phase::ended:
+      return {"ended", false, 0};
+    case Phase::playing:
+      break;
+  }
+  // A pipe has no length, and is as good as live.
+  if (!state.duration) return {"live"};
+  const std::string_view sign = state.isSeeking ? "▶▶ " : state.isHeld ? "▮▮ " : "▶ ";
+  const bool isMoving = !state.isHeld || state.isSeeking;
+  return {std::string(sign) + speedText(state.speed) + "  " + playingTime(state.position) + " of " +
+              playingTime(*state.duration),
+          isMoving, isMoving && !state.isSeeking ? state.speed.value_or(0) : 0};
+}
+
+}  // namespace
+
+EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+  if (!options.replay) {
+    const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
+    const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
+    return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
+            [] { return ShownState{"simulated"}; }};
+  }
+  auto recording = std::make_unique<RecordingReader>(*options.replay);
+  const std::optional<std::string> failure = recording->failure();
+  auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
+  service->setBadLineHandler(std::move(handlers.badLine));
+  service->setEndHandler(std::move(handlers.ended));
+  service->setSeekHandlers(std::move(handlers.seekBegun), std::move(handlers.seekEnded));
+  corvik::RecordedService& recorded = *service;
+  return {std::move(service), [&recorded] { return shown(recorded.state()); }, failure, &recorded.player()};
+}
+
+}  // namespace vesk
