@@ -123,12 +123,12 @@ void OverviewPanel::drawRecent(const Canvas& canvas) const {
 }
 
 void OverviewPanel::drawCells(const Canvas& canvas) const {
-  const CellTable table(canvas);
-  table.drawHeads(std::nullopt);
+  const CellTable table(canvas.columns());
+  table.drawHeads(canvas, std::nullopt);
   int line = 1;
   for (const insight::HeardCell& cell : drive_.present().cellsHeard()) {
     if (line == canvas.lines()) break;
-    table.drawRow(line++, cell, false);
+    table.drawRow(canvas, line++, cell, false);
   }
 }
 
