@@ -141,42 +141,42 @@ Role textRole(std::size_t column, const HeardCell& cell) {
 
 }  // namespace
 
-CellTable::CellTable(const Canvas& canvas) : canvas_(canvas) {
+CellTable::CellTable(int columns) {
   int start = kTableGutter;
   for (std::size_t column = 0; column < kColumns.size(); ++column) {
     const CellColumn& each = kColumns[column];
-    if (canvas.columns() < each.fromColumns) continue;
-    places_.push_back({column, start, std::min(start + each.width, canvas.columns())});
+    if (columns < each.fromColumns) continue;
+    places_.push_back({column, start, std::min(start + each.width, columns)});
     start += each.width + (each.isAtRight ? 1 : 2);
   }
 }
 
-void CellTable::drawHeads(const std::optional<CellOrder>& order) const {
+void CellTable::drawHeads(const Canvas& canvas, const std::optional<CellOrder>& order) const {
   for (const Place& place : places_) {
     const CellColumn& column = kColumns[place.column];
     std::string head(column.head);
     if (order && order->column == place.column) head += order->isFalling ? "↓" : "↑";
     if (column.isAtRight) {
-      canvas_.writeRight(place.end, 0, head, Role::Faint);
+      canvas.writeRight(place.end, 0, head, Role::Faint);
     } else {
-      canvas_.write(place.start, 0, head, Role::Faint, place.end);
+      canvas.write(place.start, 0, head, Role::Faint, place.end);
     }
   }
 }
 
-void CellTable::drawRow(int line, const HeardCell& cell, bool isSelected) const {
-  if (isSelected) canvas_.fill(line, Role::Selected);
+void CellTable::drawRow(const Canvas& canvas, int line, const HeardCell& cell, bool isSelected) const {
+  if (isSelected) canvas.fill(line, Role::Selected);
   const auto roleFor = [&](Role role) { return isSelected ? Role::Selected : role; };
-  if (cell.role == insight::HeardRole::serving) canvas_.write(0, line, "▸", roleFor(Role::Key));
+  if (cell.role == insight::HeardRole::serving) canvas.write(0, line, "▸", roleFor(Role::Key));
   for (const Place& place : places_) {
     const CellColumn& column = kColumns[place.column];
     const Role role = roleFor(textRole(place.column, cell));
     if (place.column == kLevelBarColumn && cell.level) {
-      drawLevelBar(canvas_, place.start, line, place.end - place.start, levelOf(cell.key.technology), *cell.level);
+      drawLevelBar(canvas, place.start, line, place.end - place.start, levelOf(cell.key.technology), *cell.level);
     } else if (column.isAtRight) {
-      canvas_.writeRight(place.end, line, column.text(cell), role);
+      canvas.writeRight(place.end, line, column.text(cell), role);
     } else {
-      canvas_.write(place.start, line, column.text(cell), role, place.end);
+      canvas.write(place.start, line, column.text(cell), role, place.end);
     }
   }
 }

@@ -18,11 +18,12 @@ struct CellOrder {
 /// The table of the cells heard: its columns as far as there is room for them.
 class CellTable {
  public:
-  explicit CellTable(const Canvas& canvas);
+  /// For canvases of that width.
+  explicit CellTable(int columns);
 
   /// The heads, on the first line; the column of `order` bears an arrow.
-  void drawHeads(const std::optional<CellOrder>& order) const;
-  void drawRow(int line, const insight::HeardCell& cell, bool isSelected) const;
+  void drawHeads(const Canvas& canvas, const std::optional<CellOrder>& order) const;
+  void drawRow(const Canvas& canvas, int line, const insight::HeardCell& cell, bool isSelected) const;
 
   /// The table's column at a column of the canvas.
   [[nodiscard]] std::optional<std::size_t> columnAt(int column) const;
@@ -34,7 +35,6 @@ class CellTable {
     int end;
   };
 
-  Canvas canvas_;
   std::vector<Place> places_;
 };
 

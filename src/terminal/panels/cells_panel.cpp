@@ -32,10 +32,11 @@ void CellsPanel::draw(const Canvas& canvas) {
   height_ = canvas.lines() - kLinesBeforeCells;
   refresh();
   canvas.write(2, 0, "Cells heard, all technologies, kept 30 s: " + std::to_string(cells_.size()), Role::Title);
-  table_.emplace(canvas.part({0, 1, canvas.columns(), canvas.lines() - 1}));
-  table_->drawHeads(order_);
+  const Canvas space = canvas.part({0, 1, canvas.columns(), canvas.lines() - 1});
+  table_.emplace(space.columns());
+  table_->drawHeads(space, order_);
   for (int row = window_.top(); row < window_.end(); ++row)
-    table_->drawRow(1 + row - window_.top(), cells_[static_cast<std::size_t>(row)], row == window_.selected());
+    table_->drawRow(space, 1 + row - window_.top(), cells_[static_cast<std::size_t>(row)], row == window_.selected());
 }
 
 bool CellsPanel::perform(Action action) {

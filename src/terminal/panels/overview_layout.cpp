@@ -69,7 +69,11 @@ OverviewLayout narrowLayout(Size size) {
 
 OverviewLayout OverviewLayout::of(Size size) {
   if (size.columns < kLeastFramed.columns || size.lines < kLeastFramed.lines) {
-    return {{{PaneKind::serving, {-1, -1, size.columns + 2, size.lines + 2}}}, false};
+    // Without frames the panes reach beyond the edge, and over the line between them.
+    const int serving = std::min(size.lines, kServingLines - 2);
+    return {{{PaneKind::serving, {-1, -1, size.columns + 2, serving + 2}},
+             {PaneKind::happenings, {-1, serving - 1, size.columns + 2, size.lines - serving + 2}}},
+            false};
   }
   return size.columns >= kWideColumns ? wideLayout(size) : narrowLayout(size);
 }

@@ -19,7 +19,7 @@ struct Pane {
 /// Which panes of the overview show in some space, and where. Boxes beside each other share the line between them.
 struct OverviewLayout {
   std::vector<Pane> panes;
-  /// Too small a space for frames holds one pane alone.
+  /// Too small a space for frames holds the serving cell, and below it what happened.
   bool hasFrames = true;
 
   [[nodiscard]] static OverviewLayout of(Size size);

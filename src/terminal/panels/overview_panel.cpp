@@ -46,15 +46,18 @@ void OverviewPanel::moveSelection(int step) {
 
 void OverviewPanel::draw(const Canvas& canvas) {
   layout_ = OverviewLayout::of({canvas.columns(), canvas.lines()});
-  if (!layout_.hasFrames) return drawPane(canvas, PaneKind::serving);
+  if (layout_.hasFrames) drawFrames(canvas);
+  for (const Pane& pane : layout_.panes)
+    drawPane(canvas.part(pane.inside()), pane.kind);
+}
+
+void OverviewPanel::drawFrames(const Canvas& canvas) const {
   Frame frame({canvas.columns(), canvas.lines()});
   for (const Pane& pane : layout_.panes)
     frame.add(pane.box);
   frame.draw(canvas);
-  for (const Pane& pane : layout_.panes) {
+  for (const Pane& pane : layout_.panes)
     drawTitle(canvas, pane);
-    drawPane(canvas.part(pane.inside()), pane.kind);
-  }
   if (const auto now = drive_.present().now()) {
     canvas.writeRight(canvas.columns() - 2, 0, " " + dateText(*now) + " ", Role::Faint);
   }
@@ -120,12 +123,12 @@ void OverviewPanel::drawRecent(const Canvas& canvas) const {
 }
 
 void OverviewPanel::drawCells(const Canvas& canvas) const {
-  const CellTable table(canvas);
-  table.drawHeads(std::nullopt);
+  const CellTable table(canvas.columns());
+  table.drawHeads(canvas, std::nullopt);
   int line = 1;
   for (const insight::HeardCell& cell : drive_.present().cellsHeard()) {
     if (line == canvas.lines()) break;
-    table.drawRow(line++, cell, false);
+    table.drawRow(canvas, line++, cell, false);
   }
 }
 

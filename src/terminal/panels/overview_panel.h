@@ -29,6 +29,7 @@ class OverviewPanel : public Panel {
   [[nodiscard]] std::optional<insight::Kpi> selectedKpi() const;
   void moveSelection(int step);
   void drawPane(const Canvas& canvas, PaneKind kind);
+  void drawFrames(const Canvas& canvas) const;
   void drawTitle(const Canvas& canvas, const Pane& pane) const;
   void drawTrend(const Canvas& canvas) const;
   void drawRecent(const Canvas& canvas) const;

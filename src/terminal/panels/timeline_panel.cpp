@@ -51,13 +51,13 @@ void TimelinePanel::draw(const Canvas& canvas) {
   refresh();
   std::string head = "Timeline, " + std::to_string(rows_.size());
   if (!filter_.empty()) head += " of " + std::to_string(drive_.present().happenings().size());
-  canvas.write(2, 0, head + (rows_.size() == 1 ? " event" : " events"), Role::Title);
+  const int headEnd = canvas.write(2, 0, head + (rows_.size() == 1 ? " event" : " events"), Role::Title);
   if (rows_.empty()) {
     canvas.write(2, 1, filter_.empty() ? "nothing happened yet" : "no event has this", Role::Faint);
     return;
   }
   const auto& selected = eventOf(rows_[static_cast<std::size_t>(window_.selected())]);
-  canvas.writeRight(canvas.columns() - 1, 0, dateText(selected.moment.time), Role::Faint);
+  canvas.write(headEnd + 2, 0, dateText(selected.moment.time), Role::Faint);
   for (int row = window_.top(); row < window_.end(); ++row)
     drawEventRow(canvas, 1 + row - window_.top(), eventOf(rows_[static_cast<std::size_t>(row)]),
                  row == window_.selected());

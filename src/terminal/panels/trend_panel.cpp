@@ -44,8 +44,8 @@ void TrendPanel::draw(const Canvas& canvas) {
   const TrendSpan span = graph.spanOf(drive, canvas.columns() - 1);
   const auto& description = insight::descriptionOf(kpi_);
   const int end = canvas.write(2, 0, labelOf(kpi_), Role::Title);
-  canvas.write(end + 2, 0, description.name, Role::Faint);
-  if (drive.now()) canvas.writeRight(canvas.columns() - 1, 0, dateText(*drive.now()), Role::Faint);
+  const int nameEnd = canvas.write(end + 2, 0, description.name, Role::Faint);
+  if (drive.now()) canvas.write(nameEnd + 2, 0, dateText(*drive.now()), Role::Faint);
   drawFigures(canvas, span.start);
   const int graphLines = canvas.lines() - 3 - (hasLegend ? 1 : 0);
   graph.draw(canvas.part({0, 2, canvas.columns() - 1, graphLines}), drive);
