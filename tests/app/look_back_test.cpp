@@ -10,6 +10,7 @@
 #include "recording/recording_reader.h"
 #include "support/input.h"
 #include "system/main_queue.h"
+#include "system/output_lines.h"
 #include "system/run_loop.h"
 
 namespace vesk {
@@ -64,6 +65,7 @@ class Follower : public corvik::EventStream {
 };
 
 TEST(LookBack, LeavesWhatPlayingUpToThereLeaves) {
+  OutputLines::setSink(nullptr);
   const std::vector<handset::HandsetEvent> events = handset::drivenEvents(3, 120);
   std::string recording;
   Followed straight;
