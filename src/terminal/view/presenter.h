@@ -44,6 +44,9 @@ class Presenter {
   [[nodiscard]] std::optional<Clock::Instant> nextChange() const { return nextChange_; }
 
  private:
+  /// The screens of the stack down to the values of a category.
+  static constexpr std::size_t kDepthOfMetrics = 3;
+
   struct Screen {
     std::shared_ptr<ViewController> controller;
     /// Null for a screen that is no table.
