@@ -20,7 +20,7 @@ class HostileStage {
   HostileStage() {
     setenv("TERM", "xterm-256color", 1);
     std::string reason;
-    auto capabilities = readCapabilities(STDOUT_FILENO, kHasUtf8Locale, reason);
+    auto capabilities = readCapabilities(STDOUT_FILENO, kHasUtf8Locale, {}, reason);
     require(capabilities.has_value(), "there is an xterm");
     terminal_ = std::move(*capabilities);
     OutputLines::setSink(std::make_unique<DiagnosticSink>(lines_));

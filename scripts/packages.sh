@@ -10,6 +10,7 @@ build     ninja-build         ninja
 build     g++                 g++
 build     rapidjson-dev       /usr/include/rapidjson/reader.h
 build     libcli11-dev        /usr/include/CLI/CLI.hpp
+build     libtomlplusplus-dev /usr/include/toml++/toml.h
 build     libncurses-dev      /usr/include/ncursesw/curses.h
 build     zlib1g-dev          /usr/include/zlib.h
 build     protobuf-compiler   protoc

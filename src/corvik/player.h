@@ -1,10 +1,12 @@
 #pragma once
 
 #include <cstddef>
+#include <limits>
 #include <memory>
 #include <mutex>
 #include <optional>
 #include <stop_token>
+#include <variant>
 
 #include "recording/timed_events.h"
 #include "system/clock.h"
@@ -38,17 +40,35 @@ struct PlaybackState {
   double position = 0;
   /// Seconds: "at" of the last event of all, where it can be known; never before the position.
   std::optional<double> duration;
+  /// As of Playback, or as it was set since.
   std::optional<double> speed;
   /// Seconds: how long the pause was that is being shortened now.
   std::optional<double> shortenedPause;
+  bool isHeld = false;
+  /// On its way to a position, at full speed.
+  bool isSeeking = false;
+  /// Of this way through the recording.
   std::size_t events = 0;
   std::size_t badLines = 0;
 };
 
+/// The way to another position begins here: what comes next is played without waiting.
+struct SeekBegun {
+  /// The first event of all comes next, so that what was played before is to be forgotten.
+  bool isFromStart;
+};
+
+/// Everything up to the position has been played, and nothing behind it.
+struct SeekEnded {};
+
 /// Takes events from a recording, each when its time has come. One thread at a time plays; any thread may ask how far
-/// it is.
+/// it is, and steer it.
 class Player {
  public:
+  /// An event that is to be played, or what stands in its place.
+  using Step =
+      std::variant<vesk::RecordedEvent, vesk::BadLine, vesk::ReadFailure, vesk::EndOfRecording, SeekBegun, SeekEnded>;
+
   /// `clock` must outlive the player.
   Player(std::unique_ptr<vesk::TimedEvents> recording, const vesk::Clock& clock, Playback playback);
 
@@ -57,46 +77,82 @@ class Player {
   /// Waits for the next event's time and returns it, or what stands in its place. At the end of a recording that
   /// loops its start follows; its bad lines come once. When `stop` was requested meanwhile, what is returned is not to
   /// be played.
-  [[nodiscard]] vesk::TimedEvents::Step next(const std::stop_token& stop);
+  [[nodiscard]] Step next(const std::stop_token& stop);
+  /// Behind the end: waits until a position is sought. False where none can be, and when `stop` was requested.
+  [[nodiscard]] bool waitForSeek(const std::stop_token& stop);
 
-  /// Ends every wait of next() at once, until it is undone. From any thread.
+  /// Ends every wait at once, for a stop that was requested. From any thread.
   void interrupt() { interrupt_.signal(); }
-  void undoInterrupt() { interrupt_.clear(); }
+
+  // What steers it, from any thread.
+
+  /// Holds it between two events, or lets it go on.
+  void setHeld(bool isHeld);
+  /// As of Playback.
+  void setSpeed(std::optional<double> speed);
+  /// Goes to a position in seconds: forward by playing what lies between, back by playing anew from the start, both at
+  /// full speed and also while held. All events up to the position are then played, and none behind it. False, with
+  /// nothing done, where the recording has no way back.
+  bool seek(double position);
+  /// The same to where the first `count` events have been played.
+  bool seekToEvent(std::size_t count);
 
   [[nodiscard]] PlaybackState state() const;
 
  private:
-  void setPhase(PlaybackState::Phase phase);
-  [[nodiscard]] bool waitForInput(int descriptor);
-  /// Blocks until `at` has come.
-  void waitUntil(double at);
-  void countEvent(double at);
-  /// False when a bad line was told in an earlier lap.
-  [[nodiscard]] bool countBadLine();
-  [[nodiscard]] bool startAgain();
-
-  std::unique_ptr<vesk::TimedEvents> recording_;
-  const vesk::Clock& clock_;
-  Playback playback_;
-
-  /// When the last event was due, and its "at"; the start of the playback before the first.
-  std::optional<vesk::Clock::Instant> due_;
-  double at_ = 0;
-  std::size_t lap_ = 0;
-  std::size_t eventsOfLap_ = 0;
-  vesk::WakeUp interrupt_;
-
+  /// The last that is to be played of what is sought.
+  struct Target {
+    double at = std::numeric_limits<double>::infinity();
+    std::size_t events = std::numeric_limits<std::size_t>::max();
+  };
   /// What is waited for.
   struct NextEvent {
     double at;
     vesk::Clock::Instant due;
   };
+  /// What it is time for.
+  enum class Turn { event, arrival, somethingElse };
+
+  /// Blocks until the time of an event has come, or of what comes before it.
+  [[nodiscard]] Turn waitForTurn(double at, const std::stop_token& stop);
+  [[nodiscard]] bool waitForInput(int descriptor);
+  void sleepUntil(vesk::Clock::Instant instant, std::unique_lock<std::mutex>& lock);
+  bool seekTo(Target target);
+  [[nodiscard]] std::optional<SeekBegun> beginSeek();
+  /// At the end of the recording: whether what is sought lies no further.
+  [[nodiscard]] bool endsSeek();
+  [[nodiscard]] bool startAgain();
+  void setPhase(PlaybackState::Phase phase);
+  /// False when a bad line was told in an earlier lap.
+  [[nodiscard]] bool countBadLine();
+
+  // With stateLock_ held.
+  [[nodiscard]] double position() const;
+  /// Lets the time go on from a position.
+  void restartTime(double position);
+  void countEvent(double at);
+
+  std::unique_ptr<vesk::TimedEvents> recording_;
+  const vesk::Clock& clock_;
+  const bool loops_;
+  bool keepsPauses_;
+  /// Read, and not played yet.
+  std::optional<vesk::RecordedEvent> pending_;
+  std::size_t eventsOfLap_ = 0;
+  std::size_t badLinesOfLap_ = 0;
+  const std::stop_token* stop_ = nullptr;
+  vesk::WakeUp interrupt_;
 
   /// Guards what lies below it.
   mutable std::mutex stateLock_;
   PlaybackState state_;
   /// Absent when nothing is waited for.
   std::optional<NextEvent> next_;
+  /// When the playback was at at_: at the last event, or where the time was started anew since. Absent before start().
+  std::optional<vesk::Clock::Instant> due_;
+  double at_ = 0;
+  /// There until it is reached.
+  std::optional<Target> target_;
 };
 
 }  // namespace corvik

@@ -25,13 +25,15 @@ void RecordedService::start(EventStream& events) {
       schedule(&RecordedService::begin, events);
       break;
     case Runs::onThreadOfItsOwn:
-      thread_ = std::jthread([this, &events](const std::stop_token& stop) {
-        if (!begin(stop, events)) return;
-        while (playNext(stop, events) && events.waitUntilWanted(stop)) {
-        }
-      });
+      thread_ = std::jthread([this, &events](const std::stop_token& stop) { playOn(stop, events); });
       break;
   }
+}
+
+void RecordedService::playOn(const std::stop_token& stop, EventStream& events) {
+  bool hasMore = begin(stop, events);
+  while ((hasMore || player_.waitForSeek(stop)) && events.waitUntilWanted(stop))
+    hasMore = playNext(stop, events);
 }
 
 void RecordedService::stop() {
@@ -44,7 +46,6 @@ void RecordedService::endThread() {
   thread_.request_stop();
   player_.interrupt();
   thread_.join();
-  player_.undoInterrupt();
 }
 
 Result RecordedService::answer(const MetricQuery&, EventStream&) {
@@ -72,7 +73,7 @@ bool RecordedService::begin(const std::stop_token& stop, EventStream& events) {
 }
 
 bool RecordedService::playNext(const std::stop_token& stop, EventStream& events) {
-  vesk::TimedEvents::Step step = player_.next(stop);
+  Player::Step step = player_.next(stop);
   if (stop.stop_requested()) return false;
   if (const auto* event = std::get_if<vesk::RecordedEvent>(&step)) {
     batchBytes_ += event->payload.size();
@@ -81,6 +82,15 @@ bool RecordedService::playNext(const std::stop_token& stop, EventStream& events)
   }
   if (auto* bad = std::get_if<vesk::BadLine>(&step)) {
     if (onBadLine_) events.afterDelivery([tell = onBadLine_, message = std::move(bad->message)] { tell(message); });
+    return true;
+  }
+  if (const auto* begun = std::get_if<SeekBegun>(&step)) {
+    if (onSeekBegun_)
+      events.afterDelivery([tell = onSeekBegun_, isFromStart = begun->isFromStart] { tell(isFromStart); });
+    return true;
+  }
+  if (std::holds_alternative<SeekEnded>(step)) {
+    if (onSeekEnded_) events.afterDelivery([tell = onSeekEnded_] { tell(); });
     return true;
   }
   std::optional<std::string> failure;

@@ -17,7 +17,7 @@ namespace corvik {
 
 /// A service whose metrics come from a recording. It plays as soon as the client wants metrics, and no faster than the
 /// client takes them. A query is accepted and not answered. A client that disconnects ends the playback at once,
-/// whatever it waits for.
+/// whatever it waits for. Its player may be steered all the while; on the main thread not once it has ended.
 class RecordedService final : public Service {
  public:
   /// Which thread plays.
@@ -29,10 +29,13 @@ class RecordedService final : public Service {
     onMainThread,
   };
 
-  /// Both handlers are called on the main queue.
+  /// All handlers are called on the main queue.
   using BadLineHandler = std::function<void(const std::string& message)>;
   /// `failure` says why the recording could not be read to its end.
   using EndHandler = std::function<void(const std::optional<std::string>& failure)>;
+  /// Behind everything that was played before, and in front of what is played after.
+  using SeekBegunHandler = std::function<void(bool isFromStart)>;
+  using SeekEndedHandler = std::function<void()>;
 
   /// `clock` must outlive the service.
   RecordedService(std::unique_ptr<vesk::TimedEvents> recording, const vesk::Clock& clock, Playback playback,
@@ -45,9 +48,15 @@ class RecordedService final : public Service {
   void setBadLineHandler(BadLineHandler handler) { onBadLine_ = std::move(handler); }
   /// Called once everything has been delivered, behind the last event and the last bad line.
   void setEndHandler(EndHandler handler) { onEnd_ = std::move(handler); }
+  /// Each seek that begins ends, unless another begins before.
+  void setSeekHandlers(SeekBegunHandler begun, SeekEndedHandler ended) {
+    onSeekBegun_ = std::move(begun);
+    onSeekEnded_ = std::move(ended);
+  }
 
   /// From any thread.
   [[nodiscard]] PlaybackState state() const { return player_.state(); }
+  [[nodiscard]] Player& player() { return player_; }
 
  private:
   void start(EventStream& events) override;
@@ -55,6 +64,7 @@ class RecordedService final : public Service {
   [[nodiscard]] Result answer(const MetricQuery& query, EventStream& events) override;
 
   void endThread();
+  void playOn(const std::stop_token& stop, EventStream& events);
 
   /// Waits until the client wants metrics. False when there is nothing to play for it.
   [[nodiscard]] bool begin(const std::stop_token& stop, EventStream& events);
@@ -69,6 +79,8 @@ class RecordedService final : public Service {
   Runs runs_;
   BadLineHandler onBadLine_;
   EndHandler onEnd_;
+  SeekBegunHandler onSeekBegun_;
+  SeekEndedHandler onSeekEnded_;
   /// Bytes of payload in the main thread's batch.
   std::size_t batchBytes_ = 0;
   std::jthread thread_;

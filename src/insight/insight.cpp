@@ -7,14 +7,9 @@ void Insight::observeEventsOf(MetricValidator& intake) {
 }
 
 void Insight::startAnew() {
-  clock_ = {};
-  counts_ = {};
-  timeline_ = {};
-  heard_ = {};
+  static_cast<Present&>(*this) = {};
   summary_ = {};
   judge_.forget();
-  trend_ = {};
-  happenings_.clear();
 }
 
 void Insight::observe(const TakenEvent& event, const Stores& stores) {
@@ -59,13 +54,6 @@ void Insight::take(const TakenEvent& event, const Stores& stores, std::uint64_t 
   trend_.take(report.kpis, clock_.counted(), moment.time);
   if (onStep_) onStep_(report, events_);
   keep(events_);
-}
-
-void Insight::keep(const std::vector<TimelineEvent>& events) {
-  for (const TimelineEvent& event : events) {
-    if (happenings_.size() == kMostHappenings) happenings_.pop_front();
-    happenings_.push_back({event, clock_.counted()});
-  }
 }
 
 }  // namespace vesk::insight

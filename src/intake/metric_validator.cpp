@@ -66,6 +66,11 @@ void MetricValidator::eventsDidUpdate(const std::optional<Dictionary>& /*event*/
   OutputLines::print({"I dont care for events"});
 }
 
+void MetricValidator::startAnew() {
+  metricID.reset();
+  stores = {};
+}
+
 bool MetricValidator::validateMetric(const Dictionary& event) {
   const TakenEvent taken = take(event);
   if (eventObserver_) eventObserver_(taken);

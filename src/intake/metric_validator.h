@@ -62,6 +62,9 @@ class MetricValidator : public CorvikWrapperDelegate {
 
   [[nodiscard]] const std::shared_ptr<CorvikWrapper>& sharedCorvikInstance() const { return mySharedCorvikInstance; }
 
+  /// Forgets all that came, so that the same events, or others, can be followed from their start.
+  void startAnew();
+
   /// The metric identifier of the latest event; absent when it had none.
   std::optional<std::int64_t> metricID;
 

@@ -5,6 +5,7 @@
 
 #include "screens/common_look.h"
 #include "screens/detail_text.h"
+#include "screens/shown_stores.h"
 #include "system/main_queue.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
@@ -29,12 +30,12 @@ std::optional<Record> SecondLevelViewController::recordOf(std::size_t section) c
   const CategorySource& from = source();
   switch (from.kind) {
     case SourceKind::metricRecord:
-      return from.latestRecord(myMetricValidator->stores);
+      return from.latestRecord(shownStores());
     case SourceKind::storeRecord:
-      return from.storeRecord(myMetricValidator->stores);
+      return from.storeRecord(shownStores());
     case SourceKind::storeList:
     case SourceKind::firstElement: {
-      const RecordList list = from.list(myMetricValidator->stores);
+      const RecordList list = from.list(shownStores());
       if (section < list.size()) return list[section];
       break;
     }
@@ -62,7 +63,7 @@ void SecondLevelViewController::update() {
 
 std::size_t SecondLevelViewController::numberOfSections() {
   const CategorySource& from = source();
-  return from.kind == SourceKind::storeList ? from.list(myMetricValidator->stores).size() : 1;
+  return from.kind == SourceKind::storeList ? from.list(shownStores()).size() : 1;
 }
 
 std::optional<Text> SecondLevelViewController::headerTitle(std::size_t section) {

@@ -11,13 +11,14 @@
 namespace vesk {
 
 std::unique_ptr<Terminal> Terminal::open(NavigationController& stack, const Clock& clock, Surroundings surroundings,
-                                         std::string& reason) {
+                                         const Appearance& appearance, std::string& reason) {
   std::optional<FileDescriptor> terminal = TerminalDevice::openControllingTerminal();
   if (!terminal) {
     reason = "there is no terminal to show screens on";
     return nullptr;
   }
-  std::optional<Capabilities> capabilities = readCapabilities(terminal->get(), setUpCharacterLocale(), reason);
+  std::optional<Capabilities> capabilities =
+      readCapabilities(terminal->get(), setUpCharacterLocale(), appearance, reason);
   if (!capabilities) return nullptr;
   return std::make_unique<Terminal>(stack, clock, std::move(surroundings), std::move(*terminal),
                                     std::move(*capabilities));
@@ -30,7 +31,7 @@ Terminal::Terminal(NavigationController& stack, const Clock& clock, Surroundings
       surroundings_(std::move(surroundings)),
       capabilities_(std::move(capabilities)),
       device_(std::move(terminal), {capabilities_.enterScreen, capabilities_.leaveScreen}),
-      presenter_(stack, surroundings_) {
+      presenter_(stack, surroundings_, capabilities_.signs) {
   stack_.setDisplayObserver([this] { setNeedsDisplay(); });
   if (surroundings_.diagnostics != nullptr) {
     surroundings_.diagnostics->setObserver([this] { setNeedsDisplay(); });
@@ -67,7 +68,7 @@ void Terminal::serve() {
     return;
   }
   const bool isUrgent = !events.empty() || arrived.isStopWanted || arrived.isContinued || arrived.isResized;
-  const bool isFrameDue = needsDisplay_ && now >= lastDrawn_ + kFrame;
+  const bool isFrameDue = needsDisplay_ && now >= nextFrame();
   const bool hasTimeChangedIt = presenter_.nextChange() && *presenter_.nextChange() <= now;
   if (isUrgent || isFrameDue || hasTimeChangedIt) {
     draw(clock_.now());
@@ -79,6 +80,29 @@ void Terminal::serve() {
 void Terminal::setNeedsDisplay() {
   if (std::exchange(needsDisplay_, true) || isServing_) return;
   scheduleWakeUp(clock_.now());
+}
+
+void Terminal::perform(Action action) {
+  const BoundKey& key = *bindingOf(action).keys.begin();
+  presenter_.handle(KeyEvent{.key = key.key, .character = key.character});
+  setNeedsDisplay();
+}
+
+void Terminal::setOnTheWay(bool isOnTheWay) {
+  presenter_.setOnTheWay(isOnTheWay);
+  setNeedsDisplay();
+}
+
+void Terminal::tell(std::string notice, bool rings) {
+  constexpr std::chrono::seconds kShown{6};
+  constexpr std::chrono::seconds kQuiet{1};
+  const Clock::Instant now = clock_.now();
+  presenter_.tell(std::move(notice), now + kShown);
+  if (rings && now >= lastRung_ + kQuiet) {
+    device_.write("\a");
+    lastRung_ = now;
+  }
+  setNeedsDisplay();
 }
 
 void Terminal::suspend() {
@@ -119,7 +143,7 @@ void Terminal::scheduleWakeUp(Clock::Instant now) {
   // The device tells by itself when a terminal that is behind has room again.
   if (!device_.isBehind()) {
     consider(presenter_.nextChange());
-    if (needsDisplay_) consider(lastDrawn_ + kFrame);
+    if (needsDisplay_) consider(nextFrame());
   }
   device_.wakeAfter(next ? std::optional(*next - now) : std::nullopt);
 }

@@ -46,6 +46,11 @@ class RecordedServiceTest : public testing::Test {
       isEnded_ = true;
       loop_.stop();
     });
+    service_->setSeekHandlers([this](bool isFromStart) { ids_ = {isFromStart ? kFromStart : kOn}; },
+                              [this] {
+                                ids_.push_back(kArrived);
+                                loop_.stop();
+                              });
     installService(service_);
     manager_ = client::CreateManager("test", *queue_);
     installService(nullptr);
@@ -72,6 +77,17 @@ class RecordedServiceTest : public testing::Test {
     loop_.run();
     return ids_;
   }
+
+  /// What comes until the way to a position has ended.
+  Ids arrival() {
+    stopAfter_ = 0;
+    loop_.run();
+    return ids_;
+  }
+
+  static constexpr std::int64_t kFromStart = -1;
+  static constexpr std::int64_t kOn = -2;
+  static constexpr std::int64_t kArrived = -3;
 
   vesk::ManualClock clock_;
   vesk::SteadyClock steadyClock_;
@@ -171,6 +187,45 @@ TEST_F(RecordedServiceTest, GoesRoundAndTellsBadLinesOnce) {
   EXPECT_EQ(badLines_.size(), 1U);
 }
 
+TEST_F(RecordedServiceTest, GoesToAnyMomentByPlayingUpToItThenOnFromThere) {
+  connect(vesk::fileWith(line(1, 1) + line(2, 2) + "bad\n" + line(2, 3) + line(4, 4) + line(9, 5)), {1.0, false});
+  Player& player = service_->player();
+  EXPECT_GT(clock_.waitForSleeper(), 0s);
+  player.setHeld(true);
+  EXPECT_TRUE(player.seek(3));
+  EXPECT_EQ(arrival(), (Ids{kOn, 1, 2, 3, kArrived}));
+  EXPECT_EQ(service_->state().position, 3);
+  EXPECT_TRUE(player.seek(1.5));
+  EXPECT_EQ(arrival(), (Ids{kFromStart, 1, kArrived}));
+  EXPECT_TRUE(player.seekToEvent(2));
+  EXPECT_EQ(arrival(), (Ids{kOn, 2, kArrived}));
+  EXPECT_TRUE(player.seek(-7));
+  EXPECT_EQ(arrival(), (Ids{kFromStart, kArrived}));
+  EXPECT_TRUE(player.seek(3));
+  EXPECT_EQ(arrival(), (Ids{kOn, 1, 2, 3, kArrived}));
+
+  clock_.advance(1h);
+  player.setSpeed(2);
+  player.setHeld(false);
+  while (clock_.waitForSleeper() > 1s) {
+  }
+  EXPECT_EQ(clock_.waitForSleeper(), 500ms);
+  EXPECT_EQ(next(1), Ids{4});
+  EXPECT_GT(clock_.waitForSleeper(), 0s);
+  clock_.advance(1s);
+  EXPECT_EQ(service_->state().position, 6);
+
+  EXPECT_TRUE(player.seek(1e9));
+  EXPECT_EQ(arrival(), (Ids{kOn, 5, kArrived}));
+  while (!isEnded_)
+    loop_.run();
+  EXPECT_EQ(service_->state().phase, Phase::ended);
+  EXPECT_TRUE(player.seek(4));
+  EXPECT_EQ(arrival(), (Ids{kFromStart, 1, 2, 3, 4, kArrived}));
+  EXPECT_EQ(badLines_.size(), 1U);
+  EXPECT_EQ(service_->state().events, 4U);
+}
+
 TEST_F(RecordedServiceTest, PlaysAPipeAsItIsWrittenAndIsInterruptedWhileItWaitsForMore) {
   vesk::Pipe pipe;
   connect(std::move(pipe.reading), {std::nullopt, false});
@@ -181,6 +236,8 @@ TEST_F(RecordedServiceTest, PlaysAPipeAsItIsWrittenAndIsInterruptedWhileItWaitsF
   }
   EXPECT_EQ(ids_, (Ids{1, 2}));
   EXPECT_EQ(service_->state().duration, std::nullopt);
+  EXPECT_FALSE(service_->player().seek(0));
+  service_->player().setSpeed(3);
   manager_.reset();
   EXPECT_FALSE(isEnded_);
 }

@@ -85,9 +85,9 @@ TEST(Picture, MarksValuesThatChangedAtTheLastReloadForThatReload) {
   EXPECT_EQ(desk.line(4), "  tx_power                           2");
 }
 
-TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
+TEST(Picture, TellsHowOldTheRowsAreInTheDrivesTimeAndHowOftenTheMetricCame) {
   FakeInterface interface;
-  interface.showFields(kTxPower, power("1"));
+  FakeTableScreen& fields = interface.showFields(kTxPower, power("1"));
   std::optional<Arrivals> arrivals = Arrivals{};
   std::string asked;
   Surroundings surroundings;
@@ -95,6 +95,8 @@ TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
     asked = std::string(area) + "/" + std::string(category);
     return arrivals;
   };
+  DriveMoment moment{std::chrono::hours(1000), 2};
+  surroundings.driveMoment = [&] { return moment; };
   Desk desk(interface.stack(), {40, 10}, surroundings);
   EXPECT_EQ(desk.line(1), "  Tx Power  never");
   EXPECT_EQ(asked, "LTE/Tx Power");
@@ -102,10 +104,10 @@ TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
 
   using namespace std::chrono_literals;
   struct {
-    Clock::Duration age;
+    std::chrono::milliseconds age;
     std::uint64_t count;
     std::string text;
-    Clock::Duration next;
+    std::chrono::milliseconds next;
   } const cases[] = {
       {0s, 1, "0 s ago, once", 1s},
       {59999ms, 2, "59 s ago, 2 times", 60s},
@@ -113,11 +115,17 @@ TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
       {49h, 2, "2 d ago, 2 times", 72h},
   };
   for (const auto& each : cases) {
-    arrivals = Arrivals{desk.now() - each.age, each.count};
+    arrivals = Arrivals{moment.time - each.age, each.count};
+    fields.tableView().reloadData();
     EXPECT_EQ(desk.line(1), "  Tx Power  " + each.text);
-    EXPECT_EQ(desk.presenter().nextChange(), desk.now() - each.age + each.next);
+    EXPECT_EQ(desk.presenter().nextChange(), desk.now() + Clock::Duration(each.next - each.age) / 2);
   }
+  arrivals = Arrivals{moment.time, 15};
+  moment = {moment.time + 24h, 0};
+  EXPECT_EQ(desk.line(1), "  Tx Power  3 d ago, 2 times");
+  EXPECT_EQ(desk.presenter().nextChange(), std::nullopt);
   arrivals = std::nullopt;
+  fields.tableView().reloadData();
   EXPECT_EQ(desk.line(1), "  Tx Power");
   asked.clear();
   interface.stack().pop();
@@ -154,11 +162,12 @@ TEST(Picture, ShowsTheDiagnosticLinesInAPaneThatKeepsItsPlace) {
 
 TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   FakeInterface interface;
-  Desk desk(interface.stack(), {80, 24});
+  Desk desk(interface.stack(), {80, 32});
   desk.type(U"?");
   EXPECT_EQ(desk.line(1), "  Keys");
   EXPECT_EQ(desk.line(4), "  Esc ← h Backspace  clear the filter, go back");
-  EXPECT_EQ(desk.line(23), " ? help  Enter open  Esc back  / filter  f freeze  d lines  q quit");
+  EXPECT_EQ(desk.line(6), "  Space f            hold all that shows, and the replay; intake goes on");
+  EXPECT_EQ(desk.line(31), " ? help  Enter open  Esc back  / filter  Space hold  d lines  o overview  q quit");
   desk.resize({40, 10});
   desk.press(Key::End);
   EXPECT_EQ(desk.line(8), "  wheel, drag        scroll");

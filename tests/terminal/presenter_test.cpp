@@ -21,6 +21,11 @@ class PresenterTest : public testing::Test {
   PresenterTest() {
     surroundings_.setTracking = [this](bool isTracking) { tracking_.push_back(isTracking); };
     surroundings_.quit = [this] { ++quits_; };
+    surroundings_.setHeld = [this](bool isHeld) { held_.push_back(isHeld); };
+    surroundings_.jump = [this](std::chrono::seconds distance) {
+      asked_.push_back("jump " + std::to_string(distance.count()));
+    };
+    surroundings_.changeSpeed = [this](int step) { asked_.push_back("speed " + std::to_string(step)); };
     desk_.emplace(interface_.stack(), Size{40, 10}, surroundings_);
   }
 
@@ -38,6 +43,8 @@ class PresenterTest : public testing::Test {
 
   FakeInterface interface_;
   std::vector<bool> tracking_;
+  std::vector<bool> held_;
+  std::vector<std::string> asked_;
   int quits_ = 0;
   Surroundings surroundings_;
   std::optional<Desk> desk_;
@@ -167,18 +174,104 @@ TEST_F(PresenterTest, FiltersWhileOneTypes) {
   EXPECT_EQ(depth(), 2U);
 }
 
-TEST_F(PresenterTest, HoldsTheWholeScreenWhileFrozen) {
+TEST_F(PresenterTest, HoldsTheWholeScreen) {
   FakeTableScreen& fields = showFields(numbered(30, "old"));
-  desk_->type(U"f");
+  desk_->type(U" ");
   fields.content = numbered(10, "new");
   fields.tableView().reloadData();
   desk_->press(Key::End);
   EXPECT_EQ(desk_->line(8), "  row 29                           old █");
-  EXPECT_EQ(desk_->line(1), "  NAS                           FROZEN");
+  EXPECT_EQ(desk_->line(1), "  NAS                             HELD");
 
   desk_->type(U"f");
   EXPECT_EQ(desk_->line(8), "• row 9                            new █");
   EXPECT_EQ(desk_->line(1), "  NAS");
+
+  desk_->type(U"f");
+  desk_->press(Key::Escape);
+  EXPECT_EQ(desk_->line(1), "  LTE                             HELD");
+  EXPECT_EQ(held_, (std::vector<bool>{true, false, true}));
+}
+
+TEST_F(PresenterTest, ShowsAnotherMomentOnceItHasComeWithSelectionAndPlaceKept) {
+  FakeTableScreen& fields = showFields(numbered(30, "then"));
+  desk_->press(Key::End);
+  for (const bool isHeld : {false, true}) {
+    if (isHeld) desk_->type(U" ");
+    const std::string before = desk_->line(8);
+    desk_->presenter().setOnTheWay(true);
+    fields.content.clear();
+    fields.tableView().reloadData();
+    EXPECT_EQ(desk_->line(8), before);
+    fields.content = numbered(30, isHeld ? "first" : "now");
+    fields.tableView().reloadData();
+    desk_->presenter().setOnTheWay(false);
+    EXPECT_EQ(desk_->lineOf(Role::Selected), 8);
+    EXPECT_NE(desk_->line(8).find("row 29"), std::string::npos);
+    EXPECT_NE(desk_->line(8).find(isHeld ? "first" : "now"), std::string::npos);
+  }
+  desk_->type(U"><+-");
+  EXPECT_EQ(asked_, (std::vector<std::string>{"jump 10", "jump -10", "speed 1", "speed -1"}));
+}
+
+TEST_F(PresenterTest, TellsWhatValuesMeanBesideThemWhereItFits) {
+  surroundings_.reading = [](std::string_view, std::string_view category, IndexPath, std::string_view name) {
+    return name == "rsrp" ? std::string(category) + ": fair" : std::string(name == "long" ? 40 : 0, 'x');
+  };
+  desk_.emplace(interface_.stack(), Size{80, 10}, surroundings_);
+  using Screen = FakeTableScreen;
+  showFields({{std::nullopt, {Screen::row("rsrp", "-96"), Screen::row("long", "1"), Screen::row("time", "2")}}});
+  const std::string gap(36, ' ');
+  EXPECT_EQ(desk_->line(2), "  rsrp" + gap + "-96  NAS: fair");
+  EXPECT_EQ(desk_->line(3), "  long" + gap + "  1");
+  EXPECT_EQ(desk_->line(4), "  time" + gap + "  2");
+  desk_->type(U"u");
+  EXPECT_EQ(desk_->line(2).find("fair"), std::string::npos);
+  EXPECT_EQ(desk_->line(2).size(), 78U);
+  desk_->type(U"u");
+  desk_->resize({60, 10});
+  EXPECT_EQ(desk_->line(2).find("fair"), std::string::npos);
+}
+
+TEST_F(PresenterTest, TellsACategorysHeadlineAndItsAgeInTheMenuAsFarAsItFits) {
+  surroundings_.arrivals = [](std::string_view, std::string_view category) {
+    return category == "NAS" ? Arrivals{} : Arrivals{std::chrono::seconds(1), 1};
+  };
+  surroundings_.driveMoment = [] { return DriveMoment{std::chrono::seconds(24), 1}; };
+  surroundings_.headline = [](std::string_view area, std::string_view category) {
+    return category == "RRC State" ? std::string("CONNECTED") : std::string(area) + std::string(13, '.');
+  };
+  surroundings_.technologyInstead = [](std::string_view, std::string_view category) {
+    return category == "C-DRX" ? "GSM" : "";
+  };
+  desk_.emplace(interface_.stack(), Size{50, 14}, surroundings_);
+  desk_->type(U"j");
+  desk_->press(Key::Enter);
+  desk_->press(Key::End);
+  EXPECT_EQ(desk_->picture(), R"(
+| Vesk › LTE
+|  LTE
+|  NAS                                          ›
+|  RRC State                    CONNECTED  23 s ›
+|  Serving Cell Info     LTE.............  23 s ›
+|  Serving Cell Meas     LTE.............  23 s ›
+|  Tx Power              LTE.............  23 s ›
+|  Sel Resel Parameters  LTE.............  23 s ›
+|  EUTRA Neighbor Info   LTE.............  23 s ›
+|  C-DRX        LTE.............  23 s, now GSM ›
+|  LTE Neighbor Cell Meas                  23 s ›
+|
+|
+| ? help  Enter open  Esc back  / filter
+)");
+}
+
+TEST_F(PresenterTest, ShowsANoticeForItsTime) {
+  desk_->presenter().tell("a pipe has no way back", desk_->now() + std::chrono::seconds(5));
+  EXPECT_EQ(desk_->line(9), " a pipe has no way back");
+  EXPECT_EQ(desk_->presenter().nextChange(), desk_->now() + std::chrono::seconds(5));
+  desk_->wait(std::chrono::seconds(5));
+  EXPECT_EQ(desk_->line(9).substr(0, 7), " ? help");
 }
 
 TEST_F(PresenterTest, TheMouseSelectsOpensScrollsAndGoesBack) {

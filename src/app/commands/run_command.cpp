@@ -1,5 +1,6 @@
 #include "app/commands/run_command.h"
 
+#include <algorithm>
 #include <memory>
 #include <string>
 #include <unistd.h>
@@ -7,13 +8,16 @@
 #include <vector>
 
 #include "app/program/app_delegate.h"
-#include "app/program/metric_arrivals.h"
+#include "app/program/configuration.h"
+#include "app/program/shown_moment.h"
 #include "app/program/stop_signals.h"
 #include "app/program/vesk_interface.h"
 #include "app/source/redaction.h"
+#include "app/source/replay_control.h"
 #include "app/source/road.h"
 #include "insight/insight.h"
 #include "intake/metric_validator.h"
+#include "screens/vesk_view_items.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
 #include "system/timer.h"
@@ -27,8 +31,11 @@ namespace {
 /// One run of the program, from the source of its events to what shows them.
 class Run {
  public:
-  Run(const RunOptions& options, std::vector<insight::Rule> rules)
-      : options_(options), isHeadless_(options.isHeadless), isJudging_(!rules.empty()) {
+  Run(const RunOptions& options, bool isHeadless, Configuration configuration, std::vector<insight::Rule> rules)
+      : options_(options),
+        isHeadless_(isHeadless),
+        isJudging_(!rules.empty()),
+        configuration_(std::move(configuration)) {
     insight_.setRules(std::move(rules));
     if (options_.duration) end_ = clock_.now() + *options_.duration;
     boundTelling(stopSignal_, end_);
@@ -38,7 +45,9 @@ class Run {
     source_ = makeEventSource(options_.source, clock_,
                               {[this](const std::string& message) { tell(message); },
                                [this](const std::string& remark) { show("vesk: " + remark); },
-                               [this](const std::optional<std::string>& failure) { sourceEnded(failure); }});
+                               [this](const std::optional<std::string>& failure) { sourceEnded(failure); },
+                               [this](bool isFromStart) { seekBegun(isFromStart); }, [this] { seekEnded(); }});
+    control_.setPlayer(source_.player);
     if (source_.failure) {
       tellUser("vesk: " + *source_.failure);
       return Outcome::failed;
@@ -46,7 +55,6 @@ class Run {
     const std::shared_ptr<corvik::Service> service =
         options_.isRedacted ? makeRedactedService(source_.service, redaction_) : source_.service;
     corvik::installService(service);
-    if (!isHeadless_ && isatty(STDOUT_FILENO) == 0) isHeadless_ = true;
     if (isHeadless_) {
       printLines();
     } else {
@@ -81,7 +89,9 @@ class Run {
       end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
     }
     if (isJudging_) judgeRules();
+    root_ = &root;
     if (!isHeadless_) openTerminal(application, root);
+    if (isJudging_ || !isHeadless_) insight_.observeEventsOf(*MetricValidator::shared());
     const std::optional<std::string> reason = whyNoMetricArrives(root);
     if (reason) tell(*reason);
     if (!reason || !isHeadless_) loop_.run();
@@ -89,18 +99,24 @@ class Run {
     MetricValidator::shared()->setEventObserver(nullptr);
   }
 
-  /// Those that fire are told among the diagnostic lines.
+  /// Those that fire are told among the diagnostic lines, and on the screens.
   void judgeRules() {
-    insight_.setStepHandler([](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
-      for (const insight::TimelineEvent& event : events)
-        if (event.kind == insight::EventKind::alert) OutputLines::print({"Alert:", textOf(event)});
-    });
-    insight_.observeEventsOf(*MetricValidator::shared());
+    insight_.setStepHandler(
+        [this](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
+          for (const insight::TimelineEvent& event : events)
+            if (event.kind == insight::EventKind::alert) tellAlert(textOf(event));
+        });
+  }
+
+  void tellAlert(const std::string& alert) {
+    if (isOnTheWay_) return;
+    OutputLines::print({"Alert:", alert});
+    if (terminal_ != nullptr) terminal_->tell("Alert: " + alert, true);
   }
 
   void openTerminal(Application& application, NavigationController& root) {
     std::string reason;
-    terminal_ = Terminal::open(root, clock_, surroundings(application), reason);
+    terminal_ = Terminal::open(root, clock_, surroundings(application), configuration_.appearance, reason);
     if (terminal_ == nullptr) {
       tellUser("vesk: " + reason + "; running without screens");
       isHeadless_ = true;
@@ -111,10 +127,25 @@ class Run {
       return;
     }
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
-      arrivals_.note(metricId);
+      moment_.noteArrival(metricId);
       terminal_->setNeedsDisplay();
     });
+    showStart(root);
     loop_.addInput(terminal_->descriptor(), [this] { terminal_->serve(); });
+  }
+
+  void showStart(NavigationController& root) {
+    const StartView& start = configuration_.start;
+    const auto open = [&](std::string_view label, const std::vector<Text>& labels) {
+      auto* menu = dynamic_cast<TableViewController*>(root.topViewController().get());
+      const auto found = std::find(labels.begin(), labels.end(), Text::copy(label));
+      if (menu != nullptr && found != labels.end())
+        menu->selectRow({0, static_cast<std::size_t>(found - labels.begin())});
+    };
+    const VeskViewItems& menu = VeskViewItems::shared();
+    if (!start.area.empty()) open(start.area, menu.launchViewItemNames);
+    if (!start.category.empty()) open(start.category, menu.categoriesOf(start.area));
+    if (start.action) terminal_->perform(*start.action);
   }
 
   void closeTerminal() {
@@ -125,9 +156,13 @@ class Run {
   }
 
   Surroundings surroundings(Application& application) {
-    return {
+    Surroundings surroundings{
         .sourceState = [this] { return sourceState(); },
-        .arrivals = [this](std::string_view area, std::string_view category) { return arrivals_.of(area, category); },
+        .setHeld = [this](bool isHeld) { setHeld(isHeld); },
+        .changeSpeed = [this](int step) { changeSpeed(step); },
+        .jump = [this](std::chrono::seconds distance) { control_.jump(distance); },
+        .drive = &insight_,
+        .goToEvent = [this](const insight::TimelineEvent& event) { control_.goTo(event); },
         .diagnostics = &diagnostics_,
         .setTracking =
             [this](bool isTracking) { loop_.setMode(isTracking ? RunLoopMode::tracking : RunLoopMode::defaultMode); },
@@ -141,12 +176,56 @@ class Run {
               }
             },
     };
+    moment_.addTo(surroundings);
+    return surroundings;
   }
 
   SourceState sourceState() {
     const ShownState shown = source_.state();
-    if (!shown.isMoving) return {shown.text};
-    return {shown.text, clock_.now() + std::chrono::seconds(1)};
+    std::optional<Clock::Instant> nextChange;
+    if (shown.isMoving) nextChange = clock_.now() + std::chrono::seconds(1);
+    return {shown.text, nextChange, moment_.date()};
+  }
+
+  void setHeld(bool isHeld) {
+    isHeld_ = isHeld;
+    moment_.keepTime();
+    control_.setHeld(isHeld);
+    if (!isOnTheWay_) showMoment();
+  }
+
+  void changeSpeed(int step) {
+    moment_.keepTime();
+    control_.changeSpeed(step);
+  }
+
+  /// What was shown stays until the moment that is sought has come.
+  void seekBegun(bool isFromStart) {
+    isOnTheWay_ = true;
+    if (terminal_ != nullptr) terminal_->setOnTheWay(true);
+    if (!moment_.isHeld()) moment_.hold();
+    OutputLines::setSink(nullptr);
+    if (!isFromStart) return;
+    MetricValidator::shared()->startAnew();
+    insight_.startAnew();
+    moment_.startAnew();
+  }
+
+  void seekEnded() {
+    isOnTheWay_ = false;
+    OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
+    showMoment();
+    if (auto* table = dynamic_cast<TableViewController*>(root_->topViewController().get()))
+      table->tableView().reloadData();
+    if (terminal_ != nullptr) terminal_->setOnTheWay(false);
+  }
+
+  void showMoment() {
+    if (isHeld_) {
+      moment_.hold();
+    } else {
+      moment_.release();
+    }
   }
 
   /// To the user where there are no screens, and to the diagnostic lines where there are.
@@ -175,6 +254,7 @@ class Run {
   bool isHeadless_;
   /// Whether there are rules.
   bool isJudging_;
+  Configuration configuration_;
   /// When nobody is waited for any more; absent for never.
   std::optional<Clock::Instant> end_;
   Outcome outcome_ = Outcome::done;
@@ -182,10 +262,18 @@ class Run {
   RunLoop loop_{clock_};
   const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;
-  MetricArrivals arrivals_{clock_};
   Redaction redaction_;
   EventSource source_;
   insight::Insight insight_;
+  ShownMoment moment_{clock_, insight_, [this] { return source_.state().pace; }};
+  ReplayControl control_{[this](const std::string& reason) {
+    if (terminal_ != nullptr) terminal_->tell(reason, false);
+  }};
+  /// By the user.
+  bool isHeld_ = false;
+  /// To the moment that is sought.
+  bool isOnTheWay_ = false;
+  NavigationController* root_ = nullptr;
   AppDelegate delegate_;
   std::unique_ptr<Terminal> terminal_;
 };
@@ -195,7 +283,11 @@ class Run {
 Outcome runProgram(const RunOptions& options) {
   auto rules = readRules(options.rules);
   if (!rules) return Outcome::wrongUsage;
-  return Run(options, *std::move(rules)).run();
+  const bool isHeadless = options.isHeadless || isatty(STDOUT_FILENO) == 0;
+  auto configuration = isHeadless ? Configuration{} : readConfiguration(configurationPath());
+  if (!configuration) return Outcome::wrongUsage;
+  rules->insert(rules->begin(), configuration->rules.begin(), configuration->rules.end());
+  return Run(options, isHeadless, *std::move(configuration), *std::move(rules)).run();
 }
 
 }  // namespace vesk

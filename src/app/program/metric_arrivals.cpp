@@ -4,9 +4,9 @@
 
 namespace vesk {
 
-void MetricArrivals::note(std::int64_t metricId) {
+void MetricArrivals::note(std::int64_t metricId, std::chrono::milliseconds time) {
   Arrivals& arrivals = arrivals_[metricId];
-  arrivals.last = clock_.now();
+  arrivals.last = time;
   ++arrivals.count;
 }
 

@@ -1,11 +1,11 @@
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <optional>
 #include <string_view>
 #include <unordered_map>
 
-#include "system/clock.h"
 #include "terminal/view/surroundings.h"
 
 namespace vesk {
@@ -13,14 +13,12 @@ namespace vesk {
 /// When each kind of metric last arrived, and how often. Main queue only.
 class MetricArrivals {
  public:
-  explicit MetricArrivals(const Clock& clock) : clock_(clock) {}
-
-  void note(std::int64_t metricId);
+  /// One came at `time` of the drive.
+  void note(std::int64_t metricId, std::chrono::milliseconds time);
   /// Of the metric that changes a category; absent for one that none changes.
   [[nodiscard]] std::optional<Arrivals> of(std::string_view area, std::string_view category) const;
 
  private:
-  const Clock& clock_;
   std::unordered_map<std::int64_t, Arrivals> arrivals_;
 };
 

@@ -29,6 +29,14 @@ std::string playingTime(double seconds) {
   return text;
 }
 
+/// "×1", "×0.5", "×max".
+std::string speedText(const std::optional<double>& speed) {
+  if (!speed) return "×max";
+  char text[32];
+  std::snprintf(text, sizeof text, "×%g", *speed);
+  return text;
+}
+
 ShownState shown(const corvik::PlaybackState& state, bool isLive) {
   using Phase = corvik::PlaybackState::Phase;
   switch (state.phase) {
@@ -36,16 +44,18 @@ ShownState shown(const corvik::PlaybackState& state, bool isLive) {
     case Phase::waitingForInput:
       return {"waiting"};
     case Phase::ended:
-      return {"ended"};
+      return {"ended", false, 0};
     case Phase::playing:
       break;
   }
   // A pipe is as good as live.
   if (isLive) return {"live"};
-  std::string text = "replaying " + playingTime(state.position);
+  const std::string_view sign = state.isSeeking ? "▶▶ " : state.isHeld ? "▮▮ " : "▶ ";
+  std::string text = std::string(sign) + speedText(state.speed) + "  " + playingTime(state.position);
   if (state.duration) text += " of " + playingTime(*state.duration);
   if (state.shortenedPause) text += ", shortening a pause of " + playingTime(*state.shortenedPause);
-  return {text, true};
+  const bool isMoving = !state.isHeld || state.isSeeking;
+  return {text, isMoving, isMoving && !state.isSeeking ? state.speed.value_or(0) : 0};
 }
 
 /// "ttyUSB0: 23 packets/s, 2 damaged", and what else has gone wrong.
@@ -122,9 +132,10 @@ EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, S
       tell(remark);
     ended(failure);
   });
+  service->setSeekHandlers(std::move(handlers.seekBegun), std::move(handlers.seekEnded));
   corvik::RecordedService& recorded = *service;
   return {std::move(service), [&recorded, &input] { return shown(recorded.state(), input.isLive()); }, std::nullopt,
-          [&recorded] { return recorded.state().position; }};
+          [&recorded] { return recorded.state().position; }, &recorded.player()};
 }
 
 }  // namespace

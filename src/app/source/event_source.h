@@ -29,10 +29,12 @@ struct SourceOptions {
 
 /// What a status bar shows of a source.
 struct ShownState {
-  /// "live", "replaying 3:12 of 9:40", "waiting", "ended".
+  /// "live", "▶ ×1  3:12 of 9:40", "waiting", "ended".
   std::string text;
   /// Whether the text changes with the seconds.
   bool isMoving = false;
+  /// How many seconds of the drive pass in one; 0 where they are not known to pass.
+  double pace = 1;
 };
 
 /// A service with what the program shows of it.
@@ -43,9 +45,11 @@ struct EventSource {
   std::optional<std::string> failure{};
   /// How far its own time has come, in seconds from some start; from any thread. Null for a port, whose packets know.
   std::function<double()> seconds{};
+  /// What steers it; null for a source that is no replay.
+  corvik::Player* player = nullptr;
 };
 
-/// What an event source tells; both on the main queue.
+/// What an event source tells, on the main queue.
 struct SourceHandlers {
   /// A line that is no event, or that what comes can no longer be kept.
   std::function<void(const std::string& message)> badLine;
@@ -53,6 +57,9 @@ struct SourceHandlers {
   std::function<void(const std::string& remark)> remark;
   /// Everything has been delivered; `failure` tells why a recording could not be read to its end.
   std::function<void(const std::optional<std::string>& failure)> ended;
+  /// A replay is on its way to another moment; `isFromStart` tells that all events come once more.
+  std::function<void(bool isFromStart)> seekBegun;
+  std::function<void()> seekEnded;
 };
 
 /// `clock` must outlive the source.

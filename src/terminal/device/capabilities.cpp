@@ -63,7 +63,8 @@ std::string Capabilities::move(int column, int line) const {
   return filledIn(moveTo, line, column);
 }
 
-std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, std::string& reason) {
+std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, const Appearance& appearance,
+                                             std::string& reason) {
   const std::string name(environment("TERM"));
   int status = 0;
   if (name.empty() || setupterm(name.c_str(), descriptor, &status) != OK) {
@@ -86,9 +87,12 @@ std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, std
   const std::string leaveOtherScreen = textCapability("rmcup");
   found.leaveScreen += leaveOtherScreen.empty() ? found.clear : leaveOtherScreen;
   found.showsUtf8 = showsUtf8;
+  found.signs = appearance.signs.value_or(signsOf(name, showsUtf8));
 
-  const ColorDepth depth = colorDepthOf(tigetnum("colors"), environment("NO_COLOR"));
-  const Palette palette = makePalette(depth, backgroundOf(environment("COLORFGBG")));
+  const int colors = tigetnum("colors");
+  const ColorDepth depth = colorDepthOf(colors, environment("NO_COLOR"));
+  const Palette palette = withLooksOf(appearance, makePalette(depth, backgroundOf(environment("COLORFGBG"))),
+                                      depth == ColorDepth::None ? 0 : colors);
   for (std::size_t role = 0; role < palette.size(); ++role)
     found.looks[role] = bytesOf(palette[role]);
   return found;

@@ -4,7 +4,9 @@
 #include <optional>
 #include <string>
 
+#include "terminal/device/appearance.h"
 #include "terminal/device/palette.h"
+#include "terminal/device/signs.h"
 
 namespace vesk {
 
@@ -18,6 +20,7 @@ struct Capabilities {
   std::string enterScreen;  ///< takes the terminal over: its other screen, no cursor, no wrapping, mouse reports
   std::string leaveScreen;  ///< gives it back as it was
   bool showsUtf8 = true;
+  Signs signs = Signs::braille;
 
   /// The cursor to a place counted from 0.
   [[nodiscard]] std::string move(int column, int line) const;
@@ -25,6 +28,7 @@ struct Capabilities {
 
 /// Reads the terminfo entry of TERM for the terminal at `descriptor`. Absent when the terminal is unknown or
 /// too simple for screens; `reason` then says why in one line.
-[[nodiscard]] std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, std::string& reason);
+[[nodiscard]] std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, const Appearance& appearance,
+                                                           std::string& reason);
 
 }  // namespace vesk

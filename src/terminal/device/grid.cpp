@@ -21,6 +21,16 @@ int Grid::write(int column, int line, std::string_view text, Role role, int end)
   return column;
 }
 
+int Grid::writeCut(int column, int line, std::string_view text, Role role, int end) {
+  end = std::min(end, size_.columns);
+  // More bytes than a line can show need no measuring.
+  const bool isLong = text.size() > static_cast<std::size_t>(size_.columns) * kLongestGlyph;
+  if (!isLong && column + textWidth(text) <= end) return write(column, line, text, role, end);
+  if (column >= end) return column;
+  write(column, line, text, role, end - 1);
+  return write(end - 1, line, "…", role, end);
+}
+
 void Grid::fill(int column, int line, Role role, int end) {
   end = std::min(end, size_.columns);
   if (line < 0 || line >= size_.lines) return;

@@ -26,8 +26,13 @@ enum class Role : std::uint8_t {
   Prompt,
   PaneHeader,
   Key,
+  Excellent,
+  Good,
+  Fair,
+  Poor,
+  Alarm,
 };
-inline constexpr std::size_t kRoleCount = static_cast<std::size_t>(Role::Key) + 1;
+inline constexpr std::size_t kRoleCount = static_cast<std::size_t>(Role::Alarm) + 1;
 
 struct Size {
   int columns = 0;
@@ -64,6 +69,8 @@ class Grid {
   /// glyph is never cut: blanks stand where a half of one would. Returns the column after the last one
   /// written.
   int write(int column, int line, std::string_view text, Role role, int end);
+  /// The same with an ellipsis in the last column where something is left out.
+  int writeCut(int column, int line, std::string_view text, Role role, int end);
   /// Blanks from `column` up to `end`.
   void fill(int column, int line, Role role, int end);
 

@@ -33,6 +33,11 @@ constexpr Palette kWithoutColors = paletteOf({{
     {Role::Prompt, {.isBold = true}},
     {Role::PaneHeader, {.isUnderlined = true}},
     {Role::Key, {.isBold = true}},
+    {Role::Excellent, {.isBold = true}},
+    {Role::Good, {}},
+    {Role::Fair, {}},
+    {Role::Poor, {.isUnderlined = true}},
+    {Role::Alarm, {.isBold = true}},
 }});
 
 // 0 black, 1 red, 2 green, 3 yellow, 4 blue, 5 magenta, 6 cyan, 7 white. Yellow and cyan text is lost on
@@ -52,6 +57,11 @@ constexpr Palette kSixteen = paletteOf({{
     {Role::Prompt, {.isBold = true}},
     {Role::PaneHeader, {.isUnderlined = true}},
     {Role::Key, {.isBold = true}},
+    {Role::Excellent, {.foreground = 2, .isBold = true}},
+    {Role::Good, {.foreground = 2}},
+    {Role::Fair, {.foreground = 5}},
+    {Role::Poor, {.foreground = 1}},
+    {Role::Alarm, {.foreground = 1, .isBold = true}},
 }});
 
 // The cube and the greys alone, since 0 to 15 are whatever the user made of them.
@@ -70,6 +80,11 @@ constexpr Palette kDark = paletteOf({{
     {Role::Prompt, {.foreground = 179, .isBold = true}},
     {Role::PaneHeader, {.foreground = 254, .background = 238}},
     {Role::Key, {.foreground = 110, .isBold = true}},
+    {Role::Excellent, {.foreground = 120, .isBold = true}},
+    {Role::Good, {.foreground = 71}},
+    {Role::Fair, {.foreground = 221}},
+    {Role::Poor, {.foreground = 203}},
+    {Role::Alarm, {.foreground = 203, .isBold = true}},
 }});
 
 constexpr Palette kLight = paletteOf({{
@@ -87,6 +102,11 @@ constexpr Palette kLight = paletteOf({{
     {Role::Prompt, {.foreground = 130, .isBold = true}},
     {Role::PaneHeader, {.foreground = 16, .background = 252}},
     {Role::Key, {.foreground = 25, .isBold = true}},
+    {Role::Excellent, {.foreground = 22, .isBold = true}},
+    {Role::Good, {.foreground = 28}},
+    {Role::Fair, {.foreground = 130}},
+    {Role::Poor, {.foreground = 160}},
+    {Role::Alarm, {.foreground = 160, .isBold = true}},
 }});
 
 /// Tones between the two, for a background that is not known.
@@ -105,6 +125,11 @@ constexpr Palette kEither = paletteOf({{
     {Role::Prompt, {.foreground = 166, .isBold = true}},
     {Role::PaneHeader, {.foreground = 231, .background = 240}},
     {Role::Key, {.foreground = 32, .isBold = true}},
+    {Role::Excellent, {.foreground = 35, .isBold = true}},
+    {Role::Good, {.foreground = 71}},
+    {Role::Fair, {.foreground = 172}},
+    {Role::Poor, {.foreground = 167}},
+    {Role::Alarm, {.foreground = 160, .isBold = true}},
 }});
 
 }  // namespace

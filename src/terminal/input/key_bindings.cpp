@@ -1,6 +1,8 @@
 #include "terminal/input/key_bindings.h"
 
 #include <algorithm>
+#include <array>
+#include <iterator>
 
 #include "values/utf8.h"
 
@@ -17,15 +19,29 @@ const KeyBinding kBindings[] = {
     {Action::Open, {{Key::Enter}, {Key::Right}, letter(U'l')}, "open", "open the selected row"},
     {Action::Back, {{Key::Escape}, {Key::Left}, letter(U'h'), {Key::Backspace}}, "back", "clear the filter, go back"},
     {Action::Filter, {letter(U'/')}, "filter", "show only rows with what is typed"},
-    {Action::Freeze, {letter(U'f')}, "freeze", "hold the screen; intake goes on"},
+    {Action::Freeze, {letter(U' '), letter(U'f')}, "hold", "hold all that shows, and the replay; intake goes on"},
+    {Action::Backward, {letter(U'<')}, "", "10 s back in the replay"},
+    {Action::Forward, {letter(U'>')}, "", "10 s forward in the replay"},
+    {Action::Faster, {letter(U'+')}, "", "a faster replay"},
+    {Action::Slower, {letter(U'-')}, "", "a slower replay"},
+    {Action::Readings, {letter(U'u')}, "", "show or hide what the values mean"},
+    {Action::Overview, {letter(U'o')}, "overview", "where the phone is and how it is doing, on one screen"},
+    {Action::Trend, {letter(U't')}, "trend", "the course of the selected figure"},
+    {Action::Timeline, {letter(U'e')}, "events", "what happened and when; Enter shows all fields"},
+    {Action::Cells, {letter(U'c')}, "cells", "the cells heard"},
+    {Action::Sort, {letter(U's')}, "sort", "sort the cells by the next column"},
+    {Action::Area,
+     {letter(U'1'), letter(U'2'), letter(U'3'), letter(U'4')},
+     "to 4 areas",
+     "open an area of the first screen"},
     {Action::Diagnostics, {letter(U'd')}, "lines", "show or hide the diagnostic lines"},
     {Action::OlderLines, {letter(U'[')}, "", "older diagnostic lines"},
     {Action::NewerLines, {letter(U']')}, "", "newer diagnostic lines"},
     {Action::Quit, {letter(U'q')}, "quit", "end the program"},
-    {Action::Up, {{Key::Up}, letter(U'k')}, "", "one row up"},
-    {Action::Down, {{Key::Down}, letter(U'j')}, "", "one row down"},
-    {Action::PageUp, {{Key::PageUp}}, "", "one page up"},
-    {Action::PageDown, {{Key::PageDown}}, "", "one page down"},
+    {Action::Up, {{Key::Up}, letter(U'k')}, "", "one row up; on a trend: the figure before"},
+    {Action::Down, {{Key::Down}, letter(U'j')}, "figure", "one row down; on a trend: the next figure"},
+    {Action::PageUp, {{Key::PageUp}}, "longer", "one page up; on a trend: a longer time"},
+    {Action::PageDown, {{Key::PageDown}}, "shorter", "one page down; on a trend: a shorter time"},
     {Action::First, {{Key::Home}}, "", "the first row"},
     {Action::Last, {{Key::End}}, "", "the last row"},
 };
@@ -34,6 +50,17 @@ const KeyBinding kBindings[] = {
 
 std::span<const KeyBinding> keyBindings() {
   return kBindings;
+}
+
+const KeyBinding& bindingOf(Action action) {
+  return *std::find_if(std::begin(kBindings), std::end(kBindings),
+                       [&](const KeyBinding& binding) { return binding.action == action; });
+}
+
+std::span<const Action> tableHints() {
+  static constexpr std::array kHints{Action::Help,   Action::Open,        Action::Back,     Action::Filter,
+                                     Action::Freeze, Action::Diagnostics, Action::Overview, Action::Quit};
+  return kHints;
 }
 
 std::optional<Action> actionOf(const KeyEvent& event) {
@@ -50,6 +77,7 @@ std::optional<Action> actionOf(const KeyEvent& event) {
 std::string nameOf(const BoundKey& key) {
   switch (key.key) {
     case Key::Character: {
+      if (key.character == U' ') return "Space";
       std::string name;
       appendCodePoint(name, key.character);
       return name;

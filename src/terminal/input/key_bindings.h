@@ -17,6 +17,17 @@ enum class Action {
   Back,
   Filter,
   Freeze,
+  Backward,
+  Forward,
+  Faster,
+  Slower,
+  Readings,
+  Overview,
+  Trend,
+  Timeline,
+  Cells,
+  Sort,
+  Area,
   Diagnostics,
   OlderLines,
   NewerLines,
@@ -38,13 +49,18 @@ struct BoundKey {
 struct KeyBinding {
   Action action;
   std::initializer_list<BoundKey> keys;
-  /// For the line of hints, beside the first key; empty where the key needs none.
+  /// For the line of hints, beside the first key; empty where no line names it.
   std::string_view hint;
   std::string_view help;
 };
 
-/// In the order in which they are shown.
+/// In the order in which the help shows them.
 [[nodiscard]] std::span<const KeyBinding> keyBindings();
+
+/// The row of the table that has that action.
+[[nodiscard]] const KeyBinding& bindingOf(Action action);
+/// The keys that the line of hints names for a table screen.
+[[nodiscard]] std::span<const Action> tableHints();
 
 [[nodiscard]] std::optional<Action> actionOf(const KeyEvent& event);
 

@@ -25,16 +25,23 @@ constexpr std::array kUnits{
 
 }  // namespace
 
-Freshness freshnessOf(const Arrivals& arrivals, Clock::Instant now) {
-  if (!arrivals.last || arrivals.count == 0) return {"never"};
-  const auto age =
-      std::max(std::chrono::duration_cast<std::chrono::seconds>(now - *arrivals.last), std::chrono::seconds(0));
+Freshness ageOf(const Arrivals& arrivals, std::chrono::milliseconds now) {
+  using std::chrono::milliseconds;
+  if (!arrivals.last || arrivals.count == 0) return {};
+  const milliseconds age = std::max(now - *arrivals.last, milliseconds(0));
   const Unit& unit =
       *std::find_if(kUnits.begin(), kUnits.end() - 1, [&](const Unit& each) { return each.length <= age; });
-  const auto amount = age / unit.length;
+  const std::int64_t amount = age / milliseconds(unit.length);
   Freshness freshness;
-  appendDecimal(freshness.text, std::int64_t{amount});
+  appendDecimal(freshness.text, amount);
   freshness.text += unit.name;
+  freshness.untilChange = (amount + 1) * milliseconds(unit.length) - age;
+  return freshness;
+}
+
+Freshness freshnessOf(const Arrivals& arrivals, std::chrono::milliseconds now) {
+  Freshness freshness = ageOf(arrivals, now);
+  if (freshness.text.empty()) return {"never"};
   freshness.text += " ago, ";
   if (arrivals.count == 1) {
     freshness.text += "once";
@@ -42,7 +49,6 @@ Freshness freshnessOf(const Arrivals& arrivals, Clock::Instant now) {
     appendDecimal(freshness.text, arrivals.count);
     freshness.text += " times";
   }
-  freshness.nextChange = *arrivals.last + (amount + 1) * unit.length;
   return freshness;
 }
 

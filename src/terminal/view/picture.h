@@ -2,10 +2,12 @@
 
 #include <cstdint>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "terminal/panels/panel.h"
 #include "terminal/view/path_bar.h"
 #include "terminal/view/table_browser.h"
 
@@ -23,6 +25,9 @@ struct Regions {
     [[nodiscard]] int count() const { return end - start; }
     [[nodiscard]] bool has(int line) const { return start <= line && line < end; }
   };
+
+  /// Where a panel draws: the title's line and the list's.
+  [[nodiscard]] Rectangle panel(int columns) const { return {0, title, columns, list.end - title}; }
 
   int bar = 0;
   int title = 1;
@@ -56,6 +61,13 @@ struct Picture {
 
   std::vector<ListLine> lines{};
   ScrollExtent extent{};
+
+  /// What shows in the place of title and list; null for a table screen.
+  Panel* panel = nullptr;
+  std::span<const Action> hints = tableHints();
+
+  /// In the place of the hints; empty for none.
+  std::string notice{};
 
   std::string filter{};
   bool isTypingFilter = false;

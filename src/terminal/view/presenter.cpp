@@ -3,8 +3,8 @@
 #include <algorithm>
 #include <utility>
 
-#include "terminal/device/column_width.h"
-#include "terminal/view/freshness.h"
+#include "terminal/panels/kpi_look.h"
+#include "terminal/view/filter_typing.h"
 #include "terminal/view/renderer.h"
 
 namespace vesk {
@@ -12,14 +12,14 @@ namespace vesk {
 namespace {
 
 constexpr int kWheelLines = 3;
-
-void removeLastCharacter(std::string& text) {
-  while (!text.empty() && (static_cast<unsigned char>(text.back()) & 0xC0) == 0x80)
-    text.pop_back();
-  if (!text.empty()) text.pop_back();
-}
+constexpr std::chrono::seconds kJump{10};
 
 }  // namespace
+
+Presenter::Presenter(NavigationController& stack, Surroundings surroundings, Signs signs)
+    : stack_(stack), surroundings_(std::move(surroundings)) {
+  if (surroundings_.drive != nullptr) panels_.emplace(*surroundings_.drive, surroundings_.goToEvent, signs);
+}
 
 void Presenter::resize(Size size) {
   size_ = size;
@@ -45,21 +45,64 @@ void Presenter::followStack() {
   if (differs != screens_.end() || screens_.size() < stack.size()) {
     isTypingFilter_ = false;
     screens_.erase(differs, screens_.end());
-    for (std::size_t depth = screens_.size(); depth < stack.size(); ++depth) {
-      auto* table = dynamic_cast<TableViewController*>(stack[depth].get());
-      screens_.push_back({stack[depth], table != nullptr ? std::make_unique<TableBrowser>(*table) : nullptr});
-    }
+    for (std::size_t depth = screens_.size(); depth < stack.size(); ++depth)
+      addScreen(stack[depth]);
     for (const Screen& screen : screens_) {
-      if (screen.browser == nullptr) continue;
-      if (screen.browser->isFrozen()) screen.browser->setFrozen(false);
-      if (!screen.browser->filter().empty()) screen.browser->setFilter({});
+      if (screen.browser != nullptr && !screen.browser->filter().empty()) screen.browser->setFilter({});
     }
   }
   if (TableBrowser* shown = browser()) {
     const Regions regions = this->regions();
     shown->setViewport({regions.listColumns, std::max(regions.list.count(), 1)});
     shown->follow();
+    noteArrivals(screens_.back(), *shown);
+    if (isHolding() && !shown->isFrozen()) shown->setFrozen(true);
   }
+}
+
+void Presenter::addScreen(const std::shared_ptr<ViewController>& controller) {
+  Screen& screen = screens_.emplace_back(Screen{controller, nullptr});
+  auto* table = dynamic_cast<TableViewController*>(controller.get());
+  if (table == nullptr) return;
+  TableContent::ReadingOf readingOf;
+  if (screens_.size() == kDepthOfMetrics && surroundings_.reading) {
+    readingOf = [this, titles = titles()](IndexPath at, std::string_view name) {
+      return surroundings_.reading(titles[1], titles[2], at, name);
+    };
+  }
+  screen.browser = std::make_unique<TableBrowser>(*table, std::move(readingOf));
+}
+
+/// The rows are as old as what had come when they were taken over, however much has come since.
+void Presenter::noteArrivals(Screen& screen, const TableBrowser& shown) {
+  if (screens_.size() != kDepthOfMetrics || !surroundings_.arrivals || screen.reload == shown.reloadCount()) return;
+  screen.reload = shown.reloadCount();
+  const std::vector<std::string> titles = this->titles();
+  screen.arrivals = surroundings_.arrivals(titles[1], titles[2]);
+}
+
+void Presenter::hold(bool isHeld) {
+  for (const Screen& screen : screens_)
+    if (screen.browser != nullptr) screen.browser->setFrozen(isHeld);
+  if (panels_) panels_->setHeld(isHeld);
+}
+
+void Presenter::toggleHold() {
+  isHeld_ = !isHeld_;
+  if (surroundings_.setHeld) surroundings_.setHeld(isHeld_);
+  hold(isHolding());
+}
+
+void Presenter::setOnTheWay(bool isOnTheWay) {
+  if (!std::exchange(isOnTheWay_, isOnTheWay) && !isOnTheWay) return;
+  if (!isOnTheWay) hold(false);
+  followStack();
+  hold(isHolding());
+}
+
+void Presenter::tell(std::string notice, Clock::Instant until) {
+  notice_ = std::move(notice);
+  noticeEnd_ = until;
 }
 
 void Presenter::handle(const InputEvent& event) {
@@ -76,68 +119,64 @@ void Presenter::handleKey(const KeyEvent& event) {
   if (isTypingFilter_ && typeIntoFilter(event)) return;
   const std::optional<Action> action = actionOf(event);
   if (!action) return;
-  if (helpStart_) {
+  if (*action == Action::Area) {
+    helpStart_.reset();
+    openArea(event.character - U'1');
+  } else if (helpStart_) {
     performInHelp(*action);
   } else {
     perform(*action);
   }
 }
 
+const std::string* Presenter::filter() {
+  if (panel() != nullptr) return panel()->filter();
+  return browser() != nullptr ? &browser()->filter() : nullptr;
+}
+
+void Presenter::setFilter(std::string filter) {
+  if (panel() != nullptr) {
+    panel()->setFilter(std::move(filter));
+  } else if (browser() != nullptr) {
+    browser()->setFilter(std::move(filter));
+  }
+}
+
 /// False for the keys that mean the same while a filter is typed.
 bool Presenter::typeIntoFilter(const KeyEvent& event) {
-  TableBrowser* shown = browser();
-  if (shown == nullptr) return false;
-  std::string filter = shown->filter();
-  switch (event.key) {
-    case Key::Character:
-      if (event.modifiers.alt || event.modifiers.control) return true;
-      filter += nameOf({Key::Character, event.character});
-      shown->setFilter(std::move(filter));
-      return true;
-    case Key::Backspace:
-      if (filter.empty()) isTypingFilter_ = false;
-      removeLastCharacter(filter);
-      shown->setFilter(std::move(filter));
-      return true;
-    case Key::Enter:
-      isTypingFilter_ = false;
-      return true;
-    case Key::Escape:
-      isTypingFilter_ = false;
-      shown->setFilter({});
-      return true;
-    case Key::Left:
-    case Key::Right:
-      return true;
-    case Key::Tab:
-    case Key::Up:
-    case Key::Down:
-    case Key::PageUp:
-    case Key::PageDown:
-    case Key::Home:
-    case Key::End:
-    case Key::Insert:
-    case Key::Delete:
-      return false;
-  }
-  return false;
+  if (filter() == nullptr) return false;
+  std::optional<TypedFilter> typed = typeInto(*filter(), event);
+  if (!typed) return false;
+  isTypingFilter_ = typed->goesOn;
+  if (typed->filter != *filter()) setFilter(std::move(typed->filter));
+  return true;
+}
+
+/// Of the selected row of a screen of values.
+std::optional<insight::Kpi> Presenter::selectedKpi() {
+  const std::vector<std::string> titles = this->titles();
+  const auto name = titles.size() == kDepthOfMetrics && browser() != nullptr ? browser()->selectedName() : std::nullopt;
+  return name ? kpiOfRow(titles[1], titles[2], name->view()) : std::nullopt;
+}
+
+void Presenter::openArea(std::size_t index) {
+  if (panels_) panels_->close();
+  stack_.popToDepth(1);
+  followStack();
+  if (browser() != nullptr) browser()->screen().selectRow({0, index});
 }
 
 void Presenter::perform(Action action) {
-  TableBrowser* shown = browser();
+  if (panels_ && panels_->perform(action, action == Action::Trend ? selectedKpi() : std::nullopt)) {
+    isTypingFilter_ = false;
+    return;
+  }
   switch (action) {
     case Action::Help:
       helpStart_ = 0;
       return;
-    case Action::Open:
-      return open();
-    case Action::Back:
-      return goBack();
     case Action::Filter:
-      isTypingFilter_ = shown != nullptr;
-      return;
-    case Action::Freeze:
-      if (shown != nullptr) shown->setFrozen(!shown->isFrozen());
+      isTypingFilter_ = filter() != nullptr;
       return;
     case Action::Diagnostics:
       isPaneOpen_ = !isPaneOpen_;
@@ -150,25 +189,57 @@ void Presenter::perform(Action action) {
     case Action::Quit:
       if (surroundings_.quit) surroundings_.quit();
       return;
+    case Action::Freeze:
+      return toggleHold();
+    case Action::Backward:
+      return jump(-kJump);
+    case Action::Forward:
+      return jump(+kJump);
+    case Action::Faster:
+      return changeSpeed(+1);
+    case Action::Slower:
+      return changeSpeed(-1);
+    case Action::Readings:
+      showsReadings_ = !showsReadings_;
+      return;
+    case Action::Open:
+    case Action::Back:
     case Action::Up:
-      if (shown != nullptr) shown->moveSelection(-1);
-      return;
     case Action::Down:
-      if (shown != nullptr) shown->moveSelection(+1);
-      return;
     case Action::PageUp:
-      if (shown != nullptr) shown->page(-1);
-      return;
     case Action::PageDown:
-      if (shown != nullptr) shown->page(+1);
-      return;
     case Action::First:
-      if (shown != nullptr) shown->selectFirst();
-      return;
     case Action::Last:
-      if (shown != nullptr) shown->selectLast();
+      return performOnTable(action);
+    case Action::Overview:
+    case Action::Trend:
+    case Action::Timeline:
+    case Action::Cells:
+    case Action::Sort:
+    case Action::Area:
       return;
   }
+}
+
+void Presenter::performOnTable(Action action) {
+  if (action == Action::Back) return goBack();
+  TableBrowser* shown = browser();
+  if (shown == nullptr) return;
+  if (action == Action::Open) open();
+  if (action == Action::Up) shown->moveSelection(-1);
+  if (action == Action::Down) shown->moveSelection(+1);
+  if (action == Action::PageUp) shown->page(-1);
+  if (action == Action::PageDown) shown->page(+1);
+  if (action == Action::First) shown->selectFirst();
+  if (action == Action::Last) shown->selectLast();
+}
+
+void Presenter::jump(std::chrono::seconds distance) {
+  if (surroundings_.jump) surroundings_.jump(distance);
+}
+
+void Presenter::changeSpeed(int step) {
+  if (surroundings_.changeSpeed) surroundings_.changeSpeed(step);
 }
 
 void Presenter::performInHelp(Action action) {
@@ -195,6 +266,17 @@ void Presenter::performInHelp(Action action) {
     case Action::Open:
     case Action::Filter:
     case Action::Freeze:
+    case Action::Backward:
+    case Action::Forward:
+    case Action::Faster:
+    case Action::Slower:
+    case Action::Readings:
+    case Action::Overview:
+    case Action::Trend:
+    case Action::Timeline:
+    case Action::Cells:
+    case Action::Sort:
+    case Action::Area:
     case Action::Diagnostics:
     case Action::OlderLines:
     case Action::NewerLines:
@@ -242,6 +324,8 @@ void Presenter::handleMouse(const MouseEvent& event) {
         scrollPane(lines);
       } else if (helpStart_) {
         scrollHelp(lines);
+      } else if (panel() != nullptr) {
+        panel()->scroll(lines);
       } else if (shown != nullptr) {
         shown->scroll(lines);
       }
@@ -252,7 +336,7 @@ void Presenter::handleMouse(const MouseEvent& event) {
       held_ = event;
       return;
     case MouseAction::Drag:
-      if (!held_ || shown == nullptr || helpStart_) return;
+      if (!held_ || shown == nullptr || helpStart_ || panel() != nullptr) return;
       if (!isTracking_ && (event.line == held_->line || !regions().list.has(held_->line))) return;
       setTracking(true);
       shown->scroll(held_->line - event.line);
@@ -268,83 +352,30 @@ void Presenter::handleMouse(const MouseEvent& event) {
   }
 }
 
+/// Of the path: the table screens, then the panels over them.
+void Presenter::goToDepth(std::size_t depth) {
+  const std::size_t tables = stack_.stack().size();
+  if (panels_) panels_->close(depth > tables ? depth - tables : 0);
+  if (depth < tables) stack_.popToDepth(depth);
+}
+
 void Presenter::click(const MouseEvent& event) {
   const Regions regions = this->regions();
   if (event.line == regions.bar) {
     for (const PathSegment& segment : pathBar(statusWidth_).segments) {
       const int column = event.column - kBarMargin;
-      if (segment.column <= column && column < segment.end) stack_.popToDepth(segment.depth);
+      if (segment.column <= column && column < segment.end) goToDepth(segment.depth);
     }
   } else if (helpStart_) {
     helpStart_.reset();
+  } else if (panel() != nullptr) {
+    if (regions.panel(size_.columns).has(event.column, event.line)) {
+      panel()->click(event.column, event.line - regions.title);
+    }
   } else if (regions.list.has(event.line) && event.column < regions.listColumns) {
     TableBrowser* shown = browser();
     if (shown != nullptr && shown->selectLine(event.line - regions.list.start)) open();
   }
-}
-
-std::vector<std::string> Presenter::titles() const {
-  std::vector<std::string> titles;
-  for (const Screen& screen : screens_) {
-    const std::optional<Text>& title = screen.controller->title();
-    titles.emplace_back(title ? title->view() : "–");
-  }
-  return titles;
-}
-
-PathBar Presenter::pathBar(int statusWidth) const {
-  return layOutPath(titles(), statusColumn(size_.columns, statusWidth) - 1 - kBarMargin);
-}
-
-void Presenter::expectChange(std::optional<Clock::Instant> when) {
-  if (when && (!nextChange_ || *when < *nextChange_)) nextChange_ = when;
-}
-
-Picture Presenter::picture(Clock::Instant now) {
-  followStack();
-  nextChange_.reset();
-  Picture picture{.size = size_};
-  if (surroundings_.sourceState) {
-    SourceState state = surroundings_.sourceState();
-    picture.status = std::move(state.text);
-    expectChange(state.nextChange);
-  }
-  statusWidth_ = textWidth(picture.status);
-  picture.path = pathBar(statusWidth_);
-
-  const std::vector<std::string> titles = this->titles();
-  if (!titles.empty()) picture.title = titles.back();
-  constexpr std::size_t kDepthOfMetrics = 3;
-  if (titles.size() == kDepthOfMetrics && surroundings_.arrivals) {
-    if (const std::optional<Arrivals> arrivals = surroundings_.arrivals(titles[1], titles[2])) {
-      Freshness freshness = freshnessOf(*arrivals, now);
-      picture.freshness = std::move(freshness.text);
-      expectChange(freshness.nextChange);
-    }
-  }
-  picture.helpStart = helpStart_;
-  if (TableBrowser* shown = browser()) {
-    picture.isFrozen = shown->isFrozen();
-    picture.lines = shown->lines();
-    picture.extent = shown->scrollExtent();
-    picture.filter = shown->filter();
-    picture.isTypingFilter = isTypingFilter_;
-  }
-  fillPane(picture);
-  return picture;
-}
-
-void Presenter::fillPane(Picture& picture) {
-  picture.hasPane = isPaneOpen_;
-  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
-  scrollPane(0);
-  const auto& lines = surroundings_.diagnostics->lines();
-  picture.paneTotal = surroundings_.diagnostics->total();
-  picture.paneEnd = paneEnd_.value_or(picture.paneTotal);
-  const auto newer = static_cast<std::ptrdiff_t>(picture.paneTotal - picture.paneEnd);
-  const auto room = static_cast<std::ptrdiff_t>(std::max(regions().pane.count() - 1, 0));
-  const auto end = lines.end() - newer;
-  picture.paneLines.assign(end - std::min(room, end - lines.begin()), end);
 }
 
 }  // namespace vesk

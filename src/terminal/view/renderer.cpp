@@ -42,10 +42,14 @@ class Renderer {
       return std::move(grid_);
     }
     drawBar();
-    drawTitle();
     if (picture_.helpStart) {
+      drawTitle();
       drawHelp();
+    } else if (picture_.panel != nullptr) {
+      picture_.panel->draw(Canvas(grid_, regions_.panel(width())));
+      drawFrozenMark();
     } else {
+      drawTitle();
       drawList();
       drawScrollBar();
     }
@@ -57,14 +61,8 @@ class Renderer {
  private:
   [[nodiscard]] int width() const { return picture_.size.columns; }
 
-  /// Writes as much as fits before `end`, with an ellipsis where something was left out.
   int writeCut(int column, int line, std::string_view text, Role role, int end) {
-    // More bytes than a line can show need no measuring.
-    const bool isLong = text.size() > static_cast<std::size_t>(width()) * kLongestGlyph;
-    if (!isLong && column + textWidth(text) <= end) return grid_.write(column, line, text, role, end);
-    if (column >= end) return column;
-    grid_.write(column, line, text, role, end - 1);
-    return grid_.write(end - 1, line, "…", role, end);
+    return grid_.writeCut(column, line, text, role, end);
   }
 
   void drawTooSmall() { grid_.write(0, 0, "too small", Role::Plain, width()); }
@@ -79,18 +77,22 @@ class Renderer {
 
   void drawTitle() {
     const int line = regions_.title;
-    int end = width() - 1;
-    if (picture_.isFrozen) {
-      constexpr std::string_view kMark = " FROZEN ";
-      const int start = end - static_cast<int>(kMark.size());
-      grid_.write(start, line, kMark, Role::FrozenMark, end);
-      end = start - 1;
-    }
+    const int end = drawFrozenMark();
     const std::string_view title = picture_.helpStart ? "Keys" : std::string_view(picture_.title);
     const int freshnessWidth = picture_.freshness.empty() ? 0 : textWidth(picture_.freshness) + 2;
     const int titleEnd = std::max(end - freshnessWidth, kRowGutter + 8);
     const int column = writeCut(kRowGutter, line, title, Role::Title, titleEnd);
     if (!picture_.helpStart) writeCut(column + 2, line, picture_.freshness, Role::Faint, end);
+  }
+
+  /// Where the columns before the mark end.
+  int drawFrozenMark() {
+    constexpr std::string_view kMark = " HELD ";
+    const int end = width() - 1;
+    if (!picture_.isFrozen) return end;
+    const int start = end - static_cast<int>(kMark.size());
+    grid_.write(start, regions_.title, kMark, Role::FrozenMark, end);
+    return start - 1;
   }
 
   void drawList() {
@@ -111,9 +113,11 @@ class Renderer {
   void drawRowLine(int line, const ListLine& row) {
     Role name = Role::Plain;
     Role value = row.isChanged ? Role::Changed : Role::Value;
+    Role aside = Role::Faint;
     if (row.isSelected) {
       name = Role::Selected;
       value = row.isChanged ? Role::SelectedChanged : Role::Selected;
+      aside = Role::Selected;
       grid_.fill(0, line, Role::Selected, regions_.listColumns);
     }
     const int end = rowTextEnd(regions_.listColumns, row.hasDisclosure);
@@ -123,8 +127,10 @@ class Renderer {
       writeRowText(kRowGutter + *row.text.valueIndent, line, row.text.value, value, end, row.text.isCut);
     } else if (row.text.value.empty()) {
       writeRowText(kRowGutter, line, row.text.name, name, end, row.text.isCut);
+      if (!row.note.empty()) grid_.write(end - textWidth(row.note), line, row.note, aside, end);
     } else {
-      drawNameAndValue(line, row.text, name, value, end);
+      drawNameAndValue(line, row.text, name, value, row.text.valueEnd.value_or(end));
+      if (!row.text.reading.empty()) grid_.write(*row.text.valueEnd + kRowGap, line, row.text.reading, aside, end);
     }
   }
 
@@ -194,6 +200,10 @@ class Renderer {
   void drawHints() {
     const int line = regions_.hints;
     int column = kBarMargin;
+    if (!picture_.notice.empty()) {
+      writeCut(column, line, picture_.notice, Role::Alarm, width());
+      return;
+    }
     if (picture_.isTypingFilter || !picture_.filter.empty()) {
       column = grid_.write(column, line, "/", Role::Prompt, width());
       column = writeCut(column, line, picture_.filter, Role::Prompt, width() / 2);
@@ -205,8 +215,9 @@ class Renderer {
       }
       column += 2;
     }
-    for (const KeyBinding& binding : keyBindings()) {
-      if (!binding.hint.empty()) column = drawHint(column, nameOf(*binding.keys.begin()), binding.hint);
+    for (const Action action : picture_.hints) {
+      const KeyBinding& binding = bindingOf(action);
+      column = drawHint(column, nameOf(*binding.keys.begin()), binding.hint);
     }
   }
 

@@ -10,7 +10,6 @@ namespace vesk {
 namespace {
 
 constexpr int kIndent = 2;
-constexpr int kGap = 2;
 
 std::string_view viewOf(const std::optional<Text>& text) {
   return text ? text->view() : std::string_view{};
@@ -21,19 +20,30 @@ bool fitsBesideItsName(std::string_view name, std::string_view value, int width)
   constexpr std::size_t kMostBytesPerColumn = 16;
   if (name.size() + value.size() > static_cast<std::size_t>(width) * kMostBytesPerColumn) return false;
   if (name.find('\n') != std::string_view::npos || value.find('\n') != std::string_view::npos) return false;
-  const int gap = name.empty() || value.empty() ? 0 : kGap;
+  const int gap = name.empty() || value.empty() ? 0 : kRowGap;
   return textWidth(name) + gap + textWidth(value) <= width;
 }
 
 }  // namespace
 
-std::vector<RowLine> layOutRow(const RowContent& row, int columns) {
+std::optional<int> valueEndBesideReadings(int columns) {
+  constexpr int kNarrowest = 64;
+  if (columns < kNarrowest) return std::nullopt;
+  const int end = rowTextEnd(columns, false);
+  return end - end * 2 / 5 - kRowGap;
+}
+
+std::vector<RowLine> layOutRow(const RowContent& row, int columns, std::optional<int> valueEnd) {
   const int width = rowTextEnd(columns, row.accessory == CellAccessory::Disclosure) - kRowGutter;
   const std::string_view name = viewOf(row.main);
   const std::string_view value = viewOf(row.detail);
   std::vector<RowLine> lines;
   if (fitsBesideItsName(name, value, width)) {
-    lines.push_back({.name = name, .value = value});
+    RowLine& line = lines.emplace_back(RowLine{.name = name, .value = value});
+    if (valueEnd && !value.empty() && fitsBesideItsName(name, value, *valueEnd - kRowGutter)) {
+      line.valueEnd = valueEnd;
+      if (*valueEnd + kRowGap + textWidth(row.reading) <= kRowGutter + width) line.reading = row.reading;
+    }
   } else if (row.height == RowHeight::ofLines(1)) {
     lines.push_back({.name = name, .value = value, .isCut = true});
   } else {

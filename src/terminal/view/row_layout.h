@@ -1,6 +1,7 @@
 #pragma once
 
 #include <optional>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -14,6 +15,8 @@ namespace vesk {
 struct RowContent {
   std::optional<Text> main;
   std::optional<Text> detail;
+  /// What the detail text means; empty for nothing more.
+  std::string reading;
   CellAccessory accessory = CellAccessory::None;
   RowHeight height = RowHeight::standard();
   /// Whether the detail text is another one than before the last reload.
@@ -24,8 +27,12 @@ struct RowContent {
 struct RowLine {
   std::string_view name{};
   std::string_view value{};
+  std::string_view reading{};
   /// The columns before a value that stands below its name; a value beside its name is at the right instead.
   std::optional<int> valueIndent{};
+  /// Where a value beside its name ends, and the column of the readings begins two columns later; absent for the end of
+  /// the row.
+  std::optional<int> valueEnd{};
   /// The row has more text than lines.
   bool isCut = false;
 };
@@ -37,8 +44,14 @@ inline constexpr int kRowGutter = 2;
   return columns - (hasDisclosure ? 3 : 1);
 }
 
+inline constexpr int kRowGap = 2;
+/// Where values end in a list that has a column of readings too; absent in one that is too narrow for it.
+[[nodiscard]] std::optional<int> valueEndBesideReadings(int columns);
+
 /// A row of a list `columns` wide: name and value on one line where they fit, else the value below, indented
-/// and wrapped. A fixed height cuts the row or fills it up.
-[[nodiscard]] std::vector<RowLine> layOutRow(const RowContent& row, int columns);
+/// and wrapped. A fixed height cuts the row or fills it up. With `valueEnd` a value that fits before it ends there, and
+/// its reading stands behind where that fits; the height is the same.
+[[nodiscard]] std::vector<RowLine> layOutRow(const RowContent& row, int columns,
+                                             std::optional<int> valueEnd = std::nullopt);
 
 }  // namespace vesk

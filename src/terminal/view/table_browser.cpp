@@ -197,6 +197,10 @@ void TableBrowser::page(int direction) {
   }
 }
 
+std::optional<Text> TableBrowser::selectedName() {
+  return selection_ ? content_.row(*selection_).main : std::nullopt;
+}
+
 bool TableBrowser::selectLine(int line) {
   const Position hit = moved(top_, line);
   if (hit.entry >= entries_.size() || !entries_[hit.entry].isRow) return false;
@@ -204,7 +208,9 @@ bool TableBrowser::selectLine(int line) {
   return true;
 }
 
-std::vector<ListLine> TableBrowser::lines() {
+std::vector<ListLine> TableBrowser::lines(bool withReadings) {
+  const std::optional<int> valueEnd =
+      withReadings && content_.hasReadings() ? valueEndBesideReadings(size_.columns) : std::nullopt;
   std::vector<ListLine> lines;
   std::size_t entry = top_.entry;
   for (int skipped = top_.line; entry < entries_.size(); ++entry, skipped = 0) {
@@ -216,7 +222,7 @@ std::vector<ListLine> TableBrowser::lines() {
       continue;
     }
     const RowContent& row = content_.row(at);
-    const std::vector<RowLine> rowLines = layOutRow(row, size_.columns);
+    const std::vector<RowLine> rowLines = layOutRow(row, size_.columns, valueEnd);
     const std::size_t end = std::min(rowLines.size(), static_cast<std::size_t>(skipped) + room);
     for (auto index = static_cast<std::size_t>(skipped); index < end; ++index) {
       lines.push_back({.text = rowLines[index],

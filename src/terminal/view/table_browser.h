@@ -22,6 +22,8 @@ struct ListLine {
   bool isSelected = false;
   bool isChanged = false;
   bool hasDisclosure = false;
+  /// What stands at the right of a row without a value.
+  std::string note{};
 };
 
 /// The part of a long list that shows, in lines.
@@ -35,14 +37,17 @@ struct ScrollExtent {
 /// filter. Only rows that show are asked for, unless a filter or a freeze needs them all.
 class TableBrowser {
  public:
-  /// `screen` must outlive the browser.
-  explicit TableBrowser(TableViewController& screen) : screen_(screen), content_(screen.tableView()) {}
+  /// `screen` must outlive the browser. `readingOf` may be empty.
+  explicit TableBrowser(TableViewController& screen, TableContent::ReadingOf readingOf = {})
+      : screen_(screen), content_(screen.tableView(), std::move(readingOf)) {}
 
   [[nodiscard]] TableViewController& screen() const { return screen_; }
 
   void setViewport(Size size);
   /// Takes over what the table was last reloaded with, unless frozen.
   void follow();
+  /// The reload of the table whose rows show.
+  [[nodiscard]] std::uint64_t reloadCount() const { return content_.reloadCount(); }
   void setFrozen(bool isFrozen);
   [[nodiscard]] bool isFrozen() const { return isFrozen_; }
   /// Shows only rows whose name or value has `filter` in it, in either case; all when empty.
@@ -59,11 +64,13 @@ class TableBrowser {
   void page(int direction);
 
   [[nodiscard]] std::optional<IndexPath> selection() const { return selection_; }
+  /// The name in the selected row.
+  [[nodiscard]] std::optional<Text> selectedName();
   /// Selects the row that shows in a line of the viewport; false when none does.
   bool selectLine(int line);
 
   /// The lines that show, from the top of the viewport; also tells the table which rows are in view.
-  [[nodiscard]] std::vector<ListLine> lines();
+  [[nodiscard]] std::vector<ListLine> lines(bool withReadings = true);
   [[nodiscard]] ScrollExtent scrollExtent() const;
 
  private:

@@ -53,6 +53,7 @@ RowContent TableContent::fetch(IndexPath at) {
     content.accessory = cell->accessory();
     content.height = table_.rowHeight(at);
   }
+  if (readingOf_ && content.main) content.reading = readingOf_(at, content.main->view());
   content.isChanged = hasChanged(at, content);
   return content;
 }

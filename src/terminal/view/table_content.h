@@ -2,8 +2,11 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
+#include <string_view>
+#include <utility>
 #include <vector>
 
 #include "terminal/view/row_layout.h"
@@ -15,8 +18,14 @@ namespace vesk {
 /// the content follows a later reload, so that a held content stays as it is while the table goes on.
 class TableContent {
  public:
-  /// `table` must outlive the content.
-  explicit TableContent(TableView& table) : table_(table) {}
+  /// What a row with that name means; empty for nothing more than its value.
+  using ReadingOf = std::function<std::string(IndexPath at, std::string_view name)>;
+
+  /// `table` must outlive the content. `readingOf` may be empty.
+  explicit TableContent(TableView& table, ReadingOf readingOf = {}) : table_(table), readingOf_(std::move(readingOf)) {}
+
+  [[nodiscard]] bool hasReadings() const { return readingOf_ != nullptr; }
+  [[nodiscard]] std::uint64_t reloadCount() const { return reloadCount_; }
 
   /// Takes over the table's present state. False when it was not reloaded since the last time.
   bool follow();
@@ -51,6 +60,7 @@ class TableContent {
   [[nodiscard]] bool hasChanged(IndexPath at, const RowContent& content) const;
 
   TableView& table_;
+  ReadingOf readingOf_;
   std::uint64_t reloadCount_ = 0;
   std::vector<Section> sections_;
   /// The sections before the last reload; absent before the second one.

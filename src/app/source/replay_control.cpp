@@ -1,0 +1,53 @@
+#include "app/source/replay_control.h"
+
+#include <algorithm>
+#include <array>
+
+namespace vesk {
+
+namespace {
+
+constexpr std::array kSpeeds{0.1, 0.2, 0.5, 1.0, 2.0, 5.0, 10.0, 20.0, 50.0, 100.0, 200.0, 500.0, 1000.0};
+
+}  // namespace
+
+std::optional<double> nextSpeed(std::optional<double> speed, int step) {
+  if (step > 0) {
+    const auto* faster = speed ? std::upper_bound(kSpeeds.begin(), kSpeeds.end(), *speed) : kSpeeds.end();
+    return faster == kSpeeds.end() ? std::nullopt : std::optional(*faster);
+  }
+  const auto* notSlower = speed ? std::lower_bound(kSpeeds.begin(), kSpeeds.end(), *speed) : kSpeeds.end();
+  return notSlower == kSpeeds.begin() ? std::min(*speed, kSpeeds.front()) : *(notSlower - 1);
+}
+
+corvik::Player* ReplayControl::seekable() {
+  if (player_ == nullptr) {
+    refuse_("only a replay goes back and forth");
+  } else if (!player_->state().duration) {
+    refuse_("a pipe has no way back; replay a file to go back and forth");
+  } else {
+    return player_;
+  }
+  return nullptr;
+}
+
+void ReplayControl::setHeld(bool isHeld) {
+  if (player_ != nullptr && player_->state().duration) player_->setHeld(isHeld);
+}
+
+void ReplayControl::changeSpeed(int step) {
+  if (player_ == nullptr) return refuse_("only a replay has another speed");
+  player_->setSpeed(nextSpeed(player_->state().speed, step));
+}
+
+void ReplayControl::jump(std::chrono::seconds distance) {
+  corvik::Player* player = seekable();
+  if (player != nullptr) player->seek(player->state().position + static_cast<double>(distance.count()));
+}
+
+void ReplayControl::goTo(const insight::TimelineEvent& event) {
+  corvik::Player* player = seekable();
+  if (player != nullptr) player->seekToEvent(event.moment.event + 1);
+}
+
+}  // namespace vesk

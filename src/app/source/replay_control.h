@@ -1,0 +1,41 @@
+#pragma once
+
+#include <chrono>
+#include <functional>
+#include <optional>
+#include <string>
+
+#include "corvik/player.h"
+#include "insight/timeline_event.h"
+
+namespace vesk {
+
+/// What the user does with a replay, or is refused. Main queue only.
+class ReplayControl {
+ public:
+  /// `refuse` is told in one line why nothing is done.
+  explicit ReplayControl(std::function<void(const std::string& reason)> refuse) : refuse_(std::move(refuse)) {}
+
+  /// Null for a source that is no replay. It must outlive this.
+  void setPlayer(corvik::Player* player) { player_ = player; }
+
+  /// A source that cannot wait, such as a pipe, goes on.
+  void setHeld(bool isHeld);
+  /// One step faster for +1, slower for -1.
+  void changeSpeed(int step);
+  void jump(std::chrono::seconds distance);
+  /// To the moment at which `event` had just happened.
+  void goTo(const insight::TimelineEvent& event);
+
+ private:
+  /// Null, and refused, where there is no way back.
+  [[nodiscard]] corvik::Player* seekable();
+
+  std::function<void(const std::string&)> refuse_;
+  corvik::Player* player_ = nullptr;
+};
+
+/// The next of the usual speeds; absent for no waiting at all, which is the fastest.
+[[nodiscard]] std::optional<double> nextSpeed(std::optional<double> speed, int step);
+
+}  // namespace vesk

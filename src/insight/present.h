@@ -1,0 +1,62 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <deque>
+#include <optional>
+#include <vector>
+
+#include "insight/drive_clock.h"
+#include "insight/heard_cells.h"
+#include "insight/summary.h"
+#include "insight/timeline.h"
+#include "insight/trend.h"
+
+namespace vesk::insight {
+
+/// An event with where it lies in the drive's counted time, without its gaps: milliseconds.
+struct Happening {
+  TimelineEvent event;
+  std::int64_t position;
+};
+
+/// What is known of a drive at a moment, and what led there: everything but the figures of the whole drive. A copy
+/// stays as it is while the drive goes on.
+class Present {
+ public:
+  /// The drive's time: milliseconds since 1970-01-01 00:00:00 UTC; absent before the first event with a time.
+  [[nodiscard]] std::optional<std::int64_t> now() const { return clock_.now(); }
+  [[nodiscard]] const DriveClock& clock() const { return clock_; }
+  [[nodiscard]] const EventCounts& counts() const { return counts_; }
+
+  /// What is known now: technology, serving cell, area, connection, registration, carriers, bearers, C-DRX.
+  [[nodiscard]] const Timeline& timeline() const { return timeline_; }
+  /// The value of a KPI while it is known, and its age in milliseconds.
+  [[nodiscard]] std::optional<double> value(Kpi kpi) const { return timeline_.kpis().at(kpi, time()); }
+  [[nodiscard]] std::optional<std::int64_t> age(Kpi kpi) const { return timeline_.kpis().age(kpi, time()); }
+  [[nodiscard]] std::vector<HeardCell> cellsHeard() const { return heard_.cells(timeline_, time()); }
+
+  /// The last events, oldest first.
+  [[nodiscard]] const std::deque<Happening>& happenings() const { return happenings_; }
+  /// How many there were before the first of these.
+  [[nodiscard]] std::uint64_t happenedBefore() const { return happenedBefore_; }
+  [[nodiscard]] const Trend& trend() const { return trend_; }
+
+ protected:
+  [[nodiscard]] std::int64_t time() const { return clock_.now().value_or(0); }
+  void keep(const std::vector<TimelineEvent>& events);
+
+  DriveClock clock_;
+  EventCounts counts_;
+  Timeline timeline_;
+  HeardCells heard_;
+  Trend trend_;
+
+ private:
+  static constexpr std::size_t kMostHappenings = 2000;
+
+  std::deque<Happening> happenings_;
+  std::uint64_t happenedBefore_ = 0;
+};
+
+}  // namespace vesk::insight

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <vector>
+
+#include "insight/present.h"
+#include "terminal/panels/canvas.h"
+
+namespace vesk {
+
+/// By which column cells are in order.
+struct CellOrder {
+  std::size_t column;
+  bool isFalling;
+};
+
+/// The table of the cells heard: its columns as far as there is room for them.
+class CellTable {
+ public:
+  /// For canvases of that width.
+  explicit CellTable(int columns);
+
+  /// The heads, on the first line; the column of `order` bears an arrow.
+  void drawHeads(const Canvas& canvas, const std::optional<CellOrder>& order) const;
+  void drawRow(const Canvas& canvas, int line, const insight::HeardCell& cell, bool isSelected) const;
+
+  /// The table's column at a column of the canvas.
+  [[nodiscard]] std::optional<std::size_t> columnAt(int column) const;
+
+ private:
+  struct Place {
+    std::size_t column;
+    int start;
+    int end;
+  };
+
+  std::vector<Place> places_;
+};
+
+/// By a column, in the direction that is natural to it: the strongest first.
+[[nodiscard]] CellOrder naturalOrder(std::size_t column);
+/// The order after that one: by the next column that can be sorted by; absent after the last.
+[[nodiscard]] std::optional<CellOrder> orderAfter(const std::optional<CellOrder>& order);
+
+/// Cells that are alike stay as they were; what is unknown comes last.
+void sortCells(std::vector<insight::HeardCell>& cells, const CellOrder& order);
+
+}  // namespace vesk

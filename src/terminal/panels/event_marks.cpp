@@ -1,0 +1,93 @@
+#include "terminal/panels/event_marks.h"
+
+#include <algorithm>
+#include <array>
+#include <iterator>
+#include <optional>
+#include <variant>
+
+namespace vesk {
+
+using insight::EventKind;
+
+namespace {
+
+const EventMark kMarks[] = {
+    {"D", "dropped", Role::Alarm, {EventKind::drop}},
+    {"F", "failed", Role::Alarm, {EventKind::connectionFailed}},
+    {"R", "re-established", Role::Alarm, {EventKind::reestablished}},
+    {"N", "no service", Role::Alarm, {EventKind::noService}},
+    {"X", "rejected", Role::Alarm, {EventKind::reject}},
+    {"A", "alerts", Role::Alarm, {EventKind::alert}},
+    {"P", "ping-pongs", Role::Fair, {EventKind::pingPong}},
+    {"T", "technology changes", Role::Key, {EventKind::technology}},
+    {"C", "cell changes", Role::Plain, {EventKind::cell, EventKind::handover, EventKind::reselection}},
+    {"┆", "gaps", Role::Faint, {EventKind::gap}},
+};
+
+bool isMarkOf(const EventMark& mark, EventKind kind) {
+  return std::find(mark.kinds.begin(), mark.kinds.end(), kind) != mark.kinds.end();
+}
+
+auto firstSince(const insight::Present& drive, std::int64_t start) {
+  const auto& happenings = drive.happenings();
+  return std::lower_bound(
+      happenings.begin(), happenings.end(), start,
+      [](const insight::Happening& each, std::int64_t position) { return each.position < position; });
+}
+
+}  // namespace
+
+std::span<const EventMark> eventMarks() {
+  return kMarks;
+}
+
+const EventMark* markOf(const insight::TimelineEvent& event) {
+  const auto* technology = std::get_if<insight::TechnologyChange>(&event.fields);
+  const auto* cell = std::get_if<insight::CellChange>(&event.fields);
+  if ((technology != nullptr && !technology->from) || (cell != nullptr && !cell->from)) return nullptr;
+  const auto* found = std::find_if(std::begin(kMarks), std::end(kMarks),
+                                   [&](const EventMark& mark) { return isMarkOf(mark, event.kind); });
+  return found == std::end(kMarks) ? nullptr : found;
+}
+
+Role roleOf(const insight::TimelineEvent& event) {
+  const EventMark* mark = markOf(event);
+  return mark == nullptr ? Role::Value : mark->role;
+}
+
+bool isNotable(EventKind kind) {
+  constexpr std::array kOrdinary{EventKind::rrc, EventKind::cdrxSetUp, EventKind::cdrxReleased, EventKind::bearerUp,
+                                 EventKind::bearerDown};
+  return std::find(kOrdinary.begin(), kOrdinary.end(), kind) == kOrdinary.end();
+}
+
+void drawMarks(const Canvas& canvas, int column, int line, const insight::Present& drive, const TrendSpan& span,
+               int slotsPerColumn) {
+  std::vector<const EventMark*> marks(static_cast<std::size_t>(span.slots / slotsPerColumn), nullptr);
+  for (auto each = firstSince(drive, span.start); each != drive.happenings().end(); ++each) {
+    const auto slot = span.slotOf(each->position);
+    const EventMark* mark = markOf(each->event);
+    if (!slot || mark == nullptr) continue;
+    const EventMark*& place = marks[static_cast<std::size_t>(*slot / slotsPerColumn)];
+    if (place == nullptr || mark < place) place = mark;
+  }
+  for (std::size_t index = 0; index < marks.size(); ++index)
+    if (marks[index] != nullptr)
+      canvas.write(column + static_cast<int>(index), line, marks[index]->sign, marks[index]->role);
+}
+
+std::vector<std::int64_t> breaksOf(const insight::Present& drive) {
+  std::vector<std::int64_t> breaks;
+  for (const auto& each : drive.happenings())
+    if (each.event.kind == EventKind::gap || each.event.kind == EventKind::technology) breaks.push_back(each.position);
+  return breaks;
+}
+
+std::size_t countSince(const insight::Present& drive, const EventMark& mark, std::int64_t start) {
+  return static_cast<std::size_t>(
+      std::count_if(firstSince(drive, start), drive.happenings().end(),
+                    [&](const insight::Happening& each) { return markOf(each.event) == &mark; }));
+}
+
+}  // namespace vesk

@@ -1,0 +1,139 @@
+// How the presenter puts together what shows.
+
+#include <algorithm>
+#include <utility>
+
+#include "terminal/device/column_width.h"
+#include "terminal/view/freshness.h"
+#include "terminal/view/presenter.h"
+
+namespace vesk {
+
+std::vector<std::string> Presenter::titles() const {
+  std::vector<std::string> titles;
+  for (const Screen& screen : screens_) {
+    const std::optional<Text>& title = screen.controller->title();
+    titles.emplace_back(title ? title->view() : "–");
+  }
+  return titles;
+}
+
+PathBar Presenter::pathBar(int statusWidth) const {
+  std::vector<std::string> names = titles();
+  if (panels_) {
+    for (const Panel* each : panels_->shown())
+      names.emplace_back(each->title());
+  }
+  return layOutPath(names, statusColumn(size_.columns, statusWidth) - 1 - kBarMargin);
+}
+
+void Presenter::expectChange(std::optional<Clock::Instant> when) {
+  if (when && (!nextChange_ || *when < *nextChange_)) nextChange_ = when;
+}
+
+Picture Presenter::picture(Clock::Instant now) {
+  followStack();
+  nextChange_.reset();
+  Picture picture{.size = size_};
+  if (surroundings_.sourceState) {
+    SourceState state = surroundings_.sourceState();
+    picture.status = std::move(state.text);
+    if (!state.date.empty()) picture.status += dateBehind(picture.status, state.date);
+    expectChange(state.nextChange);
+  }
+  statusWidth_ = textWidth(picture.status);
+  if (noticeEnd_ && now < *noticeEnd_) {
+    picture.notice = notice_;
+    expectChange(noticeEnd_);
+  }
+  picture.path = pathBar(statusWidth_);
+
+  picture.helpStart = helpStart_;
+  picture.isFrozen = isHeld_;
+  if (filter() != nullptr) picture.filter = *filter();
+  picture.isTypingFilter = isTypingFilter_ && filter() != nullptr;
+  if (panel() != nullptr) {
+    picture.panel = panel();
+    picture.hints = panel()->hints();
+  } else {
+    fillTable(picture, now);
+  }
+  fillPane(picture);
+  return picture;
+}
+
+void Presenter::fillTable(Picture& picture, Clock::Instant now) {
+  const std::vector<std::string> titles = this->titles();
+  if (!titles.empty()) picture.title = titles.back();
+  if (titles.size() == kDepthOfMetrics && screens_.back().arrivals) {
+    picture.freshness = timeBound(freshnessOf(*screens_.back().arrivals, driveTime()), now);
+    const std::string instead = technologyInstead(titles[1], titles[2]);
+    if (!instead.empty()) picture.freshness += ", the handset is on " + instead;
+  }
+  if (TableBrowser* shown = browser()) {
+    picture.lines = shown->lines(showsReadings_);
+    picture.extent = shown->scrollExtent();
+  }
+  if (titles.size() == kDepthOfMetrics - 1) addHeadlines(picture, titles[1], now);
+}
+
+/// What the drive's date takes behind the status; nothing where the path would lose by it.
+std::string Presenter::dateBehind(std::string_view status, std::string_view date) const {
+  constexpr int kGap = 2;
+  const std::string behind = std::string(kGap, ' ') + std::string(date);
+  const int width = textWidth(status) + textWidth(behind);
+  return pathBar(width).text == pathBar(0).text && width + kBarMargin + kGap < size_.columns ? behind : std::string();
+}
+
+std::chrono::milliseconds Presenter::driveTime() const {
+  return surroundings_.driveMoment ? surroundings_.driveMoment().time : std::chrono::milliseconds(0);
+}
+
+/// The text, which is to be written anew when it is another one.
+std::string Presenter::timeBound(Freshness freshness, Clock::Instant now) {
+  const double pace = surroundings_.driveMoment ? surroundings_.driveMoment().pace : 0;
+  if (freshness.untilChange && pace > 0)
+    expectChange(now + std::chrono::duration_cast<Clock::Duration>(*freshness.untilChange / pace));
+  return std::move(freshness.text);
+}
+
+std::string Presenter::technologyInstead(std::string_view area, std::string_view category) const {
+  return surroundings_.technologyInstead ? surroundings_.technologyInstead(area, category) : std::string();
+}
+
+/// Each category's most telling value and its age, or as much of it as fits.
+void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Instant now) {
+  constexpr int kGap = 2;
+  if (!surroundings_.headline || !surroundings_.arrivals) return;
+  for (ListLine& line : picture.lines) {
+    if (!line.isFirstOfRow) continue;
+    const std::string_view category = line.text.name;
+    const std::optional<Arrivals> arrivals = surroundings_.arrivals(area, category);
+    if (!arrivals || !arrivals->last) continue;
+    const std::string headline = surroundings_.headline(area, category);
+    const std::string age = timeBound(ageOf(*arrivals, driveTime()), now);
+    const std::string instead = technologyInstead(area, category);
+    const int room = rowTextEnd(regions().listColumns, line.hasDisclosure) - kRowGutter - textWidth(category) - kGap;
+    const std::string both = headline.empty() ? age : headline + "  " + age;
+    for (const std::string& note : {both + (instead.empty() ? "" : ", now " + instead), both, age}) {
+      if (textWidth(note) > room) continue;
+      line.note = note;
+      break;
+    }
+  }
+}
+
+void Presenter::fillPane(Picture& picture) {
+  picture.hasPane = isPaneOpen_;
+  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
+  scrollPane(0);
+  const auto& lines = surroundings_.diagnostics->lines();
+  picture.paneTotal = surroundings_.diagnostics->total();
+  picture.paneEnd = paneEnd_.value_or(picture.paneTotal);
+  const auto newer = static_cast<std::ptrdiff_t>(picture.paneTotal - picture.paneEnd);
+  const auto room = static_cast<std::ptrdiff_t>(std::max(regions().pane.count() - 1, 0));
+  const auto end = lines.end() - newer;
+  picture.paneLines.assign(end - std::min(room, end - lines.begin()), end);
+}
+
+}  // namespace vesk
