@@ -43,7 +43,7 @@ class PanelsTest : public testing::Test {
   std::string lineWith(std::string_view text) {
     const Grid grid = desk_->grid();
     for (int line = 0; line < grid.size().lines; ++line) {
-      const std::string found = grid.textOfLine(line);
+      std::string found = grid.textOfLine(line);
       if (found.find(text) != std::string::npos) return found;
     }
     return "";
@@ -272,8 +272,8 @@ TEST_F(PanelsTest, CellsAreSortedByKeyAndClick) {
 
 TEST(TrendGraph, UsesTheSignsThatTheTerminalHas) {
   Drive drive;
-  for (int second = 0; second < 6; ++second)
-    drive.play({lteLevel(1000 * second, -100 + second)});
+  for (std::int32_t second = 0; second < 6; ++second)
+    drive.play({lteLevel(std::int64_t{1000} * second, -100 + second)});
   drive.play({lteLevel(6000, -97), lteLevel(6500, -99)});
   struct {
     GraphKind kind;

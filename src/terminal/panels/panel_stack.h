@@ -16,7 +16,7 @@ namespace vesk {
 
 /// The panels that lie over the table screens; the last one opened shows. Each kind is there once, so that it is found
 /// again as it was left.
-class PanelStack : private PanelOpener {
+class PanelStack final : private PanelOpener {
  public:
   /// `insight` must outlive the stack. `goToEvent` may be empty.
   PanelStack(const insight::Present& drive, TimelinePanel::GoToEvent goToEvent, Signs signs);
