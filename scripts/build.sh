@@ -21,21 +21,29 @@ configure() {
   printf '%s %s\n' "$tests" "$root" >"$root/build/$preset/.configured"
 }
 
-# ninja_in PRESET TARGET…: silent when there is nothing to do.
+# is_built PRESET TARGET…: writes nothing.
+is_built() {
+  local preset=$1
+  shift
+  [[ $(ninja -C "$root/build/$preset" -n "$@" 2>&1) == *'no work to do'* ]]
+}
+
+# ninja_in PRESET TARGET…
 ninja_in() {
   local preset=$1 options=(-C "$root/build/$1")
   shift
-  [[ $(ninja "${options[@]}" -n "$@" 2>&1) != *'no work to do'* ]] || return 0
   NINJA_STATUS='[%p] ' ninja "${options[@]}" "$@" |
-    sed -u -e 's/^\[ *\([0-9]*\)%\] .*/compiling \1/; t' -e '/^ninja: Entering/d; /^-- /d; w /dev/stderr' -e d |
+    sed -u -e 's/^\[ *\([0-9]*\)%\] .*/compiling \1/; t' -e '/^ninja: Entering/d; /^ninja: build stopped/d; /^-- /d; w /dev/stderr' -e d |
     show_progress || die "the build failed (preset $preset); the compiler's messages stand above"
 }
 
 # build PRESET TESTS [TARGET…]: builds the targets (all without any) with TESTS ON or OFF. Reads nothing; all its
-# output goes to standard error. Builds of one preset wait for each other.
+# output goes to standard error. Builds of one preset wait for each other. Where all is built nothing is written, so that
+# any user may run it, and from a read-only place.
 build() {
   local preset=$1 tests=$2 purposes=(build) lock
   shift 2
+  ! is_configured "$preset" "$tests" || ! is_built "$preset" "$@" || return 0
   [[ -d $root/build ]] || mkdir -p "$root/build"
   exec {lock}>"$root/build/$preset.lock"
   if ! flock --nonblock "$lock"; then
@@ -46,7 +54,7 @@ build() {
   [[ $tests == OFF ]] || purposes+=(test)
   need_packages "${purposes[@]}"
   is_configured "$preset" "$tests" || configure "$preset" "$tests"
-  ninja_in "$preset" "$@"
+  is_built "$preset" "$@" || ninja_in "$preset" "$@"
   exec {lock}>&-
 } </dev/null >&2
 

@@ -12,6 +12,9 @@ die() {
   exit 1
 }
 
+# Whatever was under way when the user pressed Ctrl-C has ended, and says nothing of its own.
+trap 'say interrupted; exit 130' INT
+
 # quietly COMMAND…: its output is shown only when it fails.
 quietly() {
   local output

@@ -46,7 +46,9 @@ bool openLog(const std::string& to) {
   }
   auto sink = to == "stderr" ? makeStandardErrorSink() : makeFileSink(to);
   if (sink == nullptr) {
-    tellUser("vesk: the log cannot go to " + to + ": " + std::strerror(errno));
+    const char* reason =
+        errno == ELOOP ? "it is a link, in a directory that others may write to" : std::strerror(errno);
+    tellUser("vesk: the log cannot go to " + to + ": " + reason);
     return false;
   }
   SystemLog::setSink(std::move(sink));

@@ -28,6 +28,12 @@ Channel::Channel(vesk::WorkQueue& queue)
   deliveries_.suspend();
 }
 
+const EventHandler* Channel::Handlers::of(const vesk::Text& event) const {
+  if (event == kEventMetric) return &metric;
+  if (event == kEventTrigger) return &trigger;
+  return nullptr;
+}
+
 void Channel::setHandler(const vesk::Text& event, EventHandler handler) {
   const std::lock_guard lock(lock_);
   auto handlers = std::make_unique<Handlers>(*handlers_);
@@ -102,9 +108,8 @@ void Channel::scheduleDeliveries() {
 }
 
 void Channel::handle(const vesk::Text& event, const vesk::InterProcessDictionary& message) const {
-  const Handlers& handlers = *handlers_;
-  const EventHandler& handler = event == kEventMetric ? handlers.metric : handlers.trigger;
-  if (handler) handler(message, WorkGroup{});
+  const EventHandler* handler = handlers_.load()->of(event);
+  if (handler != nullptr && *handler) (*handler)(message, WorkGroup{});
 }
 
 }  // namespace corvik::client

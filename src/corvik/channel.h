@@ -35,6 +35,9 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
   struct Handlers {
     EventHandler metric;
     EventHandler trigger;
+
+    /// Null for a name that no event has.
+    [[nodiscard]] const EventHandler* of(const vesk::Text& event) const;
   };
 
   void post(vesk::Task task);

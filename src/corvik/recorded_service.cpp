@@ -49,7 +49,7 @@ void RecordedService::endThread() {
 }
 
 Result RecordedService::answer(const MetricQuery&, EventStream&) {
-  return {};
+  return {kStatusNotSupported, "a recording answers no query"};
 }
 
 void RecordedService::schedule(Step step, EventStream& events) {

@@ -16,8 +16,9 @@
 namespace corvik {
 
 /// A service whose metrics come from a recording. It plays as soon as the client wants metrics, and no faster than the
-/// client takes them. A query is accepted and not answered. A client that disconnects ends the playback at once,
-/// whatever it waits for. Its player may be steered all the while; on the main thread not once it has ended.
+/// client takes them. It refuses queries: what was asked for on the drive comes when it came then. A client that
+/// disconnects ends the playback at once, whatever it waits for. Its player may be steered all the while; on the main
+/// thread not once it has ended.
 class RecordedService final : public Service {
  public:
   /// Which thread plays.

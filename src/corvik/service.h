@@ -23,6 +23,7 @@ struct Result {
 inline constexpr std::int32_t kStatusNoService = 1;
 inline constexpr std::int32_t kStatusUnknownCommand = 2;
 inline constexpr std::int32_t kStatusInvalidArgument = 3;
+inline constexpr std::int32_t kStatusNotSupported = 4;
 
 /// What a query asks for.
 struct MetricQuery {

@@ -39,7 +39,7 @@ void Handset::step() {
   drive_.advance(kSeconds, random_);
   radio_.moveTo(drive_.place(), drive_.speed() * kSeconds, random_);
 
-  const Surroundings now{nowMs_, radio_, outbox_, registration_, random_};
+  const StepContext now{nowMs_, radio_, outbox_, registration_, random_};
   if (const auto departure = mode().step(now)) {
     technology_ = departure->to;
     outbox_.raiseTrigger(kTechnologyChangeTrigger);

@@ -8,7 +8,7 @@ namespace vesk {
 
 /// Writes instants as "yyyy-MM-dd HH:mm:ss zzz" in the time zone of the process, with daylight saving time. "zzz" is
 /// the zone's short name, such as UTC or CET, or its distance, such as GMT+5, when it has no name. It takes up the time
-/// zone when it is made. To be used by one thread.
+/// zone when it is made; the locale plays no part. To be used by one thread.
 class DateFormat {
  public:
   DateFormat();

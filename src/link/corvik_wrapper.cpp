@@ -114,16 +114,21 @@ void CorvikWrapper::forward(const InterProcessDictionary& event, const char* lab
   if (SystemLog::isOpen()) {
     SystemLog::write("%s: %s dict=%s", kListenHandler, label, textOf(*dictionary).c_str());
   }
-  if (!isDelegateSet_) return;
+  if (!hasDelegate()) return;
   // The wrapper is there until what it has scheduled is done.
   MainQueue::shared().post([this, dictionary = std::move(dictionary), deliver] {
     if (const auto delegate = this->delegate()) ((*delegate).*deliver)(dictionary);
   });
 }
 
+bool CorvikWrapper::hasDelegate() const {
+  const std::lock_guard lock(delegateLock_);
+  return !delegate_.expired();
+}
+
 void CorvikWrapper::setDelegate(std::weak_ptr<CorvikWrapperDelegate> delegate) {
+  const std::lock_guard lock(delegateLock_);
   delegate_ = std::move(delegate);
-  isDelegateSet_ = !delegate_.expired();
 }
 
 }  // namespace vesk

@@ -1,8 +1,8 @@
 #pragma once
 
-#include <atomic>
 #include <cstdint>
 #include <memory>
+#include <mutex>
 #include <string>
 #include <string_view>
 
@@ -56,11 +56,13 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
   /// Has the events called `event` forwarded by `deliver`; `label` is what the log calls them.
   void forward(const Text& event, const char* label, Deliver deliver);
   void forward(const InterProcessDictionary& event, const char* label, Deliver deliver);
+  /// From any thread.
+  [[nodiscard]] bool hasDelegate() const;
 
   std::shared_ptr<corvik::client::Manager> corvikManager_;
+  /// Held by a handler that reads the delegate, and to set it. The main thread, which alone sets it, reads it without.
+  mutable std::mutex delegateLock_;
   std::weak_ptr<CorvikWrapperDelegate> delegate_;
-  /// Read by the handlers, on any thread. The delegate may be gone by then.
-  std::atomic<bool> isDelegateSet_ = false;
 };
 
 }  // namespace vesk

@@ -1,6 +1,7 @@
 #include "system/output_lines.h"
 
 #include <algorithm>
+#include <cerrno>
 #include <csignal>
 #include <cstring>
 #include <unistd.h>
@@ -46,6 +47,7 @@ void DescriptorSink::flush() {
     case DescriptorWriter::Outcome::timedOut:
       return fail("nobody reads it");
     case DescriptorWriter::Outcome::failed:
+      hasReaderLeft_ = written.error == EPIPE;
       return fail(std::strerror(written.error));
     case DescriptorWriter::Outcome::done:
     case DescriptorWriter::Outcome::interrupted:

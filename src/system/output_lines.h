@@ -51,6 +51,8 @@ class DescriptorSink : public OutputSink {
   void write(std::string_view line) override;
   void flush() override;
   [[nodiscard]] bool hasFailed() const { return hasFailed_; }
+  /// Whether it has failed because the reader of a pipe has gone, as `head` does when it has enough: no fault.
+  [[nodiscard]] bool hasReaderLeft() const { return hasReaderLeft_; }
 
  private:
   void fail(const char* reason);
@@ -63,6 +65,7 @@ class DescriptorSink : public OutputSink {
   Clock::Duration patience_{};
   FailureHandler onFailure_;
   bool hasFailed_ = false;
+  bool hasReaderLeft_ = false;
   std::string buffer_;
 };
 

@@ -64,7 +64,7 @@ void RunLoop::schedule(std::shared_ptr<Timer::State> timer) {
 }
 
 bool RunLoop::isTicking(const Timer::State& timer) const {
-  return timer.isRunning && timer.mode == mode_;
+  return timer.isRunning && (timer.mode == mode_ || timer.mode == RunLoopMode::common);
 }
 
 bool RunLoop::fireTimers() {

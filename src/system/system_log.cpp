@@ -6,6 +6,7 @@
 #include <cstdio>
 #include <fcntl.h>
 #include <mutex>
+#include <sys/stat.h>
 #include <syslog.h>
 #include <unistd.h>
 #include <utility>
@@ -83,6 +84,13 @@ std::string formatted(const char* format, std::va_list arguments) {
   return line;
 }
 
+bool mayOthersWriteBeside(const std::string& path) {
+  const std::size_t slash = path.rfind('/');
+  const std::string directory = slash == std::string::npos ? "." : path.substr(0, slash + 1);
+  struct stat status {};
+  return stat(directory.c_str(), &status) == 0 && (status.st_mode & (S_IWGRP | S_IWOTH)) != 0;
+}
+
 }  // namespace
 
 std::unique_ptr<LogSink> makeSyslogSink() {
@@ -95,7 +103,8 @@ std::unique_ptr<LogSink> makeStandardErrorSink() {
 
 std::unique_ptr<LogSink> makeFileSink(const std::string& path, std::chrono::milliseconds patience) {
   constexpr int kMode = 0666;
-  FileDescriptor file(open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, kMode));
+  const int follow = mayOthersWriteBeside(path) ? O_NOFOLLOW : 0;
+  FileDescriptor file(open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC | follow, kMode));
   if (!file.isOpen()) return nullptr;
   return std::make_unique<DescriptorLogSink>(std::move(file), patience);
 }

@@ -23,7 +23,8 @@ inline constexpr std::chrono::milliseconds kLogPatience{1000};
 
 [[nodiscard]] std::unique_ptr<LogSink> makeStandardErrorSink();
 /// Appends to the file, and drops what does not fit on a full disk; null when it cannot be opened, with errno telling
-/// why. The file may be a pipe with a name.
+/// why. The file may be a pipe with a name. In a directory that others may write to, a link is not followed (ELOOP): it
+/// might be theirs.
 [[nodiscard]] std::unique_ptr<LogSink> makeFileSink(const std::string& path,
                                                     std::chrono::milliseconds patience = kLogPatience);
 

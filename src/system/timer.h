@@ -14,6 +14,8 @@ enum class RunLoopMode {
   defaultMode,
   /// The user is dragging something.
   tracking,
+  /// Of a timer only: it ticks whatever the main thread is busy with.
+  common,
 };
 
 /// A repeating timer on a run loop, for the main thread. The first tick comes one interval after it was made.

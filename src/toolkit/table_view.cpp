@@ -6,8 +6,7 @@
 namespace vesk {
 
 void TableView::reloadData() {
-  for (auto& [at, cell] : std::exchange(inView_, {}))
-    recycle(std::move(cell));
+  letGoOfCells();
   const std::size_t count = source_.numberOfSections();
   std::vector<Section> sections;
   sections.reserve(count);
@@ -18,6 +17,11 @@ void TableView::reloadData() {
   sections_ = std::move(sections);
   ++reloadCount_;
   if (reloadObserver_) reloadObserver_();
+}
+
+void TableView::letGoOfCells() {
+  for (auto& [at, cell] : std::exchange(inView_, {}))
+    recycle(std::move(cell));
 }
 
 std::unique_ptr<TableViewCell> TableView::dequeueReusableCell(std::string_view identifier) {

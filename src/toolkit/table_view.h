@@ -72,6 +72,8 @@ class TableView {
   [[nodiscard]] RowHeight estimatedRowHeight(IndexPath at) { return source_.estimatedRowHeight(at); }
   /// The rows from `first` to `last`, both included, are in view: cells of others go back to the pool.
   void keepInView(IndexPath first, IndexPath last);
+  /// No row is in view: each is asked for again when it is next needed.
+  void letGoOfCells();
 
  private:
   struct Section {

@@ -12,8 +12,8 @@
 
 namespace vesk {
 
-/// A growable sequence with the semantics of a value and the price of a pointer: copies share one block, and
-/// the first change through a copy gives that copy a block of its own. Copies may be used from several
+/// A growable sequence with the price of a pointer, copied on write: copies share one block, and the first
+/// change through a copy gives that copy a block of its own. Copies may be used from several
 /// threads, one object may not.
 template <class T>
 class SharedVector {

@@ -1,5 +1,6 @@
 #include "values/text_form.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
@@ -21,16 +22,33 @@ void appendInteger(std::string& out, Number number) {
   out.append(digits.data(), result.ptr);
 }
 
+/// Of "1.5" and -20: the digits, with the point where the exponent puts it.
+void appendShifted(std::string& out, std::string_view mantissa, int exponent) {
+  if (mantissa.front() == '-') {
+    out += '-';
+    mantissa.remove_prefix(1);
+  }
+  std::string digits(mantissa.substr(0, 1));
+  if (mantissa.size() > 2) digits += mantissa.substr(2);
+  if (exponent < 0) digits.insert(0, static_cast<std::size_t>(-exponent), '0');
+  const auto point = static_cast<std::size_t>(std::max(exponent, 0)) + 1;
+  if (digits.size() <= point) digits.resize(point + 1, '0');
+  out += digits.insert(point, 1, '.');
+}
+
 template <class Number>
 void appendReal(std::string& out, Number number) {
   std::array<char, kLongestNumber> digits;
   const auto result = std::to_chars(digits.data(), digits.data() + digits.size(), number);
   const std::string_view shortest(digits.data(), static_cast<std::size_t>(result.ptr - digits.data()));
-  const std::size_t exponent = shortest.find('e');
-  const std::string_view mantissa = shortest.substr(0, exponent);
-  out += mantissa;
-  if (std::isfinite(number) && mantissa.find('.') == std::string_view::npos) out += ".0";
-  if (exponent != std::string_view::npos) out += shortest.substr(exponent);
+  if (const std::size_t e = shortest.find('e'); e != std::string_view::npos) {
+    const char* exponentText = shortest.data() + e + (shortest[e + 1] == '+' ? 2 : 1);
+    int exponent = 0;
+    std::from_chars(exponentText, result.ptr, exponent);
+    return appendShifted(out, shortest.substr(0, e), exponent);
+  }
+  out += shortest;
+  if (std::isfinite(number) && shortest.find('.') == std::string_view::npos) out += ".0";
 }
 
 struct TextForm {

@@ -23,7 +23,8 @@ template <class Shown>
 /// Appends `number` in decimal.
 void appendDecimal(std::string& out, std::int64_t number);
 void appendDecimal(std::string& out, std::uint64_t number);
-/// Appends the shortest form that reads back as `number`, always with a point: 20.0, 1.4, 1.0e+20.
+/// Appends the fewest digits that read back as `number`, always with a point and never with an exponent: 20.0, 1.4,
+/// 100000.0.
 void appendDecimal(std::string& out, float number);
 void appendDecimal(std::string& out, double number);
 /// Appends `number` in upper-case hexadecimal.

@@ -140,7 +140,7 @@ TEST_F(Road, ShowsWhatAnUnknownPairShowsAndTellsWhichThereAre) {
     EXPECT_TRUE(finished.error.starts_with(row.told)) << finished.error;
     EXPECT_NE(finished.output.find("\n  Come back later  Come back later\n"), std::string::npos) << finished.output;
     EXPECT_EQ((finished.output + finished.error).find('\x1B'), std::string::npos);
-    EXPECT_EQ(finished.status, 0);
+    EXPECT_EQ(finished.status, 2);
   }
   KCellularActivatedBearerContexts bearers;
   bearers.addBearerContexts(std::make_shared<BearerContext>());

@@ -118,6 +118,10 @@ TEST_P(RecordedServiceOnEitherThread, PlaysAllAsFastAsItIsTakenThenTellsItsEnd) 
   loop_.run();
   EXPECT_TRUE(isEnded_);
   EXPECT_EQ(ids_, expected);
+  vesk::InterProcessDictionary query;
+  for (const vesk::Text& key : {kKeyTriggerRef, kKeyTriggerType, kKeyTriggerID, kKeyProfileID, kKeyMetricID})
+    query.setInteger(key, 0);
+  EXPECT_EQ(client::PerformCommand(manager_, kCommandQueryMetric, query, query).code, kStatusNotSupported);
   EXPECT_EQ(badLines_, std::vector<std::string>{"r:4: no JSON object"});
   EXPECT_EQ(failure_, std::nullopt);
   const PlaybackState state = service_->state();

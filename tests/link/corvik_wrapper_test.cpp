@@ -124,6 +124,7 @@ TEST_F(CorvikWrapperTest, ForwardsEventsToItsDelegateOnTheMainQueue) {
   wrapper_->listen();
   raise(corvik::kEventMetric, 1);
   raise(corvik::kEventTrigger, 2);
+  raise("kEventOfAnotherName"_text, 3);
   EXPECT_TRUE(notes_.empty());
   loop_.runDue();
   EXPECT_EQ(notes_, (Lines{"metric {id: 1}", "trigger {id: 2}"}));
@@ -147,6 +148,10 @@ TEST_F(CorvikWrapperTest, DropsAnEventWithoutADelegateWhenItComesOrWhenItsTurnCo
   raise(corvik::kEventMetric, 3);
   wrapper_->setDelegate(delegate_);
   delegate_.reset();
+  loop_.runDue();
+  // Set, but gone when the event comes: one that is set before the event's turn comes too late.
+  raise(corvik::kEventMetric, 4);
+  wrapper_->setDelegate(other);
   loop_.runDue();
   EXPECT_TRUE(notes_.empty());
   EXPECT_EQ(others.size(), 1U);

@@ -33,9 +33,10 @@ TEST(Schema, IsTheOneThatTheHandsetWrites) {
       {"wcdma/wcdma.proto", 0x435598875F234CBA},
   };
   for (const auto& [path, fingerprint] : files) {
-    EXPECT_EQ(fingerprintOf(path), fingerprint) << path
-                                                << " differs: what is there must keep its names, numbers and types; "
-                                                   "when only new ones came, put the new number here";
+    EXPECT_EQ(fingerprintOf(path), fingerprint)
+        << path << " was changed. Names, numbers and types that were there are what handsets write: put them back as "
+        << "they were. If all that came is new messages, fields or values, then write 0x" << std::hex << std::uppercase
+        << fingerprintOf(path) << " beside the file's name in this test.";
   }
 }
 

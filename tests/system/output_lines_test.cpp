@@ -84,6 +84,7 @@ TEST(DescriptorSink, RemembersAClosedPipeAndTellsOnce) {
     sink.flush();
   }
   EXPECT_TRUE(sink.hasFailed());
+  EXPECT_TRUE(sink.hasReaderLeft());
   EXPECT_EQ(reasons, std::vector<std::string>{"standard output: Broken pipe"});
 }
 

@@ -40,13 +40,14 @@ TEST_F(RunLoopTest, HoldsATimerBackWhileAnotherModeRuns) {
   std::string ticks;
   const Timer normal(loop_, 5s, RunLoopMode::defaultMode, [&] { ticks += 'd'; });
   const Timer dragging(loop_, 5s, RunLoopMode::tracking, [&] { ticks += 't'; });
+  const Timer either(loop_, 5s, RunLoopMode::common, [&] { ticks += 'e'; });
   loop_.setMode(RunLoopMode::tracking);
   clock_.advance(20s);
   loop_.runDue();
-  EXPECT_EQ(ticks, "t");
+  EXPECT_EQ(ticks, "te");
   loop_.setMode(RunLoopMode::defaultMode);
   loop_.runDue();
-  EXPECT_EQ(ticks, "td");
+  EXPECT_EQ(ticks, "ted");
 }
 
 TEST_F(RunLoopTest, LetsATimerGoFromItsOwnAndFromAnothersAction) {

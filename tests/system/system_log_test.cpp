@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 #include <sstream>
 #include <string>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include "support/input.h"
@@ -48,6 +49,17 @@ TEST(SystemLog, AppendsToAFileLineByLine) {
   content << std::ifstream(path).rdbuf();
   EXPECT_EQ(content.str(), "first\nsecond\n");
   EXPECT_EQ(makeFileSink("/no/such/folder/vesk.log"), nullptr);
+
+  // A link is another's to lay where others may write.
+  const std::string folder = testing::TempDir() + "vesk_system_log_test.folder";
+  const std::string link = folder + "/vesk.log";
+  mkdir(folder.c_str(), 0700);
+  std::remove(link.c_str());
+  ASSERT_EQ(symlink(path.c_str(), link.c_str()), 0);
+  for (const mode_t mode : {0700U, 0720U, 0702U}) {
+    ASSERT_EQ(chmod(folder.c_str(), mode), 0);
+    EXPECT_EQ(makeFileSink(link) != nullptr, mode == 0700U);
+  }
 }
 
 TEST(SystemLog, GoesOnBesideAReaderThatStoppedReadingAndTellsItLaterWhatItMissed) {

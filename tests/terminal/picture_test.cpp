@@ -73,10 +73,12 @@ TEST(Picture, MarksValuesThatChangedAtTheLastReloadForThatReload) {
 
   fields.content = power("2");
   fields.content[0].rows.insert(fields.content[0].rows.begin(), row("new", "7"));
+  fields.content[0].rows.push_back(row("timestamp", "now"));
   fields.tableView().reloadData();
   EXPECT_EQ(desk.line(3), "• new                                7");
   EXPECT_EQ(desk.line(4), "• tx_power                           2");
   EXPECT_EQ(desk.line(5), "  chan                               3");
+  EXPECT_EQ(desk.line(7), "  timestamp                        now");
   const Grid marked = desk.grid();
   EXPECT_EQ(marked.at(37, 4).role, Role::Changed);
   EXPECT_EQ(marked.at(37, 5).role, Role::Value);

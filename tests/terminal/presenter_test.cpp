@@ -121,7 +121,21 @@ TEST_F(PresenterTest, AsksOnlyForRowsThatComeIntoView) {
   EXPECT_EQ(fields.cellRequests, 7);
   desk_->press(Key::PageDown);
   desk_->picture();
-  EXPECT_LE(fields.cellRequests, 7 + 6 + 1);
+  // The six that come, and then all seven, so that one screen is one moment.
+  EXPECT_LE(fields.cellRequests, 7 + 6 + 7 + 1);
+}
+
+TEST_F(PresenterTest, AsksAgainForRowsThatComeIntoViewAgainAndForThoseBesideThem) {
+  FakeTableScreen& fields = showFields(numbered(30, "old"));
+  EXPECT_NE(desk_->picture().find("old"), std::string::npos);
+  fields.content = numbered(30, "new");
+  desk_->press(Key::End);
+  desk_->picture();
+  desk_->press(Key::Home);
+  EXPECT_EQ(desk_->picture().find("old"), std::string::npos);
+  fields.content = numbered(30, "now");
+  desk_->press(Key::PageDown);
+  EXPECT_EQ(desk_->picture().find("new"), std::string::npos);
 }
 
 TEST_F(PresenterTest, CopesWithAContentThatShrinksBeforeAndAtAReload) {

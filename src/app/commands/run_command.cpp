@@ -74,8 +74,8 @@ class Run {
   /// The diagnostic lines on standard output. When they can no longer be written nothing is left to be done.
   void printLines() {
     auto sink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
-    sink->setFailureHandler([this](const std::string& reason) {
-      tell("vesk: " + reason);
+    sink->setFailureHandler([this, &written = *sink](const std::string& reason) {
+      if (!written.hasReaderLeft()) tell("vesk: " + reason);
       loop_.stop();
     });
     sink->setInterrupt(&stopSignal_);
@@ -86,7 +86,7 @@ class Run {
   void mainLoop(Application& application, NavigationController& root) {
     std::optional<Timer> end;
     if (options_.duration) {
-      end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
+      end.emplace(loop_, *options_.duration, RunLoopMode::common, [this] { loop_.stop(); });
     }
     if (isJudging_) judgeRules();
     root_ = &root;

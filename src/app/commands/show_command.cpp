@@ -160,31 +160,36 @@ std::string suggestionAmong(const std::vector<Text>& labels, std::string_view ty
   return suggestionFor(typed, candidates, "\"");
 }
 
-/// Tells which labels there are when these are not among them.
-void tellUnknownLabels(const ShowOptions& options) {
+/// Whether the menu has these labels. The user is told which ones there are when it has not.
+bool checkLabels(const ShowOptions& options) {
   const VeskViewItems& menu = VeskViewItems::shared();
   const auto& areas = menu.launchViewItemNames;
   const auto& categories = menu.categoriesOf(options.area);
   if (categories.empty()) {
     tellUser("vesk: no area \"" + options.area + "\"" + suggestionAmong(areas, options.area) +
              "; there are: " + joined(areas));
-  } else if (std::find(categories.begin(), categories.end(), options.category) == categories.end()) {
+    return false;
+  }
+  if (std::find(categories.begin(), categories.end(), options.category) == categories.end()) {
     tellUser("vesk: no category \"" + options.category + "\" in " + options.area +
              suggestionAmong(categories, options.category) + "; there are: " + joined(categories));
+    return false;
   }
+  return true;
 }
 
 }  // namespace
 
 Outcome runShow(const ShowOptions& options) {
   DataOutput output;
-  tellUnknownLabels(options);
-  const Outcome outcome = playRecording(options.input, [&](NavigationController& root) {
+  const bool areLabelsKnown = checkLabels(options);
+  Outcome outcome = playRecording(options.input, [&](NavigationController& root) {
     openRow(root, options.area);
     openRow(root, options.category);
     const std::vector<ShownSection> sections = sectionsOf(topTable(root).tableView());
     output.writeLine(options.asJson ? asJson(options, sections) : asText(options, sections));
   });
+  if (outcome == Outcome::done && !areLabelsKnown) outcome = Outcome::wrongUsage;
   return output.finish(outcome);
 }
 

@@ -17,8 +17,8 @@ struct ShowOptions {
 
 /// Plays the recording through the whole program, opens the category's screen and prints what it shows: as text, or as
 ///   {"area":"LTE","category":"Tx Power","sections":[{"header":"TxPowerInfo 0","rows":[{"key":…,"value":…}]}]}
-/// with null for what is absent. Labels that the menu does not have show what such a screen shows, and the user is told
-/// which ones there are.
+/// with null for what is absent. Labels that the menu does not have show what such a screen shows; the user is told
+/// which ones there are, and the outcome is wrong usage.
 [[nodiscard]] Outcome runShow(const ShowOptions& options);
 
 }  // namespace vesk

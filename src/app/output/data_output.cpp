@@ -6,12 +6,14 @@
 namespace vesk {
 
 DataOutput::DataOutput() : sink_(STDOUT_FILENO, "standard output") {
-  sink_.setFailureHandler([](const std::string& reason) { tellUser("vesk: " + reason); });
+  sink_.setFailureHandler([this](const std::string& reason) {
+    if (!sink_.hasReaderLeft()) tellUser("vesk: " + reason);
+  });
 }
 
 Outcome DataOutput::finish(Outcome outcome) {
   flush();
-  return hasFailed() ? Outcome::failed : outcome;
+  return hasFailed() && !sink_.hasReaderLeft() ? Outcome::failed : outcome;
 }
 
 }  // namespace vesk

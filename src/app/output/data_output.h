@@ -7,13 +7,17 @@
 
 namespace vesk {
 
-/// Standard output for a command that prints data: lines are written as they are. The user is told when it fails.
+/// Standard output for a command that prints data: lines are written as they are. The user is told when it fails, but
+/// not of a reader that has had enough.
 class DataOutput {
  public:
   DataOutput();
+  DataOutput(const DataOutput&) = delete;
+  DataOutput& operator=(const DataOutput&) = delete;
 
   void writeLine(std::string_view line) { sink_.write(line); }
   void flush() { sink_.flush(); }
+  /// Whether what is written reaches nobody.
   [[nodiscard]] bool hasFailed() const { return sink_.hasFailed(); }
 
   /// Writes what is left. `outcome`, unless something could not be written.

@@ -47,20 +47,20 @@ void addMeasurement(SecondaryComponentCarrier& carrier, const LteSignal& signal)
 
 }  // namespace
 
-void CarrierAggregation::start(const LteCell& primary, const Surroundings& now) {
+void CarrierAggregation::start(const LteCell& primary, const StepContext& now) {
   primary_ = &primary;
   secondaries_.clear();
   changeMs_ = now.nowMs + 1500;
   tellCarriers(now);
 }
 
-void CarrierAggregation::end(const Surroundings& now) {
+void CarrierAggregation::end(const StepContext& now) {
   while (!secondaries_.empty())
     deconfigureLast(now);
   primary_ = nullptr;
 }
 
-void CarrierAggregation::step(const Surroundings& now) {
+void CarrierAggregation::step(const StepContext& now) {
   bool hasActivated = false;
   for (Secondary& secondary : secondaries_) {
     const bool isDue = secondary.state != SccState::SCC_STATE_ACTIVATED && now.nowMs >= secondary.activationMs;
@@ -76,7 +76,7 @@ void CarrierAggregation::step(const Surroundings& now) {
   if (!secondaries_.empty() && status_.isDue(now.nowMs)) tellStatus(now);
 }
 
-void CarrierAggregation::configureAnother(const Surroundings& now) {
+void CarrierAggregation::configureAnother(const StepContext& now) {
   const auto isUsed = [this](const LteCarrier* carrier) {
     return carrier == primary_->carrier ||
            std::any_of(secondaries_.begin(), secondaries_.end(),
@@ -93,14 +93,14 @@ void CarrierAggregation::configureAnother(const Surroundings& now) {
   }
 }
 
-void CarrierAggregation::deconfigureLast(const Surroundings& now) {
+void CarrierAggregation::deconfigureLast(const StepContext& now) {
   secondaries_.back().state = SccState::SCC_STATE_DECONFIGURED;
   tellStatus(now);
   secondaries_.pop_back();
   tellCarriers(now);
 }
 
-void CarrierAggregation::tellCarriers(const Surroundings& now) const {
+void CarrierAggregation::tellCarriers(const StepContext& now) const {
   KCellularLteComponentCarrierInfo info;
   info.setPccEarfcn(primary_->carrier->earfcn);
   info.setPccBandwidth(primary_->carrier->bandwidthMhz);
@@ -115,7 +115,7 @@ void CarrierAggregation::tellCarriers(const Surroundings& now) const {
   now.outbox.tell(info);
 }
 
-void CarrierAggregation::tellStatus(const Surroundings& now) {
+void CarrierAggregation::tellStatus(const StepContext& now) {
   KCellularLteCarrierAggregationStatus status;
   std::uint32_t index = 0;
   for (const Secondary& secondary : secondaries_) {

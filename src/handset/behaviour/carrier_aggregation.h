@@ -15,10 +15,10 @@ namespace vesk::handset {
 class CarrierAggregation {
  public:
   /// A connection on `primary` begins, or goes on there after a handover; no secondary carrier yet.
-  void start(const LteCell& primary, const Surroundings& now);
+  void start(const LteCell& primary, const StepContext& now);
   /// The connection is over.
-  void end(const Surroundings& now);
-  void step(const Surroundings& now);
+  void end(const StepContext& now);
+  void step(const StepContext& now);
 
  private:
   struct Secondary {
@@ -27,10 +27,10 @@ class CarrierAggregation {
     std::int64_t activationMs;
   };
 
-  void configureAnother(const Surroundings& now);
-  void deconfigureLast(const Surroundings& now);
-  void tellCarriers(const Surroundings& now) const;
-  void tellStatus(const Surroundings& now);
+  void configureAnother(const StepContext& now);
+  void deconfigureLast(const StepContext& now);
+  void tellCarriers(const StepContext& now) const;
+  void tellStatus(const StepContext& now);
 
   const LteCell* primary_ = nullptr;
   std::vector<Secondary> secondaries_;

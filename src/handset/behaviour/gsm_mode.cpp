@@ -11,13 +11,13 @@ constexpr double kGsmCellMargin = 6;
 
 }  // namespace
 
-void GsmMode::enter(const Surroundings& now, bool /*isHandover*/) {
+void GsmMode::enter(const StepContext& now, bool /*isHandover*/) {
   isDedicated_ = false;
   dueMs_ = now.nowMs + 2500 + now.random.below(1000);
   camp(*now.radio.gsm().front().cell, now);
 }
 
-std::optional<Departure> GsmMode::step(const Surroundings& now) {
+std::optional<Departure> GsmMode::step(const StepContext& now) {
   const GsmSignal* signal = now.radio.of(serving_);
   if (signal != nullptr) report(now, *signal);
   const bool isLteBack = lteIsBack_.hasHeld(isLteUsable(now.radio), now.nowMs);
@@ -29,13 +29,13 @@ std::optional<Departure> GsmMode::step(const Surroundings& now) {
   return std::nullopt;
 }
 
-void GsmMode::considerOtherCells(const Surroundings& now, const GsmSignal* signal) {
+void GsmMode::considerOtherCells(const StepContext& now, const GsmSignal* signal) {
   const auto& heard = now.radio.gsm();
   const bool isBetter = !heard.empty() && (signal == nullptr || heard.front().rxLev > signal->rxLev + kGsmCellMargin);
   if (betterCell_.hasHeld(isBetter, now.nowMs)) camp(*heard.front().cell, now);
 }
 
-void GsmMode::setDedicated(bool isDedicated, const Surroundings& now) {
+void GsmMode::setDedicated(bool isDedicated, const StepContext& now) {
   isDedicated_ = isDedicated;
   dueMs_ = now.nowMs + (isDedicated ? 4000 + now.random.below(3000) : 10000 + now.random.below(10000));
   servingReport_.reset();
@@ -43,7 +43,7 @@ void GsmMode::setDedicated(bool isDedicated, const Surroundings& now) {
   now.outbox.tell(info);
 }
 
-void GsmMode::camp(const GsmCell& cell, const Surroundings& now) {
+void GsmMode::camp(const GsmCell& cell, const StepContext& now) {
   serving_ = &cell;
   betterCell_.reset();
   auto info = makeGsmCellInfo(cell, isDedicated_);
@@ -54,7 +54,7 @@ void GsmMode::camp(const GsmCell& cell, const Surroundings& now) {
   now.outbox.tell(gprs);
 }
 
-void GsmMode::report(const Surroundings& now, const GsmSignal& signal) {
+void GsmMode::report(const StepContext& now, const GsmSignal& signal) {
   if (servingReport_.isDue(now.nowMs)) {
     if (isDedicated_) {
       auto dedicated = makeGsmDedicated(signal, now.random);

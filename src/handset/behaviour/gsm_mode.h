@@ -9,14 +9,14 @@ namespace vesk::handset {
 /// as one is usable.
 class GsmMode final : public Mode {
  public:
-  void enter(const Surroundings& now, bool isHandover) override;
-  [[nodiscard]] std::optional<Departure> step(const Surroundings& now) override;
+  void enter(const StepContext& now, bool isHandover) override;
+  [[nodiscard]] std::optional<Departure> step(const StepContext& now) override;
 
  private:
-  void camp(const GsmCell& cell, const Surroundings& now);
-  void setDedicated(bool isDedicated, const Surroundings& now);
-  void considerOtherCells(const Surroundings& now, const GsmSignal* signal);
-  void report(const Surroundings& now, const GsmSignal& signal);
+  void camp(const GsmCell& cell, const StepContext& now);
+  void setDedicated(bool isDedicated, const StepContext& now);
+  void considerOtherCells(const StepContext& now, const GsmSignal* signal);
+  void report(const StepContext& now, const GsmSignal& signal);
   [[nodiscard]] Area area() const { return {false, serving_->locationAreaCode}; }
 
   const GsmCell* serving_ = nullptr;

@@ -43,7 +43,7 @@ std::string makeCallId(Random& random) {
 
 }  // namespace
 
-void LteMode::enter(const Surroundings& now, bool isHandover) {
+void LteMode::enter(const StepContext& now, bool isHandover) {
   callId_.clear();
   camp(*now.radio.lte().front().cell, now);
   if (isHandover) {
@@ -56,7 +56,7 @@ void LteMode::enter(const Surroundings& now, bool isHandover) {
   }
 }
 
-std::optional<Departure> LteMode::step(const Surroundings& now) {
+std::optional<Departure> LteMode::step(const StepContext& now) {
   const LteSignal* signal = now.radio.of(serving_);
   if (signal != nullptr) report(now, *signal);
   switch (state_) {
@@ -79,7 +79,7 @@ std::optional<Departure> LteMode::step(const Surroundings& now) {
   return std::nullopt;
 }
 
-std::optional<Departure> LteMode::stepIdle(const Surroundings& now, const LteSignal* signal) {
+std::optional<Departure> LteMode::stepIdle(const StepContext& now, const LteSignal* signal) {
   const bool isTooWeak = signal == nullptr || signal->rsrp < kLeastIdleLevel;
   if (outOfReach_.hasHeld(isTooWeak && !isLteUsable(now.radio), now.nowMs)) {
     const auto departure = leave(Cause::KLTE_RRC_CAUSE_NO_SERVICE, false, now);
@@ -96,7 +96,7 @@ std::optional<Departure> LteMode::stepIdle(const Surroundings& now, const LteSig
   return std::nullopt;
 }
 
-void LteMode::stepAttempt(const Surroundings& now) {
+void LteMode::stepAttempt(const StepContext& now) {
   if (isReestablishing_) {
     isReestablishing_ = false;
     if (!isLteUsable(now.radio)) {
@@ -116,7 +116,7 @@ void LteMode::stepAttempt(const Surroundings& now) {
   aggregation_.start(*serving_, now);
 }
 
-void LteMode::stepConnected(const Surroundings& now, const LteSignal* signal) {
+void LteMode::stepConnected(const StepContext& now, const LteSignal* signal) {
   now.registration.keepUp(area(), now.nowMs, now.outbox, now.random);
   aggregation_.step(now);
 
@@ -138,7 +138,7 @@ void LteMode::stepConnected(const Surroundings& now, const LteSignal* signal) {
   }
 }
 
-std::optional<Departure> LteMode::leave(Cause cause, bool isHandover, const Surroundings& now) {
+std::optional<Departure> LteMode::leave(Cause cause, bool isHandover, const StepContext& now) {
   const bool toUmts = isUmtsUsable(now.radio);
   if (!toUmts && !isGsmUsable(now.radio)) {
     if (isHandover) endConnection(Cause::KLTE_RRC_CAUSE_REL_CONN_FAIL_CELL_NOT_SUIT, now);
@@ -148,13 +148,13 @@ std::optional<Departure> LteMode::leave(Cause cause, bool isHandover, const Surr
   return Departure{toUmts ? Technology::umts : Technology::gsm, isHandover && toUmts};
 }
 
-void LteMode::startConnection(Cause cause, const Surroundings& now) {
+void LteMode::startConnection(Cause cause, const StepContext& now) {
   establishmentCause_ = cause;
   changeState(State::KLTE_RRC_STATE_ATMPT_CONNECTION, cause, now);
   dueMs_ = now.nowMs + 100 + now.random.below(100);
 }
 
-void LteMode::endConnection(Cause cause, const Surroundings& now) {
+void LteMode::endConnection(Cause cause, const StepContext& now) {
   if (!callId_.empty()) aggregation_.end(now);
   callId_.clear();
   changeState(State::KLTE_RRC_STATE_IDLE, cause, now);
@@ -163,7 +163,7 @@ void LteMode::endConnection(Cause cause, const Surroundings& now) {
   now.outbox.tell(drx);
 }
 
-void LteMode::handOver(const LteCell& target, const Surroundings& now) {
+void LteMode::handOver(const LteCell& target, const StepContext& now) {
   now.outbox.raiseTrigger(kHandoverTrigger);
   if (now.random.chance(kHandoverFailure)) {
     failLink(Cause::KLTE_RRC_CAUSE_REEST_HO_FAIL, now);
@@ -174,14 +174,14 @@ void LteMode::handOver(const LteCell& target, const Surroundings& now) {
   aggregation_.start(target, now);
 }
 
-void LteMode::failLink(Cause cause, const Surroundings& now) {
+void LteMode::failLink(Cause cause, const StepContext& now) {
   aggregation_.end(now);
   now.outbox.tellRadioLinkFailure();
   isReestablishing_ = true;
   startConnection(cause, now);
 }
 
-void LteMode::changeState(State state, Cause cause, const Surroundings& now) {
+void LteMode::changeState(State state, Cause cause, const StepContext& now) {
   KCellularLteRrcState report;
   report.setState(state);
   report.setPrevState(state_);
@@ -195,7 +195,7 @@ void LteMode::changeState(State state, Cause cause, const Surroundings& now) {
   outOfSync_.reset();
 }
 
-void LteMode::camp(const LteCell& cell, const Surroundings& now) {
+void LteMode::camp(const LteCell& cell, const StepContext& now) {
   serving_ = &cell;
   samples_.clear();
   reselection_.reset();
@@ -215,7 +215,7 @@ const LteCell* LteMode::betterCell(const Radio& radio, const LteSignal* signal, 
   return nullptr;
 }
 
-void LteMode::report(const Surroundings& now, const LteSignal& signal) {
+void LteMode::report(const StepContext& now, const LteSignal& signal) {
   takeSample(now, signal);
   if (servingReport_.isDue(now.nowMs)) {
     auto serving = makeLteServing(signal, isConnected(), now.radio.secondChainGain());
@@ -235,7 +235,7 @@ void LteMode::report(const Surroundings& now, const LteSignal& signal) {
   }
 }
 
-void LteMode::takeSample(const Surroundings& now, const LteSignal& signal) {
+void LteMode::takeSample(const StepContext& now, const LteSignal& signal) {
   LteSample sample{signal.cell->pci, {}, {}, {}};
   for (std::size_t chain = 0; chain < 2; ++chain) {
     const double gain = (chain == 0 ? 0 : now.radio.secondChainGain()) + kSampleDeviation * now.random.normal();

@@ -14,32 +14,32 @@ namespace vesk::handset {
 /// the level falls and another technology is better (event B2).
 class LteMode final : public Mode {
  public:
-  void enter(const Surroundings& now, bool isHandover) override;
-  [[nodiscard]] std::optional<Departure> step(const Surroundings& now) override;
+  void enter(const StepContext& now, bool isHandover) override;
+  [[nodiscard]] std::optional<Departure> step(const StepContext& now) override;
 
  private:
   using State = metrics::LteRrcState;
   using Cause = metrics::LteRrcCause;
 
-  void changeState(State state, Cause cause, const Surroundings& now);
-  void camp(const LteCell& cell, const Surroundings& now);
+  void changeState(State state, Cause cause, const StepContext& now);
+  void camp(const LteCell& cell, const StepContext& now);
   [[nodiscard]] bool isConnected() const { return state_ == State::KLTE_RRC_STATE_CONNECTED; }
   [[nodiscard]] Area area() const { return {true, serving_->trackingAreaCode}; }
 
-  [[nodiscard]] std::optional<Departure> stepIdle(const Surroundings& now, const LteSignal* signal);
-  void stepAttempt(const Surroundings& now);
-  void stepConnected(const Surroundings& now, const LteSignal* signal);
-  [[nodiscard]] std::optional<Departure> leave(Cause cause, bool isHandover, const Surroundings& now);
+  [[nodiscard]] std::optional<Departure> stepIdle(const StepContext& now, const LteSignal* signal);
+  void stepAttempt(const StepContext& now);
+  void stepConnected(const StepContext& now, const LteSignal* signal);
+  [[nodiscard]] std::optional<Departure> leave(Cause cause, bool isHandover, const StepContext& now);
 
-  void startConnection(Cause cause, const Surroundings& now);
-  void endConnection(Cause cause, const Surroundings& now);
-  void handOver(const LteCell& target, const Surroundings& now);
-  void failLink(Cause cause, const Surroundings& now);
+  void startConnection(Cause cause, const StepContext& now);
+  void endConnection(Cause cause, const StepContext& now);
+  void handOver(const LteCell& target, const StepContext& now);
+  void failLink(Cause cause, const StepContext& now);
   /// The cell that is better than `signal` by `margin` dB, and by 2 more on another frequency; null for none.
   [[nodiscard]] static const LteCell* betterCell(const Radio& radio, const LteSignal* signal, double margin);
 
-  void report(const Surroundings& now, const LteSignal& signal);
-  void takeSample(const Surroundings& now, const LteSignal& signal);
+  void report(const StepContext& now, const LteSignal& signal);
+  void takeSample(const StepContext& now, const LteSignal& signal);
 
   const LteCell* serving_ = nullptr;
   State state_ = State::KLTE_RRC_STATE_NULL;

@@ -9,8 +9,8 @@
 
 namespace vesk::handset {
 
-/// What the handset works with at one moment.
-struct Surroundings {
+/// What a mode works with in one step.
+struct StepContext {
   std::int64_t nowMs;
   const Radio& radio;
   Outbox& outbox;
@@ -31,9 +31,9 @@ class Mode {
   virtual ~Mode() = default;
 
   /// Finds a cell and camps on it; or, in a handover, is connected at once. Some cell of the technology is heard.
-  virtual void enter(const Surroundings& now, bool isHandover) = 0;
+  virtual void enter(const StepContext& now, bool isHandover) = 0;
   /// One step in time; the technology to go to, or none to stay.
-  [[nodiscard]] virtual std::optional<Departure> step(const Surroundings& now) = 0;
+  [[nodiscard]] virtual std::optional<Departure> step(const StepContext& now) = 0;
 };
 
 /// Whether a technology's best cell is good enough to stay on.

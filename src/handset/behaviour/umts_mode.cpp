@@ -19,7 +19,7 @@ bool UmtsMode::isConnected() const {
   return state_ == State::KWCDMA_RRC_CONN_STATE_CELL_DCH || state_ == State::KWCDMA_RRC_CONN_STATE_CELL_FACH;
 }
 
-void UmtsMode::enter(const Surroundings& now, bool isHandover) {
+void UmtsMode::enter(const StepContext& now, bool isHandover) {
   camp(*now.radio.umts().front().cell, now);
   if (isHandover) {
     changeState(State::KWCDMA_RRC_CONN_STATE_CELL_DCH, now);
@@ -30,7 +30,7 @@ void UmtsMode::enter(const Surroundings& now, bool isHandover) {
   }
 }
 
-std::optional<Departure> UmtsMode::step(const Surroundings& now) {
+std::optional<Departure> UmtsMode::step(const StepContext& now) {
   const UmtsSignal* signal = now.radio.of(serving_);
   if (signal != nullptr) report(now, *signal);
   if (const auto departure = considerLeaving(now, signal)) return departure;
@@ -40,7 +40,7 @@ std::optional<Departure> UmtsMode::step(const Surroundings& now) {
   return std::nullopt;
 }
 
-std::optional<Departure> UmtsMode::considerLeaving(const Surroundings& now, const UmtsSignal* signal) {
+std::optional<Departure> UmtsMode::considerLeaving(const StepContext& now, const UmtsSignal* signal) {
   if (lteIsBack_.hasHeld(isLteUsable(now.radio), now.nowMs)) {
     const bool isHandover = state_ == State::KWCDMA_RRC_CONN_STATE_CELL_DCH;
     changeState(State::KWCDMA_RRC_CONN_STATE_INACTIVE, now, std::nullopt, Release::KRRC_REL_CELL_CHANGED);
@@ -55,14 +55,14 @@ std::optional<Departure> UmtsMode::considerLeaving(const Surroundings& now, cons
   return std::nullopt;
 }
 
-void UmtsMode::considerOtherCells(const Surroundings& now, const UmtsSignal* signal) {
+void UmtsMode::considerOtherCells(const StepContext& now, const UmtsSignal* signal) {
   const auto& heard = now.radio.umts();
   const bool isBetter = !heard.empty() && (signal == nullptr || heard.front().rscp > signal->rscp + kUmtsCellMargin);
   if (betterCell_.hasHeld(isBetter, now.nowMs)) camp(*heard.front().cell, now);
 }
 
 /// Registers or moves data on a dedicated channel, then on the common ones, then lets go.
-void UmtsMode::stepConnection(const Surroundings& now) {
+void UmtsMode::stepConnection(const StepContext& now) {
   switch (state_) {
     case State::KWCDMA_RRC_CONN_STATE_ESTABLISH:
       changeState(State::KWCDMA_RRC_CONN_STATE_CELL_DCH, now);
@@ -88,7 +88,7 @@ void UmtsMode::stepConnection(const Surroundings& now) {
   }
 }
 
-void UmtsMode::changeState(State state, const Surroundings& now, std::optional<Establishment> establishment,
+void UmtsMode::changeState(State state, const StepContext& now, std::optional<Establishment> establishment,
                            std::optional<Release> release) {
   const bool wasConnected = isConnected();
   state_ = state;
@@ -103,7 +103,7 @@ void UmtsMode::changeState(State state, const Surroundings& now, std::optional<E
   }
 }
 
-void UmtsMode::camp(const UmtsCell& cell, const Surroundings& now) {
+void UmtsMode::camp(const UmtsCell& cell, const StepContext& now) {
   serving_ = &cell;
   betterCell_.reset();
   auto info = makeUmtsCellInfo(cell);
@@ -112,7 +112,7 @@ void UmtsMode::camp(const UmtsCell& cell, const Surroundings& now) {
   now.outbox.tell(selection);
 }
 
-void UmtsMode::report(const Surroundings& now, const UmtsSignal& signal) {
+void UmtsMode::report(const StepContext& now, const UmtsSignal& signal) {
   if (servingReport_.isDue(now.nowMs)) {
     auto serving = makeUmtsServing(signal, isConnected());
     now.outbox.tell(serving);

@@ -12,24 +12,24 @@ namespace vesk::handset {
 /// usable, or on to GSM where UMTS ends too.
 class UmtsMode final : public Mode {
  public:
-  void enter(const Surroundings& now, bool isHandover) override;
-  [[nodiscard]] std::optional<Departure> step(const Surroundings& now) override;
+  void enter(const StepContext& now, bool isHandover) override;
+  [[nodiscard]] std::optional<Departure> step(const StepContext& now) override;
 
  private:
   using State = metrics::WcdmaRrcConnState;
   using Establishment = metrics::RrcEstablishmentCause;
   using Release = metrics::RrcReleaseCause;
 
-  void changeState(State state, const Surroundings& now, std::optional<Establishment> establishment = std::nullopt,
+  void changeState(State state, const StepContext& now, std::optional<Establishment> establishment = std::nullopt,
                    std::optional<Release> release = std::nullopt);
-  void camp(const UmtsCell& cell, const Surroundings& now);
+  void camp(const UmtsCell& cell, const StepContext& now);
   [[nodiscard]] bool isConnected() const;
   [[nodiscard]] Area area() const { return {false, serving_->locationAreaCode}; }
 
-  [[nodiscard]] std::optional<Departure> considerLeaving(const Surroundings& now, const UmtsSignal* signal);
-  void considerOtherCells(const Surroundings& now, const UmtsSignal* signal);
-  void stepConnection(const Surroundings& now);
-  void report(const Surroundings& now, const UmtsSignal& signal);
+  [[nodiscard]] std::optional<Departure> considerLeaving(const StepContext& now, const UmtsSignal* signal);
+  void considerOtherCells(const StepContext& now, const UmtsSignal* signal);
+  void stepConnection(const StepContext& now);
+  void report(const StepContext& now, const UmtsSignal& signal);
 
   const UmtsCell* serving_ = nullptr;
   State state_ = State::KWCDMA_RRC_CONN_STATE_INVALID;

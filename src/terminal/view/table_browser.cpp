@@ -232,7 +232,13 @@ std::vector<ListLine> TableBrowser::lines(bool withReadings) {
                        .hasDisclosure = row.accessory == CellAccessory::Disclosure});
     }
   }
-  if (entry > top_.entry) screen_.tableView().keepInView(entries_[top_.entry].at, entries_[entry - 1].at);
+  if (entry > top_.entry) {
+    const IndexPath first = entries_[top_.entry].at;
+    const IndexPath last = entries_[entry - 1].at;
+    screen_.tableView().keepInView(first, last);
+    // What shows is of one moment.
+    if (!isFrozen_ && !content_.keepInView(first, last)) return this->lines();
+  }
   return lines;
 }
 

@@ -30,9 +30,37 @@ void TableContent::fetchAll() {
 }
 
 const RowContent& TableContent::row(IndexPath at) {
-  std::optional<RowContent>& content = rowAt(at).content;
-  if (!content) content = fetch(at);
-  return *content;
+  Row& kept = rowAt(at);
+  if (!kept.content || kept.isOutdated) {
+    kept.content = fetch(at);
+    kept.columnsOfHeight = 0;
+    kept.askedAt = times_;
+    kept.isOutdated = false;
+  }
+  return *kept.content;
+}
+
+bool TableContent::keepInView(IndexPath first, IndexPath last) {
+  std::optional<std::uint64_t> askedAt;
+  bool isOfOneTime = true;
+  for (std::size_t section = 0; section < sections_.size(); ++section) {
+    for (std::size_t row = 0; row < sections_[section].rows.size(); ++row) {
+      const IndexPath at{section, row};
+      Row& kept = rowAt(at);
+      if (at < first || last < at) kept.isOutdated = true;
+      if (kept.isOutdated || !kept.content) continue;
+      if (askedAt && *askedAt != kept.askedAt) isOfOneTime = false;
+      askedAt = kept.askedAt;
+    }
+  }
+  ++times_;
+  if (isOfOneTime) return true;
+  for (Section& section : sections_) {
+    for (Row& row : section.rows)
+      row.isOutdated = true;
+  }
+  table_.letGoOfCells();
+  return false;
 }
 
 int TableContent::height(IndexPath at, int columns) {
@@ -59,9 +87,9 @@ RowContent TableContent::fetch(IndexPath at) {
 }
 
 /// A row is known again by its name. One that was not there counts as changed, one that was there but never
-/// looked at does not.
+/// looked at does not, and neither does a timestamp: it always changes.
 bool TableContent::hasChanged(IndexPath at, const RowContent& content) const {
-  if (!previous_) return false;
+  if (!previous_ || content.main == std::optional("timestamp"_text)) return false;
   if (at.section >= previous_->size()) return true;
   const std::vector<Row>& rows = (*previous_)[at.section].rows;
   const auto hasItsName = [&](const Row& each) { return each.content && each.content->main == content.main; };

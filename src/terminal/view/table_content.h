@@ -14,8 +14,8 @@
 
 namespace vesk {
 
-/// What a table says as of one of its reloads. Rows are asked for when they are first needed and kept until
-/// the content follows a later reload, so that a held content stays as it is while the table goes on.
+/// What a table says as of one of its reloads. Rows are asked for when they are needed and kept while they are in view,
+/// or until the content follows a later reload.
 class TableContent {
  public:
   /// What a row with that name means; empty for nothing more than its value.
@@ -41,6 +41,10 @@ class TableContent {
   int height(IndexPath at, int columns);
   /// The same, or the table's estimate for a row that was not needed yet.
   [[nodiscard]] int likelyHeight(IndexPath at) const { return rowAt(at).height; }
+  /// The rows from `first` to `last`, both included, are in view: others are asked for again when they are next needed.
+  /// False when these were not asked for at one time, and may be of several records: then they are asked for again too.
+  /// Not to be called for a content that is held.
+  [[nodiscard]] bool keepInView(IndexPath first, IndexPath last);
 
  private:
   struct Row {
@@ -48,6 +52,10 @@ class TableContent {
     /// An estimate until the row was laid out.
     int height;
     int columnsOfHeight = 0;
+    /// Which of times_ it was when the content was asked for.
+    std::uint64_t askedAt = 0;
+    /// The content is what it was when the row was last in view.
+    bool isOutdated = false;
   };
   struct Section {
     std::optional<Text> header;
@@ -62,6 +70,8 @@ class TableContent {
   TableView& table_;
   ReadingOf readingOf_;
   std::uint64_t reloadCount_ = 0;
+  /// How often it was said what is in view.
+  std::uint64_t times_ = 0;
   std::vector<Section> sections_;
   /// The sections before the last reload; absent before the second one.
   std::optional<std::vector<Section>> previous_;
