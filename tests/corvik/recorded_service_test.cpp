@@ -176,6 +176,7 @@ TEST_F(RecordedServiceTest, ShortensPausesOfMoreThanAMinuteUnlessTheyAreKept) {
     while (!isEnded_)
       loop_.run();
     isEnded_ = false;
+    manager_.reset();
   }
 }
 
