@@ -17,6 +17,7 @@
 #include "app/decode_command.h"
 #include "app/readings_command.h"
 #include "app/redact_command.h"
+#include "app/report_command.h"
 #include "app/run_command.h"
 #include "app/series_command.h"
 #include "app/show_command.h"
@@ -97,6 +98,7 @@ class CommandLine {
     addTimeline();
     addSeries();
     addReadings();
+    addReport();
     addRedact();
     addSimulate();
   }
@@ -226,6 +228,15 @@ class CommandLine {
     readings->final_callback([this] { command_ = [this] { return runReadings(input_, asJson_); }; });
   }
 
+  void addReport() {
+    CLI::App* report = program_.add_subcommand("report", "Write what a drive was as one HTML page");
+    addRecording(*report, report_.input);
+    report->add_option("-o,--output", report_.output, "The file to write; standard output without it")->type_name("OUT");
+    addLogOption(*report, kDataLog);
+    report->footer(kReportExamples);
+    report->final_callback([this] { command_ = [this] { return runReport(report_); }; });
+  }
+
   void addRedact() {
     CLI::App* redact = program_.add_subcommand("redact", "Print a recording without the subscriber's identities");
     addFile(*redact, input_, "The recording; - or nothing for standard input");
@@ -342,6 +353,7 @@ class CommandLine {
   SimulateOptions simulate_;
   RecordingInput input_;
   TimelineOptions timeline_;
+  ReportOptions report_;
   bool asJson_ = false;
   bool asCsv_ = false;
   std::optional<std::string> logTo_;

@@ -1,0 +1,3 @@
+'use strict';
+
+// The live page: the same parts, told by the program what is new.
