@@ -78,10 +78,9 @@ Corpus::Corpus(std::span<const Event> events) {
 
 Corpus mixedCorpus(std::size_t count) {
   const Pool pool = drivePool();
-  constexpr std::size_t kHandledKinds = 29;
-  if (pool.kindCount() != kHandledKinds) {
+  if (pool.kindCount() != kHandledMetricCount) {
     stop("the simulated drives have " + std::to_string(pool.kindCount()) + " kinds of metric, not all " +
-         std::to_string(kHandledKinds));
+         std::to_string(kHandledMetricCount));
   }
   std::mt19937 random(1);
   std::vector<Event> events;

@@ -1,6 +1,5 @@
 #include "bench/kinds.h"
 
-#include <algorithm>
 #include <array>
 
 #include "bench/libprotobuf_operations.h"
@@ -8,6 +7,7 @@
 #include "gsm/gsm.pb.h"
 #include "lte/lte.pb.h"
 #include "messages/registry/metric_of_message.h"
+#include "messages/registry/metric_rows.h"
 #include "nas/nas.pb.h"
 #include "visits.h"
 #include "wcdma/wcdma.pb.h"
@@ -28,54 +28,16 @@ constexpr Kind kind() {
 }
 
 // Each side calls the message by the same name, in its own namespace.
-#define KIND(Message) kind<vesk::metrics::Message, ::metrics::Message, visits::visit##Message>()
-
-/// In the order of their identifiers.
-constexpr std::array kKinds{
-    KIND(KCellularSimCardFiles),
-    KIND(KCellularGsmScellInfo),
-    KIND(KCellularWcdmaCellInfo),
-    KIND(KCellularLteScellInfo),
-    KIND(KCellularLteRrcState),
-    KIND(KCellularLteCdrxConfig),
-    KIND(KCellularLteRsrpRsrqSinr),
-    KIND(KCellularGsmIdleConfig),
-    KIND(KCellularGsmIdleScellMeasurement),
-    KIND(KCellularGsmCsRfMeasurement),
-    KIND(KCellularGsmGrrEventMeasCr),
-    KIND(KCellularGsmGprsConfig),
-    KIND(KCellularWcdmaScellMeasurement),
-    KIND(KCellularWcdmaTxPower),
-    KIND(KCellularWcdmaSelReselCellInfo),
-    KIND(KCellularWcdmaNbrCellMeas),
-    KIND(KCellularWcdmaRrcConnectionState),
-    KIND(KCellularWcdmaRrcConfiguration),
-    KIND(KCellularLteServingCellMeasurement),
-    KIND(KCellularLteTxPower),
-    KIND(KCellularLteComponentCarrierInfo),
-    KIND(KCellularLteSelReselCellInfo),
-    KIND(KCellularLteNbrEutraCellMeas),
-    KIND(KCellularLteNbrInterRatCellMeas),
-    KIND(KCellularLteCarrierAggregationStatus),
-    KIND(KCellularMmCommonInfo),
-    KIND(KCellularMmContext),
-    KIND(KCellularGmmContext),
-    KIND(KCellularEmmContext),
-    KIND(KCellularActivatedBearerContexts),
-};
-#undef KIND
-
-constexpr bool isBefore(const Kind& a, const Kind& b) {
-  return a.metricId < b.metricId;
-}
-static_assert(std::is_sorted(kKinds.begin(), kKinds.end(), isBefore));
+constexpr MetricRows kKinds(std::array{
+#define DECODED_METRIC(constant, identifier, Message, record) \
+  kind<vesk::metrics::Message, ::metrics::Message, visits::visit##Message>(),
+#include "messages/registry/metrics.def"
+});
 
 }  // namespace
 
 const Kind* findKind(std::int64_t metricId) {
-  const auto* found = std::lower_bound(kKinds.begin(), kKinds.end(), metricId,
-                                       [](const Kind& each, std::int64_t id) { return each.metricId < id; });
-  return found != kKinds.end() && found->metricId == metricId ? found : nullptr;
+  return kKinds.find(metricId);
 }
 
 }  // namespace vesk::bench

@@ -5,7 +5,10 @@
 #include <memory>
 #include <string>
 
+#include "insight/insight.h"
+#include "intake/metric_validator.h"
 #include "messages/codec/proto_writer.h"
+#include "system/output_lines.h"
 
 namespace vesk::bench {
 
@@ -80,6 +83,20 @@ Row writingLibprotobufs(const Corpus& corpus) {
           }};
 }
 
+/// An event as the link hands it on goes into the stores, and `insight`, unless null, learns what it means.
+Row takingIn(std::string name, const Corpus& corpus, std::shared_ptr<insight::Insight> insight) {
+  OutputLines::setSink(nullptr);
+  const auto intake = MetricValidator::listeningTo(nullptr);
+  auto events = std::make_shared<std::vector<Dictionary>>();
+  for (const Event& event : corpus.events())
+    events->push_back({{"kKeyMetricID"_text, event.kind->metricId}, {"kKeyPayload"_text, Data::copy(event.payload)}});
+  if (insight != nullptr) insight->observeEventsOf(*intake);
+  return {std::move(name), [intake, events, insight] {
+            for (const Dictionary& event : *events)
+              benchmark::DoNotOptimize(intake->validateMetric(event));
+          }};
+}
+
 }  // namespace
 
 std::vector<Row> rowsOver(const Corpus& corpus) {
@@ -106,6 +123,8 @@ std::vector<Row> rowsOver(const Corpus& corpus) {
                                                         event.kind->libprotobuf.readIntoJsonByUtility(event.payload,
                                                                                                       json);
                                                       })},
+      takingIn("intake/vesk", corpus, nullptr),
+      takingIn("intake/vesk-insight", corpus, std::make_shared<insight::Insight>()),
   };
 }
 

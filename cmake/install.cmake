@@ -8,4 +8,4 @@ install(DIRECTORY src/messages/ DESTINATION share/vesk/proto
   PATTERN codec EXCLUDE
   PATTERN registry EXCLUDE)
 install(FILES resources/vesk.1 DESTINATION share/man/man1)
-install(FILES resources/vesk.bash DESTINATION share/bash-completion/completions RENAME vesk)
+install(FILES ${CMAKE_BINARY_DIR}/vesk.bash DESTINATION share/bash-completion/completions RENAME vesk)

@@ -4,7 +4,6 @@
 #include <algorithm>
 #include <cstdlib>
 #include <ctime>
-#include <variant>
 #include <vector>
 
 #include "app/connected_program.h"
@@ -26,62 +25,9 @@ using Payload = std::span<const std::uint8_t>;
 
 /// Those that are handled, those that are known, and some that are neither.
 constexpr std::int64_t kMetrics[] = {
-    K_LTE_CDRX_CONFIG,
-    K_LTE_RRC_STATE,
-    K_LTE_SCELL_INFO,
-    K_LTE_RLF,
-    K_LTE_SEL_RESEL_INFO,
-    K_LTE_SCELL_MEAS,
-    K_LTE_TX_POWER,
-    K_LTE_RSRP_RSRQ_SINR,
-    K_LTE_COMPCARR_INFO,
-    K_LTE_CA_STATUS,
-    K_LTE_INTERRAT_MEAS,
-    K_LTE_INTRARAT_MEAS,
-    K_CELLULAR_MM_INFO,
-    K_CELLULAR_MM_CTXT,
-    K_LTE_EMM_CTXT,
-    K_CELLULAR_ACTIVE_BEARER,
-    K_CELLULAR_GMM_CTXT,
-    K_UMTS_RRC_STATE,
-    K_UMTS_RRC_CONFIG,
-    K_UMTS_SCELL_INFO,
-    K_UMTS_SCELL_MEAS,
-    K_UMTS_TX_POWER,
-    K_UMTS_NCELL_MEAS,
-    K_UMTS_SEL_RESEL_INFO,
-    K_GSM_SCELL_INFO,
-    K_GSM_IDLE_CONFIG,
-    K_GSM_CS_RF_MEAS,
-    K_GSM_IDLE_SCELL_MEAS,
-    K_GSM_NCELL_MEAS,
-    K_GSM_GPRS_CONFIG,
-    K_SIM_FILE_INFO,
-    K_LTE_RRC_STATE + 1,
-    K_LTE_RRC_STATE >> 16,
-    K_LTE_RRC_STATE << 8,
-    0,
-    -1,
-};
-
-/// Everything that an event may change.
-struct Stores {
-  using Field = std::variant<Record, RecordList, Value>;
-
-  std::vector<MetricValidator::LatestRecord> latest;
-  std::vector<Field> fields;
-
-  explicit Stores(const MetricValidator& intake) {
-    for (const auto& [name, record] : kLatestRecords)
-      latest.push_back(intake.*record);
-    const auto add = [this](std::string_view, const auto& field) { fields.emplace_back(field); };
-    visitFields(intake.myLTE, add);
-    visitFields(intake.myUMTS, add);
-    visitFields(intake.myGSM, add);
-    visitFields(intake.myCommon, add);
-  }
-
-  friend bool operator==(const Stores&, const Stores&) = default;
+#define KNOWN_METRIC(constant, identifier, label) constant,
+#include "messages/registry/metrics.def"
+    K_LTE_RRC_STATE + 1, K_LTE_RRC_STATE >> 16, K_LTE_RRC_STATE << 8, 0, -1,
 };
 
 bool haveSameKeys(const Dictionary& a, const Dictionary& b) {
@@ -94,7 +40,7 @@ void checkEvent(ConnectedProgram& program, std::int64_t metricId, Payload payloa
   std::optional<Dictionary> fields;
   if (metric != nullptr) fields = modelledDictionary(findMetricClass(metricId)->name, payload);
 
-  const Stores before(*program.intake);
+  const Stores before = program.intake->stores;
   std::vector<std::int64_t> arrived;
   program.intake->setArrivalObserver([&](std::int64_t id) { arrived.push_back(id); });
   program.raise(metricId, payload);
@@ -103,18 +49,20 @@ void checkEvent(ConnectedProgram& program, std::int64_t metricId, Payload payloa
 
   if (!fields) {
     require(arrived.empty(), "no payload arrives that is not decodable");
-    require(Stores(*program.intake) == before, "an event that is not taken leaves every store as it was");
+    require(program.intake->stores == before, "an event that is not taken leaves every store as it was");
     return;
   }
   require(arrived == std::vector{metricId}, "a decodable payload arrives");
-  for (std::size_t index = 0; index < kLatestRecords.size(); ++index) {
-    const auto& record = (*program.intake).*kLatestRecords[index].second;
-    if (kLatestRecords[index].second == metric->record) {
-      require(record.has_value() && haveSameKeys(*record, *fields), "the latest record has the fields of its payload");
-    } else {
-      require(record == before.latest[index], "an event leaves the records of other metrics as they were");
-    }
-  }
+  const Stores& after = program.intake->stores;
+  const LatestRecord& record = after.*metric->record;
+  require(record.has_value() && haveSameKeys(*record, *fields), "the latest record has the fields of its payload");
+  Stores expected = before;
+  expected.*metric->record = record;
+  expected.myLTE = after.myLTE;
+  expected.myUMTS = after.myUMTS;
+  expected.myGSM = after.myGSM;
+  expected.myCommon = after.myCommon;
+  require(after == expected, "an event leaves the records of other metrics as they were");
 }
 
 void checkScreen(NavigationController& root, std::size_t area, std::size_t category, Size size) {
@@ -132,11 +80,11 @@ void checkScreen(NavigationController& root, std::size_t area, std::size_t categ
   requireDrawable(desk.grid(), size);
 }
 
-void checkRecordsAsJson(const MetricValidator& intake) {
+void checkRecordsAsJson(const Stores& stores) {
   std::string json;
-  for (const auto& [name, record] : kLatestRecords) {
-    if (intake.*record) appendJson(json, *(intake.*record));
-  }
+  visitLatestRecords(stores, [&](std::string_view, const LatestRecord& record) {
+    if (record) appendJson(json, *record);
+  });
   requireHarmless(json);
 }
 
@@ -153,7 +101,7 @@ void checkRoad(Payload events, std::size_t screen, Size size) {
     checkScreen(root, screen % 4, screen / 4, size);
   });
   require(status == 0, "the program ends well");
-  checkRecordsAsJson(*program.intake);
+  checkRecordsAsJson(program.intake->stores);
   for (const std::string& line : output.lines())
     requireHarmless(line);
 }

@@ -1,59 +1,22 @@
 # Completion of vesk's command line for bash.
 
+# The menu, filled in by the build: a line for each category, with its area before it and a tab between.
+_vesk_menu='@menu@'
+
+_vesk_areas() {
+  local area rest previous=''
+  while IFS=$'\t' read -r area rest; do
+    [[ $area == "$previous" ]] || printf '%s\n' "$area"
+    previous=$area
+  done <<<"$_vesk_menu"
+}
+
 # The categories of an area, one a line.
 _vesk_categories() {
-  case $1 in
-    'Device Info')
-      printf '%s\n' 'IMSI' \
-        'IMEISV' \
-        'SIM Files'
-      ;;
-    LTE)
-      printf '%s\n' 'NAS' \
-        'RRC State' \
-        'Serving Cell Info' \
-        'Serving Cell Meas' \
-        'Tx Power' \
-        'Sel Resel Parameters' \
-        'EUTRA Neighbor Info' \
-        'C-DRX' \
-        'LTE Neighbor Cell Meas' \
-        'UMTS Neighbor Cell Meas' \
-        'GSM Neighbor Cell Meas' \
-        'CA Status' \
-        'Active Bearers'
-      ;;
-    UMTS)
-      printf '%s\n' 'NAS GMM' \
-        'NAS MM' \
-        'RRC State' \
-        'RRC Configuration' \
-        'Serving Cell Info' \
-        'Serving Cell Meas' \
-        'Tx Power' \
-        'Sel Resel Parameters' \
-        'EUTRA Neighbor Info' \
-        'UTRA Neighbor Info' \
-        'GSM Neighbor Info' \
-        'LTE Neighbor Cell Meas' \
-        'UMTS Neighbor Cell Meas' \
-        'GSM Neighbor Cell Meas' \
-        'Active Bearers'
-      ;;
-    GSM)
-      printf '%s\n' 'NAS GMM' \
-        'NAS MM' \
-        'Serving Cell Info' \
-        'Idle Config' \
-        'Idle Serv Cell Meas' \
-        'Connected Serv Cell Meas' \
-        'GSM GPRS Config' \
-        'LTE Neighbor Cell Meas' \
-        'UMTS Neighbor Cell Meas' \
-        'GSM Neighbor Cell Meas' \
-        'Active Bearers'
-      ;;
-  esac
+  local area category
+  while IFS=$'\t' read -r area category; do
+    [[ $area != "$1" ]] || printf '%s\n' "$category"
+  done <<<"$_vesk_menu"
 }
 
 # Offers the lines of standard input that go on from the word at the cursor, quoted as the shell needs them.
@@ -117,7 +80,7 @@ _vesk() {
   elif [[ -z $command ]]; then
     mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series simulate' -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
-    _vesk_offer < <(printf '%s\n' 'Device Info' LTE UMTS GSM)
+    _vesk_offer < <(_vesk_areas)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then
     _vesk_offer < <(_vesk_categories "${arguments[0]}")
   elif [[ $command != simulate ]]; then

@@ -12,19 +12,23 @@ is_configured() {
 }
 
 configure() {
-  local preset=$1 tests=$2
-  (cd "$root" && quietly cmake --fresh --preset "$preset" -DVESK_TESTS="$tests") ||
+  local preset=$1 tests=$2 options=("-DVESK_TESTS=$2")
+  # Who only runs the program is served soonest by unity builds, who works on it by builds of single sources.
+  [[ $preset != release || $tests == ON ]] || options+=(-DVESK_UNITY=ON)
+  say "configuring the build (preset $preset)"
+  (cd "$root" && quietly cmake --fresh --preset "$preset" "${options[@]}") ||
     die "the build could not be configured (preset $preset); CMake's messages stand above"
   printf '%s %s\n' "$tests" "$root" >"$root/build/$preset/.configured"
 }
 
-# ninja_in PRESET TARGET…: silent when there is nothing to do; one line that moves on a terminal.
+# ninja_in PRESET TARGET…: silent when there is nothing to do.
 ninja_in() {
   local preset=$1 options=(-C "$root/build/$1")
   shift
   [[ $(ninja "${options[@]}" -n "$@" 2>&1) != *'no work to do'* ]] || return 0
-  [[ -t 1 ]] || options+=(--quiet)
-  ninja "${options[@]}" "$@" || die "the build failed (preset $preset); the compiler's messages stand above"
+  NINJA_STATUS='[%p] ' ninja "${options[@]}" "$@" |
+    sed -u -e 's/^\[ *\([0-9]*\)%\] .*/compiling \1/; t' -e '/^ninja: Entering/d; /^-- /d; w /dev/stderr' -e d |
+    show_progress || die "the build failed (preset $preset); the compiler's messages stand above"
 }
 
 # build PRESET TESTS [TARGET…]: builds the targets (all without any) with TESTS ON or OFF. Reads nothing; all its

@@ -21,6 +21,21 @@ quietly() {
   fi
 }
 
+# show_progress: reads lines "WHAT PERCENT" and tells standard error how far it is, on a terminal in a line that moves,
+# elsewhere at every quarter.
+show_progress() {
+  local what percent told='' quarter=-1
+  while read -r what percent; do
+    if [[ -t 2 ]]; then
+      printf '\r%s: %s %d %%\e[K' "${0##*/}" "$what" "$percent" >&2
+    elif [[ $what != "$told" ]] || ((percent / 25 > quarter)); then
+      say "$what $percent %"
+    fi
+    told=$what quarter=$((percent / 25))
+  done
+  [[ ! -t 2 || -z $told ]] || printf '\r\e[K' >&2
+}
+
 # in_checkout SUBCOMMAND…: git, also where the checkout belongs to another user than the one who runs the script.
 in_checkout() {
   git -C "$root" -c safe.directory="$root" "$@"

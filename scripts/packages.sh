@@ -11,22 +11,21 @@ build     g++                 g++
 build     rapidjson-dev       /usr/include/rapidjson/reader.h
 build     libcli11-dev        /usr/include/CLI/CLI.hpp
 build     libncurses-dev      /usr/include/ncursesw/curses.h
+build     protobuf-compiler   protoc
+build     libprotobuf-dev     /usr/include/google/protobuf/message.h
+build     libprotoc-dev       /usr/include/google/protobuf/compiler/plugin.h
 test      libgtest-dev        /usr/include/gtest/gtest.h
-test      protobuf-compiler   protoc
-test      libprotobuf-dev     /usr/include/google/protobuf/message.h
 bench     libbenchmark-dev    /usr/include/benchmark/benchmark.h
-bench     libprotobuf-dev     /usr/include/google/protobuf/message.h
-bench     protobuf-compiler   protoc
 bench     libprotozero-dev    /usr/include/protozero/pbf_reader.hpp
 bench     valgrind            valgrind
 clang     clang               clang++
-fuzz      libclang-rt-14-dev  /usr/lib/llvm-14/lib/clang/14.0.6/include/fuzzer/FuzzedDataProvider.h
+clang     libclang-rt-14-dev  /usr/lib/llvm-14/lib/clang/14.0.6/include/fuzzer/FuzzedDataProvider.h
 format    clang-format        clang-format
-tidy      clang-tidy          clang-tidy
-schema    protobuf-compiler   protoc
-manual    groff               groff
+clang     clang-tidy          clang-tidy
+readme    groff               groff
 readme    jq                  jq
 readme    bsdutils            script
+readme    protobuf-compiler   protoc
 load      time                /usr/bin/time
 load      diffutils           cmp
 shell     shellcheck          shellcheck
@@ -61,15 +60,23 @@ as_root() {
   fi
 }
 
+# apt_get WHAT ARGUMENT…: shows how far it is; its other output only when it fails.
+apt_get() {
+  local what=$1 log=$root/build/apt.log
+  shift
+  as_root env DEBIAN_FRONTEND=noninteractive apt-get --yes -qq -o APT::Status-Fd=1 -o DPkg::Lock::Timeout=600 "$@" 2>&1 |
+    tee "$log" | sed -nu "s/^dlstatus:[^:]*:\([0-9]*\).*/fetching \1/p; s/^pmstatus:[^:]*:\([0-9]*\).*/$what \1/p" |
+    show_progress || { grep -vE '^(dl|pm)status:' "$log" >&2 && return 1; }
+}
+
 install_packages() {
-  local install=(apt-get install --yes -qq --no-install-recommends)
   command -v apt-get >/dev/null || die "these Debian packages are missing, and there is no apt-get: $*"
   ((EUID == 0)) || command -v sudo >/dev/null ||
     die "these Debian packages are missing; without sudo, root must install them: apt-get install $*"
   say "installing Debian packages: $*"
   # A mirror out of reach is no fault while the lists at hand suffice.
-  quietly as_root apt-get update -qq || say "apt-get update failed; going on with the lists at hand"
-  quietly as_root env DEBIAN_FRONTEND=noninteractive "${install[@]}" -o DPkg::Lock::Timeout=600 "$@" ||
+  apt_get updating update || say "apt-get update failed; going on with the lists at hand"
+  apt_get installing install --no-install-recommends "$@" ||
     die "the packages could not be installed: $*"
 }
 

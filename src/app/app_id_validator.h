@@ -2,7 +2,6 @@
 
 #include <cstdint>
 #include <optional>
-#include <string_view>
 
 #include "values/value.h"
 
@@ -11,7 +10,7 @@ namespace vesk {
 /// Tells whether an event is meant for this application.
 class AppIDValidator {
  public:
-  /// True when the dictionary has this application's identifier, as an integer, under "kKeyAppID".
+  /// True when the dictionary has this application's identifier, as an integer, under corvik::kKeyAppID.
   bool isForThisApplication(const Dictionary& event);
 
   /// The identifier that was found last; absent when there was none.
@@ -19,7 +18,6 @@ class AppIDValidator {
 
  private:
   static constexpr std::int64_t myAppID = 2;
-  static constexpr std::string_view appIDKey = "kKeyAppID";
 
   std::optional<std::int64_t> appID_;
 };

@@ -5,6 +5,7 @@
 #include <cstdio>
 
 #include "handset/handset_service.h"
+#include "recording/recording_reader.h"
 
 namespace vesk {
 
@@ -47,8 +48,8 @@ EventSource makeEventSource(const SourceOptions& options, const Clock& clock, So
     return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
             [] { return ShownState{"simulated"}; }};
   }
-  RecordingReader recording(*options.replay);
-  const std::optional<std::string> failure = recording.failure();
+  auto recording = std::make_unique<RecordingReader>(*options.replay);
+  const std::optional<std::string> failure = recording->failure();
   auto service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));
   service->setEndHandler(std::move(handlers.ended));

@@ -1,7 +1,6 @@
 #include "app/readings_command.h"
 
 #include <algorithm>
-#include <functional>
 #include <optional>
 #include <string>
 #include <utility>
@@ -13,21 +12,11 @@
 #include "intake/metric_validator.h"
 #include "screens/category_sources.h"
 #include "screens/detail_text.h"
-#include "screens/vesk_view_items.h"
 #include "values/visible_text.h"
 
 namespace vesk {
 
 namespace {
-
-/// Calls `visit` for each category of each area, in the order of the menu.
-void visitMenu(const std::function<void(const CategorySource& source, const Text& area, const Text& category)>& visit) {
-  const VeskViewItems& menu = VeskViewItems::shared();
-  for (const Text& area : menu.launchViewItemNames) {
-    for (const Text& category : menu.categoriesOf(area.view()))
-      visit(sourceOf(area.view(), category.view()), area, category);
-  }
-}
 
 void writeSection(JsonWriter& json, std::string_view messageClass, const Record& record) {
   writeJsonArray(json, record, [&](const Dictionary::Entry& entry) {
@@ -44,24 +33,24 @@ void writeSection(JsonWriter& json, std::string_view messageClass, const Record&
   });
 }
 
-std::string readingsJson(const MetricValidator& intake, const insight::Insight& insight) {
+std::string readingsJson(const Stores& stores, const insight::Insight& insight) {
   std::string out;
   JsonWriter json(out);
   JsonObject object(json);
   object.key("screens");
   char separator = '[';
-  visitMenu([&](const CategorySource& source, const Text& area, const Text& category) {
+  for (const CategorySource& source : categorySources()) {
     json.put(std::exchange(separator, ','));
     JsonObject screen(json);
     screen.key("area");
-    json.write(area);
+    json.write(source.area);
     screen.key("category");
-    json.write(category);
+    json.write(source.category);
     screen.key("sections");
-    writeJsonArray(json, shownRecords(source, intake),
+    writeJsonArray(json, shownRecords(source, stores),
                    [&](const Record& record) { writeSection(json, messageClassOf(source), record); });
     screen.end();
-  });
+  }
   json.put(']');
   object.key("heard");
   insight::writeJson(json, insight.cellsHeard());
@@ -120,22 +109,22 @@ std::vector<Columns> heardRows(const std::vector<insight::HeardCell>& cells) {
   return rows;
 }
 
-std::string readingsText(const MetricValidator& intake, const insight::Insight& insight) {
+std::string readingsText(const Stores& stores, const insight::Insight& insight) {
   std::string out;
-  visitMenu([&](const CategorySource& source, const Text& area, const Text& category) {
+  for (const CategorySource& source : categorySources()) {
     bool isFirst = true;
-    for (const Record& record : shownRecords(source, intake)) {
+    for (const Record& record : shownRecords(source, stores)) {
       const std::vector<Columns> rows = readRows(messageClassOf(source), record);
       if (rows.empty()) continue;
       if (std::exchange(isFirst, false)) {
-        out += std::string(area.view()) + " › " + std::string(category.view()) + '\n';
+        out += std::string(source.area) + " › " + std::string(source.category) + '\n';
       } else {
         out += '\n';
       }
       appendTable(out, rows);
     }
     if (!isFirst) out += '\n';
-  });
+  }
   out += "Cells heard\n";
   appendTable(out, heardRows(insight.cellsHeard()));
   out.pop_back();
@@ -148,8 +137,8 @@ Outcome runReadings(const RecordingInput& input, bool asJson) {
   DataOutput output;
   insight::Insight insight;
   return watchDrive(input, insight, output, [&] {
-    const MetricValidator& intake = *MetricValidator::shared();
-    output.writeLine(asJson ? readingsJson(intake, insight) : readingsText(intake, insight));
+    const Stores& stores = MetricValidator::shared()->stores;
+    output.writeLine(asJson ? readingsJson(stores, insight) : readingsText(stores, insight));
   });
 }
 

@@ -10,6 +10,7 @@
 #include "app/root_navigation_controller.h"
 #include "app/vesk_interface.h"
 #include "corvik/recorded_service.h"
+#include "recording/recording_reader.h"
 #include "system/clock.h"
 #include "system/output_lines.h"
 #include "system/run_loop.h"
@@ -44,14 +45,16 @@ Outcome playRecording(const RecordingInput& input, const std::function<void(Navi
   Redaction redaction;
   std::shared_ptr<corvik::RecordedService> service;
   if (input.path) {
-    RecordingReader recording(*input.path);
-    if (recording.failure()) {
-      fail("vesk: " + *recording.failure());
+    auto recording = std::make_unique<RecordingReader>(*input.path);
+    if (recording->failure()) {
+      fail("vesk: " + *recording->failure());
       return outcome;
     }
+    using Runs = corvik::RecordedService::Runs;
     const bool isWatchedPipe = beforePlaying && *input.path == "-";
-    const corvik::Playback playback{.speed = std::nullopt, .isOnMainThread = !isWatchedPipe};
-    service = std::make_shared<corvik::RecordedService>(std::move(recording), clock, playback);
+    service =
+        std::make_shared<corvik::RecordedService>(std::move(recording), clock, corvik::Playback{.speed = std::nullopt},
+                                                  isWatchedPipe ? Runs::onThreadOfItsOwn : Runs::onMainThread);
     service->setBadLineHandler(fail);
     service->setEndHandler([&](const std::optional<std::string>& failure) {
       if (failure) fail("vesk: " + *failure);

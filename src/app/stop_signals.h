@@ -4,8 +4,8 @@
 
 namespace vesk {
 
-/// From here on SIGINT, SIGTERM and SIGHUP stop the main run loop, which must outlive them. What is returned is
-/// signalled for good by the first of them: nobody should be waited for any more.
+/// Makes SIGINT, SIGTERM and SIGHUP stop the main run loop, from now until the process ends: the loop must live as
+/// long. Returns what the first such signal wakes. It stays signalled: whoever waits for a slow reader gives up then.
 const WakeUp& stopMainLoopOnSignals();
 
 }  // namespace vesk

@@ -28,38 +28,38 @@ void writeStore(JsonWriter& json, const Store& store) {
   fields.end();
 }
 
-void writeLatestRecords(JsonWriter& json, const MetricValidator& intake) {
+void writeLatestRecords(JsonWriter& json, const Stores& stores) {
   JsonObject fields(json);
-  for (const auto& [name, member] : kLatestRecords) {
+  visitLatestRecords(stores, [&](std::string_view name, const LatestRecord& record) {
     fields.key(name);
-    if (const auto& record = intake.*member) {
+    if (record) {
       json.write(*record);
     } else {
       json.writeNull();
     }
-  }
+  });
   fields.end();
 }
 
-void writeStores(JsonWriter& json, const MetricValidator& intake) {
+void writeStores(JsonWriter& json, const Stores& stores) {
   JsonObject fields(json);
   fields.key("dictionaries");
-  writeLatestRecords(json, intake);
+  writeLatestRecords(json, stores);
   fields.key("LTE");
-  writeStore(json, intake.myLTE);
+  writeStore(json, stores.myLTE);
   fields.key("UMTS");
-  writeStore(json, intake.myUMTS);
+  writeStore(json, stores.myUMTS);
   fields.key("GSM");
-  writeStore(json, intake.myGSM);
+  writeStore(json, stores.myGSM);
   fields.key("Common");
-  writeStore(json, intake.myCommon);
+  writeStore(json, stores.myCommon);
   fields.end();
 }
 
-std::string storesAsJson(const MetricValidator& intake) {
+std::string storesAsJson(const Stores& stores) {
   std::string out;
   JsonWriter json(out);
-  writeStores(json, intake);
+  writeStores(json, stores);
   json.finish();
   return out;
 }
@@ -68,8 +68,9 @@ std::string storesAsJson(const MetricValidator& intake) {
 
 Outcome runStores(const RecordingInput& input) {
   DataOutput output;
-  const Outcome outcome = playRecording(
-      input, [&](NavigationController& /*root*/) { output.writeLine(storesAsJson(*MetricValidator::shared())); });
+  const Outcome outcome = playRecording(input, [&](NavigationController& /*root*/) {
+    output.writeLine(storesAsJson(MetricValidator::shared()->stores));
+  });
   return output.finish(outcome);
 }
 

@@ -3,13 +3,11 @@
 #include <algorithm>
 #include <numeric>
 
+#include "values/ascii.h"
+
 namespace vesk {
 
 namespace {
-
-char lowered(char c) {
-  return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
-}
 
 /// How many characters must be put in, taken out or replaced to make one text of the other.
 std::size_t distance(std::string_view a, std::string_view b) {
@@ -19,17 +17,12 @@ std::size_t distance(std::string_view a, std::string_view b) {
     std::size_t diagonal = row[0];
     row[0] = i + 1;
     for (std::size_t j = 0; j < b.size(); ++j) {
-      const std::size_t replaced = diagonal + (lowered(a[i]) == lowered(b[j]) ? 0 : 1);
+      const std::size_t replaced = diagonal + (lowerAscii(a[i]) == lowerAscii(b[j]) ? 0 : 1);
       diagonal = row[j + 1];
       row[j + 1] = std::min({replaced, row[j] + 1, diagonal + 1});
     }
   }
   return row.back();
-}
-
-bool holds(std::string_view text, std::string_view part) {
-  return std::search(text.begin(), text.end(), part.begin(), part.end(),
-                     [](char a, char b) { return lowered(a) == lowered(b); }) != text.end();
 }
 
 }  // namespace
@@ -44,7 +37,8 @@ std::string suggestionFor(std::string_view typed, const std::vector<std::string>
   const std::string* nearest = nullptr;
   const std::string* holding = nullptr;
   for (const std::string& candidate : candidates) {
-    if (holding == nullptr && typed.size() >= kShortestPart && holds(candidate, typed)) holding = &candidate;
+    if (holding == nullptr && typed.size() >= kShortestPart && containsIgnoringCase(candidate, typed))
+      holding = &candidate;
     const std::size_t apart = distance(typed, candidate);
     if (apart >= least) continue;
     least = apart;

@@ -11,7 +11,7 @@ Outcome watchDrive(const RecordingInput& input, insight::Insight& insight, DataO
   const auto watch = [&] {
     MetricValidator& intake = *MetricValidator::shared();
     intake.setEventObserver([&](const TakenEvent& event) {
-      insight.observe(event, intake);
+      insight.observe(event, intake.stores);
       if (isPipe) output.flush();
       if (output.hasFailed()) RunLoop::main().stop();
     });

@@ -24,10 +24,12 @@ bool isLarge(const vesk::InterProcessDictionary& message) {
 }  // namespace
 
 Channel::Channel(vesk::WorkQueue& queue)
-    : queue_(queue), handlers_(registered_.emplace_back(std::make_unique<Handlers>()).get()) {}
+    : queue_(queue), handlers_(registered_.emplace_back(std::make_unique<Handlers>()).get()) {
+  deliveries_.suspend();
+}
 
 void Channel::setHandler(const vesk::Text& event, EventHandler handler) {
-  const std::lock_guard lock(mutex_);
+  const std::lock_guard lock(lock_);
   auto handlers = std::make_unique<Handlers>(*handlers_);
   if (event == kEventMetric) {
     handlers->metric = std::move(handler);
@@ -38,15 +40,19 @@ void Channel::setHandler(const vesk::Text& event, EventHandler handler) {
 }
 
 void Channel::setConfigured(bool isConfigured) {
-  const std::lock_guard lock(mutex_);
+  const std::lock_guard lock(lock_);
   isConfigured_ = isConfigured;
   wanted_.notify_all();
 }
 
 void Channel::setEventsOn(bool isOn) {
   {
-    const std::lock_guard lock(mutex_);
-    areEventsOn_ = isOn;
+    const std::lock_guard lock(lock_);
+    if (isOn) {
+      deliveries_.resume();
+    } else {
+      deliveries_.suspend();
+    }
     wanted_.notify_all();
   }
   if (isOn) scheduleDeliveries();
@@ -54,11 +60,11 @@ void Channel::setEventsOn(bool isOn) {
 
 bool Channel::waitUntilWanted(const std::stop_token& stop) {
   if (!isWanted()) {
-    std::unique_lock lock(mutex_);
+    std::unique_lock lock(lock_);
     if (!wanted_.wait(lock, stop, [this] { return isWanted(); })) return false;
   }
   const std::size_t most = isLargeAhead_ && isLargeAhead_.exchange(false) ? kMostWaitingBehindLarge : kMostWaiting;
-  return backlog_.waitUntilFewerThan(most, stop) && vesk::MainQueue::shared().waitUntilFewerThan(most, stop);
+  return deliveries_.waitUntilFewerThan(most, stop) && vesk::MainQueue::shared().waitUntilFewerThan(most, stop);
 }
 
 void Channel::noteSize(const vesk::InterProcessDictionary& message) {
@@ -67,55 +73,32 @@ void Channel::noteSize(const vesk::InterProcessDictionary& message) {
 
 void Channel::raise(const vesk::Text& event, vesk::InterProcessDictionary message) {
   noteSize(message);
-  add(Event{event, std::move(message)});
+  post([this, event, message = std::move(message)] { handle(event, message); });
 }
 
 void Channel::deliver(const vesk::Text& event, vesk::InterProcessDictionary message) {
-  noteSize(message);
   queue_.sync([&] {
-    if (deliverWaiting()) {
+    if (deliveries_.runAll()) {
+      noteSize(message);
       handle(event, message);
     } else {
-      add(Event{event, std::move(message)});
+      raise(event, std::move(message));
     }
   });
 }
 
 void Channel::afterDelivery(vesk::Task task) {
-  add(std::move(task));
+  post([task = std::move(task)]() mutable { vesk::MainQueue::shared().post(std::move(task)); });
 }
 
-void Channel::add(Delivery delivery) {
-  if (backlog_.add(std::move(delivery))) scheduleDeliveries();
+void Channel::post(vesk::Task task) {
+  if (deliveries_.post(std::move(task))) scheduleDeliveries();
 }
 
 void Channel::scheduleDeliveries() {
-  queue_.async([weak = weak_from_this()] {
-    if (const std::shared_ptr<Channel> self = weak.lock()) self->deliverWaiting();
+  queue_.post([weak = weak_from_this()] {
+    if (const std::shared_ptr<Channel> self = weak.lock()) self->deliveries_.runAll();
   });
-}
-
-bool Channel::deliverWaiting() {
-  while (areEventsOn_) {
-    if (!hasBatch()) return true;
-    Delivery& next = batch_[delivered_++];
-    if (auto* task = std::get_if<vesk::Task>(&next)) {
-      vesk::MainQueue::shared().async(std::move(*task));
-    } else {
-      const auto& event = std::get<Event>(next);
-      handle(event.name, event.message);
-    }
-  }
-  return false;
-}
-
-bool Channel::hasBatch() {
-  if (delivered_ < batch_.size()) return true;
-  batch_.clear();
-  delivered_ = 0;
-  if (backlog_.isEmpty()) return false;
-  backlog_.take(batch_);
-  return !batch_.empty();
 }
 
 void Channel::handle(const vesk::Text& event, const vesk::InterProcessDictionary& message) const {

@@ -6,12 +6,11 @@
 #include <memory>
 #include <mutex>
 #include <stop_token>
-#include <variant>
 #include <vector>
 
 #include "corvik/client.h"
 #include "corvik/service.h"
-#include "system/backlog.h"
+#include "system/serial_queue.h"
 #include "system/task.h"
 #include "system/work_queue.h"
 
@@ -33,44 +32,32 @@ class Channel final : public EventStream, public std::enable_shared_from_this<Ch
   [[nodiscard]] bool waitUntilWanted(const std::stop_token& stop) override;
 
  private:
-  struct Event {
-    vesk::Text name;
-    vesk::InterProcessDictionary message;
-  };
-  using Delivery = std::variant<Event, vesk::Task>;
   struct Handlers {
     EventHandler metric;
     EventHandler trigger;
   };
 
-  void add(Delivery delivery);
+  void post(vesk::Task task);
   void scheduleDeliveries();
-  [[nodiscard]] bool isWanted() const { return isConfigured_ && areEventsOn_; }
-
+  [[nodiscard]] bool isWanted() const { return isConfigured_ && !deliveries_.isSuspended(); }
   void noteSize(const vesk::InterProcessDictionary& message);
-
-  /// These run on the client's queue, or in its turn. False when events are off, and some may be left.
-  bool deliverWaiting();
+  /// On the client's queue, or in its turn.
   void handle(const vesk::Text& event, const vesk::InterProcessDictionary& message) const;
-  /// Whether there is something to deliver; takes the next batch once one is done.
-  [[nodiscard]] bool hasBatch();
 
   vesk::WorkQueue& queue_;
 
-  std::atomic<bool> isConfigured_ = false;
-  std::atomic<bool> areEventsOn_ = false;
-  std::mutex mutex_;
+  /// Guards the handlers, and whoever waits until metrics are wanted.
+  std::mutex lock_;
   std::condition_variable_any wanted_;
+  std::atomic<bool> isConfigured_ = false;
   /// The last of them is in force; those before stay, for they may be running.
   std::vector<std::unique_ptr<const Handlers>> registered_;
   std::atomic<const Handlers*> handlers_;
 
   /// Whether a large event was raised since a source last waited until few were ahead.
   std::atomic<bool> isLargeAhead_ = false;
-  vesk::Backlog<Delivery> backlog_;
-  /// What was taken from the backlog, and how much of it is done: left alone while events are off.
-  std::vector<Delivery> batch_;
-  std::size_t delivered_ = 0;
+  /// Runs on the client's queue, or in its turn. Suspended while events are off.
+  vesk::SerialQueue deliveries_;
 };
 
 }  // namespace corvik::client

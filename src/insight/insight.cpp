@@ -3,7 +3,7 @@
 namespace vesk::insight {
 
 void Insight::observeEventsOf(MetricValidator& intake) {
-  intake.setEventObserver([this, &intake](const TakenEvent& event) { observe(event, intake); });
+  intake.setEventObserver([this, &intake](const TakenEvent& event) { observe(event, intake.stores); });
 }
 
 void Insight::startAnew() {
@@ -17,12 +17,12 @@ void Insight::startAnew() {
   happenings_.clear();
 }
 
-void Insight::observe(const TakenEvent& event, const MetricValidator& intake) {
+void Insight::observe(const TakenEvent& event, const Stores& stores) {
   const std::uint64_t number = counts_.all++;
   switch (event.fate) {
     case EventFate::stored:
       ++counts_.stored;
-      take(event, intake, number);
+      take(event, stores, number);
       break;
     case EventFate::undecodable:
       ++counts_.undecodable;
@@ -33,7 +33,7 @@ void Insight::observe(const TakenEvent& event, const MetricValidator& intake) {
   }
 }
 
-void Insight::take(const TakenEvent& event, const MetricValidator& intake, std::uint64_t number) {
+void Insight::take(const TakenEvent& event, const Stores& stores, std::uint64_t number) {
   const std::int64_t before = time();
   const auto passing = clock_.take(event.timestamp);
   if (!passing) {
@@ -51,7 +51,7 @@ void Insight::take(const TakenEvent& event, const MetricValidator& intake, std::
     judge_.forget();
     step.add(EventKind::gap, *passing->gap);
   }
-  const Report& report = reader_.read(*event.metricId, *event.record, intake);
+  const Report& report = reader_.read(*event.metricId, *event.record, stores);
   timeline_.take(report, step);
   heard_.take(report, timeline_, moment.time);
   judge_.judge(timeline_.kpis(), moment, events_);

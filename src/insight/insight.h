@@ -32,8 +32,8 @@ class Insight {
 
   using StepHandler = std::function<void(const Report& report, const std::vector<TimelineEvent>& events)>;
 
-  /// Takes an event that `intake` has just taken; its stores are read.
-  void observe(const TakenEvent& event, const MetricValidator& intake);
+  /// Takes an event that the intake has just taken into `stores`.
+  void observe(const TakenEvent& event, const Stores& stores);
   /// Has `intake` tell it every event, for as long as both live.
   void observeEventsOf(MetricValidator& intake);
 
@@ -68,7 +68,7 @@ class Insight {
   static constexpr std::size_t kMostHappenings = 2000;
 
   [[nodiscard]] std::int64_t time() const { return clock_.now().value_or(0); }
-  void take(const TakenEvent& event, const MetricValidator& intake, std::uint64_t number);
+  void take(const TakenEvent& event, const Stores& stores, std::uint64_t number);
   void keep(const std::vector<TimelineEvent>& events);
 
   DriveClock clock_;

@@ -57,9 +57,9 @@ const NeighborKeys& utraKeys() {
 
 }  // namespace
 
-void readLteMeasurement(Report& report, const Dictionary& record, const MetricValidator& intake) {
-  if (record.find("inst_values"_text) == nullptr || intake.myLTE.RsrpRsrqSinr.size() == 0) return;
-  const Record& sample = intake.myLTE.RsrpRsrqSinr[0];
+void readLteMeasurement(Report& report, const Dictionary& record, const Stores& stores) {
+  if (record.find("inst_values"_text) == nullptr || stores.myLTE.RsrpRsrqSinr.size() == 0) return;
+  const Record& sample = stores.myLTE.RsrpRsrqSinr[0];
   const auto better = [&](const Quantity& quantity, const Text& first, const Text& second) {
     return greater(levelOf(quantity, sample, first), levelOf(quantity, sample, second));
   };
@@ -71,28 +71,28 @@ void readLteMeasurement(Report& report, const Dictionary& record, const MetricVa
   if (level) report.technology = Technology::lte;
 }
 
-void readLteTxPower(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readLteTxPower(Report& report, const Dictionary& record, const Stores& stores) {
   if (record.find("tx_power_info"_text) == nullptr) return;
   const auto strongest = [&](const Text& key) {
-    return greatest(intake.myLTE.TxPower, [&](const Record& each) { return levelOf(kTxPower, each, key); });
+    return greatest(stores.myLTE.TxPower, [&](const Record& each) { return levelOf(kTxPower, each, key); });
   };
   report.kpis.add(Kpi::ltePuschTxPower, strongest("pusch_tx_power"_text));
   report.kpis.add(Kpi::ltePucchTxPower, strongest("pucch_tx_power"_text));
 }
 
-void readUmtsTxPower(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readUmtsTxPower(Report& report, const Dictionary& record, const Stores& stores) {
   if (record.find("tx_power_info"_text) == nullptr) return;
-  report.kpis.add(Kpi::umtsTxPower, greatest(intake.myUMTS.TxPower, [](const Record& each) {
+  report.kpis.add(Kpi::umtsTxPower, greatest(stores.myUMTS.TxPower, [](const Record& each) {
                     return levelOf(kTxPower, each, "pusch_tx_power"_text);
                   }));
 }
 
-void readUmtsMeasurement(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readUmtsMeasurement(Report& report, const Dictionary& record, const Stores& stores) {
   const Value* isConnected = record.find("connected_mode"_text);
   if (isConnected != nullptr && isConnected->boolean() != nullptr) report.isConnectedMode = *isConnected->boolean();
   if (record.find("rx_info"_text) == nullptr) return;
   UmtsChain best;
-  for (const Record& each : intake.myUMTS.rXInfo) {
+  for (const Record& each : stores.myUMTS.rXInfo) {
     const UmtsChain chain = umtsChainOf(each);
     best = {greater(best.rscp, chain.rscp), greater(best.ecNo, chain.ecNo), greater(best.rssi, chain.rssi)};
   }
@@ -102,12 +102,12 @@ void readUmtsMeasurement(Report& report, const Dictionary& record, const MetricV
   if (!report.kpis.empty()) report.technology = Technology::umts;
 }
 
-void readGsmIdleMeasurement(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readGsmIdleMeasurement(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   report.kpis.add(Kpi::gsmRxLev, levelOf(kRxLev, record, "idle_rxlev_dBm"_text));
   if (!report.kpis.empty()) report.technology = Technology::gsm;
 }
 
-void readGsmConnectedMeasurement(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readGsmConnectedMeasurement(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   const Number level = decodedLevel(kRxLev, record.find("cs_rxlev_sub"_text), 1, -110);
   report.kpis.add(Kpi::gsmRxLev, level);
   report.kpis.add(Kpi::gsmRxQual, levelOf(kRxQual, record, "cs_rxqual_sub"_text));
@@ -118,31 +118,31 @@ void readGsmConnectedMeasurement(Report& report, const Dictionary& record, const
                   greatest(*powers->array(), [](const Value& each) { return possibleValue(kTxPower, &each); }));
 }
 
-void readNeighborsOfLte(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readNeighborsOfLte(Report& report, const Dictionary& record, const Stores& stores) {
   if (record.find("meas_nbr_eutra"_text) == nullptr) return;
   static const NeighborKeys kKeys{"nbr_earfcn"_text, "nbr_phys_cell_id"_text, "nbr_rsrp"_text, "nbr_rsrq"_text};
-  readLteNeighbors(report, intake.myLTE.EutraNbrsMeas, kKeys);
+  readLteNeighbors(report, stores.myLTE.EutraNbrsMeas, kKeys);
   report.kpis.add(Kpi::lteNbrRsrp, greatest(report.neighbors, [](const NeighborReport& each) { return each.level; }));
 }
 
-void readOtherNeighborsOfLte(Report& report, const Dictionary& record, const MetricValidator& intake) {
-  if (record.find("meas_nbr_utra"_text) != nullptr) readUmtsNeighbors(report, intake.myLTE.UtraNbrsMeas, utraKeys());
-  if (record.find("meas_nbr_geran"_text) != nullptr) readGsmNeighbors(report, intake.myLTE.GeraNbrsMeas);
+void readOtherNeighborsOfLte(Report& report, const Dictionary& record, const Stores& stores) {
+  if (record.find("meas_nbr_utra"_text) != nullptr) readUmtsNeighbors(report, stores.myLTE.UtraNbrsMeas, utraKeys());
+  if (record.find("meas_nbr_geran"_text) != nullptr) readGsmNeighbors(report, stores.myLTE.GeraNbrsMeas);
 }
 
-void readNeighborsOfUmts(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readNeighborsOfUmts(Report& report, const Dictionary& record, const Stores& stores) {
   static const NeighborKeys kEutraKeys{"earfcn"_text, "phy_cell_id"_text, "rsrp"_text, "rsrq"_text};
-  if (record.find("meas_utra_result"_text) != nullptr) readUmtsNeighbors(report, intake.myUMTS.utraNbrMeas, utraKeys());
-  if (record.find("meas_gsm_result"_text) != nullptr) readGsmNeighbors(report, intake.myUMTS.geraNbrMeas);
-  if (record.find("meas_lte_result"_text) != nullptr) readLteNeighbors(report, intake.myUMTS.eUtraNbrMeas, kEutraKeys);
+  if (record.find("meas_utra_result"_text) != nullptr) readUmtsNeighbors(report, stores.myUMTS.utraNbrMeas, utraKeys());
+  if (record.find("meas_gsm_result"_text) != nullptr) readGsmNeighbors(report, stores.myUMTS.geraNbrMeas);
+  if (record.find("meas_lte_result"_text) != nullptr) readLteNeighbors(report, stores.myUMTS.eUtraNbrMeas, kEutraKeys);
 }
 
-void readNeighborsOfGsm(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readNeighborsOfGsm(Report& report, const Dictionary& record, const Stores& stores) {
   static const NeighborKeys kUtraKeys{"dl_uarfcn"_text, "cpich_sc"_text, "cpich_rscp"_text, "cpich_ecn0"_text};
   static const NeighborKeys kEutraKeys{"earfcn"_text, "physical_cell_id"_text, "rsrp"_text, "rsrq"_text};
-  if (record.find("gsm_ncell_meas"_text) != nullptr) readGsmNeighbors(report, intake.myGSM.geraNbrMeas);
-  if (record.find("umts_ncell_meas"_text) != nullptr) readUmtsNeighbors(report, intake.myGSM.utraNbrMeas, kUtraKeys);
-  if (record.find("lte_ncell_meas"_text) != nullptr) readLteNeighbors(report, intake.myGSM.eUtraNbrMeas, kEutraKeys);
+  if (record.find("gsm_ncell_meas"_text) != nullptr) readGsmNeighbors(report, stores.myGSM.geraNbrMeas);
+  if (record.find("umts_ncell_meas"_text) != nullptr) readUmtsNeighbors(report, stores.myGSM.utraNbrMeas, kUtraKeys);
+  if (record.find("lte_ncell_meas"_text) != nullptr) readLteNeighbors(report, stores.myGSM.eUtraNbrMeas, kEutraKeys);
 }
 
 }  // namespace vesk::insight

@@ -12,7 +12,7 @@ namespace {
 
 struct MetricReading {
   std::int64_t metricId;
-  void (*read)(Report& report, const Dictionary& record, const MetricValidator& intake);
+  void (*read)(Report& report, const Dictionary& record, const Stores& stores);
 };
 
 /// The others say nothing here.
@@ -60,11 +60,11 @@ void clear(Report& report) {
 
 }  // namespace
 
-const Report& ReportReader::read(std::int64_t metricId, const Dictionary& record, const MetricValidator& intake) {
+const Report& ReportReader::read(std::int64_t metricId, const Dictionary& record, const Stores& stores) {
   clear(report_);
   const auto* reading = std::find_if(kReadings.begin(), kReadings.end(),
                                      [metricId](const MetricReading& each) { return each.metricId == metricId; });
-  if (reading != kReadings.end()) reading->read(report_, record, intake);
+  if (reading != kReadings.end()) reading->read(report_, record, stores);
   return report_;
 }
 

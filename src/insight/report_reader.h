@@ -3,7 +3,7 @@
 #include <cstdint>
 
 #include "insight/report.h"
-#include "intake/metric_validator.h"
+#include "intake/stores.h"
 
 namespace vesk::insight {
 
@@ -11,7 +11,7 @@ namespace vesk::insight {
 class ReportReader {
  public:
   /// The report is valid until the next one is read.
-  const Report& read(std::int64_t metricId, const Dictionary& record, const MetricValidator& intake);
+  const Report& read(std::int64_t metricId, const Dictionary& record, const Stores& stores);
 
  private:
   /// One for all events, so that lists keep their storage.

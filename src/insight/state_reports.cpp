@@ -43,7 +43,7 @@ Number bandwidthOf(const Dictionary& record) {
 
 }  // namespace
 
-void readLteServingCell(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readLteServingCell(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   report.technology = Technology::lte;
   report.servingCell = {Technology::lte,
                         {earfcnOf(record, "dl_freq"_text), pciOf(record, "phy_cell_id"_text),
@@ -52,7 +52,7 @@ void readLteServingCell(Report& report, const Dictionary& record, const MetricVa
            integerIn(record, "tracking_area_code"_text, 0, kLastAreaCode));
 }
 
-void readUmtsServingCell(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readUmtsServingCell(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   report.technology = Technology::umts;
   report.servingCell = {Technology::umts,
                         {uarfcnOf(record, "dl_uarfcn"_text), pscOf(record, "psc"_text),
@@ -61,7 +61,7 @@ void readUmtsServingCell(Report& report, const Dictionary& record, const MetricV
            integerIn(record, "lac"_text, 0, kLastAreaCode));
 }
 
-void readGsmServingCell(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readGsmServingCell(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   report.technology = Technology::gsm;
   report.servingCell = {Technology::gsm, {arfcnOf(record), bsicOf(record), anyInteger(record, "cell_id"_text)}};
   readArea(report, Area::location, plmnOf(record, "mcc"_text, "mnc"_text),
@@ -69,7 +69,7 @@ void readGsmServingCell(Report& report, const Dictionary& record, const MetricVa
   if (const auto state = nameIn(record, "state"_text)) report.rrc = {.technology = Technology::gsm, .state = *state};
 }
 
-void readLteRrcState(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readLteRrcState(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   const auto state = nameIn(record, "state"_text);
   if (!state) return;
   if (state == "KLTE_RRC_STATE_ATMPT_CONNECTION"_text || state == "KLTE_RRC_STATE_CONNECTED"_text)
@@ -83,7 +83,7 @@ void readLteRrcState(Report& report, const Dictionary& record, const MetricValid
                 .cause = std::move(cause)};
 }
 
-void readUmtsRrcState(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readUmtsRrcState(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   static const std::array kInUse{
       "KWCDMA_RRC_CONN_STATE_CELL_DCH"_text,  "KWCDMA_RRC_CONN_STATE_CELL_FACH"_text,
       "KWCDMA_RRC_CONN_STATE_CELL_PCH"_text,  "KWCDMA_RRC_CONN_STATE_URA_PCH"_text,
@@ -98,10 +98,10 @@ void readUmtsRrcState(Report& report, const Dictionary& record, const MetricVali
                 .cause = nameIn(record, isIdle ? "release_cause"_text : "establishment_cause"_text)};
 }
 
-void readCarriers(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readCarriers(Report& report, const Dictionary& record, const Stores& stores) {
   if (record.find("scc_list"_text) == nullptr) return;
   Number level;
-  for (const Record& each : intake.myLTE.CAStatusList) {
+  for (const Record& each : stores.myLTE.CAStatusList) {
     report.carriers.push_back({.index = anyInteger(each, "index"_text),
                                .state = carrierStateOf(each),
                                .channel = earfcnOf(each, "dl_earfcn"_text),
@@ -115,16 +115,16 @@ void readCarriers(Report& report, const Dictionary& record, const MetricValidato
 }
 
 template <Registration registration>
-void readRegistration(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readRegistration(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   report.registration = {registration, nameIn(record, "reg_status"_text), nameIn(record, "reg_proc"_text),
                          nameIn(record, "reject_cause"_text)};
 }
 
-template void readRegistration<Registration::emm>(Report&, const Dictionary&, const MetricValidator&);
-template void readRegistration<Registration::mm>(Report&, const Dictionary&, const MetricValidator&);
+template void readRegistration<Registration::emm>(Report&, const Dictionary&, const Stores&);
+template void readRegistration<Registration::mm>(Report&, const Dictionary&, const Stores&);
 
-void readGmmContext(Report& report, const Dictionary& record, const MetricValidator& intake) {
-  readRegistration<Registration::gmm>(report, record, intake);
+void readGmmContext(Report& report, const Dictionary& record, const Stores& stores) {
+  readRegistration<Registration::gmm>(report, record, stores);
   const Value* value = record.find("rai"_text);
   const Dictionary* rai = value == nullptr ? nullptr : value->dictionary();
   if (rai == nullptr) return;
@@ -135,20 +135,20 @@ void readGmmContext(Report& report, const Dictionary& record, const MetricValida
     report.area = {Area::routing, *plmn + " " + std::to_string(*lac) + " " + std::to_string(*rac)};
 }
 
-void readBearers(Report& report, const Dictionary& record, const MetricValidator& intake) {
+void readBearers(Report& report, const Dictionary& record, const Stores& stores) {
   if (record.find("bearer_contexts"_text) == nullptr) {
     if (anyInteger(record, "bearer_context_count"_text) == 0) report.bearers.emplace();
     return;
   }
   std::vector<Bearer>& bearers = report.bearers.emplace();
-  for (const Record& each : intake.myCommon.activeBearer) {
+  for (const Record& each : stores.myCommon.activeBearer) {
     Integer number = integerIn(each, "nsapi"_text, kFirstBearer, kLastBearer);
     if (!number) number = anyInteger(each, "cid"_text);
     if (number) bearers.push_back({*number, nameIn(each, "apn"_text), nameIn(each, "pdp_type"_text)});
   }
 }
 
-void readCdrx(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readCdrx(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   if (const auto state = nameIn(record, "rrc_state"_text))
     report.rrc = {.technology = Technology::lte, .state = *state, .isMention = true};
   const Integer status = integerIn(record, "cdrx_config_status"_text, 0, 1);
@@ -158,7 +158,7 @@ void readCdrx(Report& report, const Dictionary& record, const MetricValidator& /
                   integerOf(record, "long_drx_cycle_ms"_text), integerOf(record, "short_drx_cycle_ms"_text)}};
 }
 
-void readSimFiles(Report& report, const Dictionary& record, const MetricValidator& /*intake*/) {
+void readSimFiles(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   const Value* files = record.find("ef_list"_text);
   if (files != nullptr && files->array() != nullptr) report.simFiles = files->array()->size();
 }

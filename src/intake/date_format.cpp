@@ -5,7 +5,6 @@
 #include <cmath>
 #include <cstdlib>
 #include <optional>
-#include <string_view>
 
 namespace vesk {
 
@@ -13,13 +12,12 @@ namespace {
 
 constexpr double kMillisecondsPerSecond = 1000.0;
 constexpr int kSecondsPerMinute = 60;
-constexpr int kLastSecond = 59;
 constexpr int kMinutesPerHour = 60;
-constexpr int kSecondsPerHour = kSecondsPerMinute * kMinutesPerHour;
-constexpr int kSecondsPerDay = 24 * kSecondsPerHour;
+constexpr int kSecondsPerQuarter = 15 * kSecondsPerMinute;
 constexpr int kFirstYear = 1900;
 /// No year within a calendar's int lies beyond this many seconds.
 constexpr double kMostSeconds = 1e17;
+constexpr std::string_view kNoDate = "no date";
 
 void appendPadded(std::string& out, long number, std::size_t width) {
   char digits[20];
@@ -29,20 +27,15 @@ void appendPadded(std::string& out, long number, std::size_t width) {
   out.append(digits, size);
 }
 
-void appendTwoDigits(std::string& out, int number) {
-  out += static_cast<char>('0' + number / 10);
-  out += static_cast<char>('0' + number % 10);
+void writeTwoDigits(char* place, int number) {
+  place[0] = static_cast<char>('0' + number / 10);
+  place[1] = static_cast<char>('0' + number % 10);
 }
 
 std::optional<std::tm> localTime(std::time_t instant) {
   std::tm local{};
   if (localtime_r(&instant, &local) == nullptr) return std::nullopt;
   return local;
-}
-
-/// Of a leap second that of the second before.
-int secondOfDay(const std::tm& local) {
-  return local.tm_hour * kSecondsPerHour + local.tm_min * kSecondsPerMinute + std::min(local.tm_sec, kLastSecond);
 }
 
 /// The year within its era: what "yyyy" asks for.
@@ -76,54 +69,48 @@ DateFormat::DateFormat() {
   tzset();
 }
 
-void DateFormat::append(std::string& out, double milliseconds) {
+std::string_view DateFormat::write(double milliseconds) {
   const double seconds = std::floor(std::floor(milliseconds) / kMillisecondsPerSecond);
-  if (!(std::abs(seconds) < kMostSeconds)) {
-    out += "no date";
-    return;
-  }
+  if (!(std::abs(seconds) < kMostSeconds)) return kNoDate;
   const auto instant = static_cast<std::time_t>(seconds);
   const bool isRemembered = begin_ <= instant && instant < end_;
-  if (!isRemembered && !writeDay(instant)) {
-    out += "no date";
-    return;
-  }
+  if (!isRemembered && !writeHourOf(instant)) return kNoDate;
   const int second = secondOfBegin_ + static_cast<int>(instant - begin_);
-  out += date_;
-  appendTwoDigits(out, second / kSecondsPerHour);
-  out += ':';
-  appendTwoDigits(out, second / kSecondsPerMinute % kMinutesPerHour);
-  out += ':';
-  appendTwoDigits(out, second % kSecondsPerMinute + leap_);
-  out += zone_;
+  writeTwoDigits(&text_[minutesAt_], second / kSecondsPerMinute);
+  writeTwoDigits(&text_[minutesAt_ + 3], second % kSecondsPerMinute);
+  return text_;
 }
 
-bool DateFormat::writeDay(std::time_t instant) {
+bool DateFormat::writeHourOf(std::time_t instant) {
   begin_ = end_ = 0;
   const std::optional<std::tm> local = localTime(instant);
   if (!local) return false;
-  date_.clear();
-  appendPadded(date_, yearOf(*local), 4);
-  date_ += '-';
-  appendTwoDigits(date_, local->tm_mon + 1);
-  date_ += '-';
-  appendTwoDigits(date_, local->tm_mday);
-  date_ += ' ';
-  zone_ = ' ' + zoneName(*local);
+  text_.clear();
+  appendPadded(text_, yearOf(*local), 4);
+  text_ += '-';
+  appendPadded(text_, local->tm_mon + 1, 2);
+  text_ += '-';
+  appendPadded(text_, local->tm_mday, 2);
+  text_ += ' ';
+  appendPadded(text_, local->tm_hour, 2);
+  text_ += ':';
+  minutesAt_ = text_.size();
+  text_ += "mm:ss ";
+  text_ += zoneName(*local);
 
-  const int second = secondOfDay(*local);
-  leap_ = std::max(0, local->tm_sec - kLastSecond);
-  const auto isSoAt = [&](std::time_t other) {
-    const std::optional<std::tm> there = localTime(other);
-    return there && there->tm_gmtoff == local->tm_gmtoff && zoneName(*there) == zoneName(*local) &&
-           secondOfDay(*there) - second == other - instant;
+  // The quarter of the local hour, where no clock is changed within it, and otherwise only this second.
+  secondOfBegin_ = local->tm_min * kSecondsPerMinute + local->tm_sec;
+  begin_ = instant;
+  end_ = instant + 1;
+  const int secondOfQuarter = secondOfBegin_ % kSecondsPerQuarter;
+  const auto isSoAt = [&](int seconds) {
+    const std::optional<std::tm> there = localTime(instant + seconds);
+    return there && there->tm_gmtoff == local->tm_gmtoff && zoneName(*there) == zoneName(*local);
   };
-  // Where the zone's clocks are changed within the day it is the hour that is remembered, or only this second.
-  for (const int stretch : {kSecondsPerDay, kSecondsPerHour, 1}) {
-    secondOfBegin_ = second - second % stretch;
-    begin_ = instant - second % stretch;
-    end_ = begin_ + stretch;
-    if (leap_ == 0 && isSoAt(begin_) && isSoAt(end_ - 1)) break;
+  if (isSoAt(-secondOfQuarter) && isSoAt(kSecondsPerQuarter - 1 - secondOfQuarter)) {
+    secondOfBegin_ -= secondOfQuarter;
+    begin_ -= secondOfQuarter;
+    end_ = begin_ + kSecondsPerQuarter;
   }
   return true;
 }

@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <array>
 
-#include "intake/metric_validator.h"
 #include "intake/value_conversions.h"
 #include "system/output_lines.h"
 #include "values/text_form.h"
@@ -87,6 +86,12 @@ void liftList(const Record& source, const Text& listKey, RecordList& field, std:
   }
 }
 
+/// The same, with the timestamp of the record that the list is of.
+void liftStamped(const StoredMetric& metric, const Text& listKey, RecordList& field,
+                 std::span<const FieldConversion> conversions = {}) {
+  liftList(metric.record, listKey, field, {timestampOf(metric.record)}, conversions);
+}
+
 /// Replaces the value under `key` by its text when it is what `isMeant` asks for; the text, or null.
 template <class IsMeant>
 const Text* replaceByText(Record& record, const Text& key, IsMeant isMeant) {
@@ -136,97 +141,91 @@ void fillTemplate(Record& store, const Record& source) {
 
 }  // namespace
 
-void takeLteServingCell(MetricValidator& intake) {
-  convertFields(*intake.myLTESCellInfoDict, kServingCellConversions);
+void takeLteServingCell(const StoredMetric& metric) {
+  convertFields(metric.record, kServingCellConversions);
 }
 
-void takeLteSelectionParameters(MetricValidator& intake) {
-  Record& source = *intake.myLTESelReselDict;
-  Record& parameters = intake.myLTE.SelReselCellInfo;
-  replaceMultiBandInfo(source);
-  fillTemplate(parameters, source);
-  intake.formatTimestampOf(parameters);
-  liftList(source, "nbr_eutra"_text, intake.myLTE.EutraNbrs, {timestampOf(parameters)}, kBroadcastNeighborConversions);
+void takeLteSelectionParameters(const StoredMetric& metric) {
+  auto& [record, stores, dates] = metric;
+  LTE& lte = stores.myLTE;
+  replaceMultiBandInfo(record);
+  fillTemplate(lte.SelReselCellInfo, record);
+  formatTimestamp(lte.SelReselCellInfo, dates);
+  liftList(record, "nbr_eutra"_text, lte.EutraNbrs, {timestampOf(lte.SelReselCellInfo)}, kBroadcastNeighborConversions);
 }
 
-void takeLteTxPower(MetricValidator& intake) {
-  const Record& source = *intake.myLTETxPowerDict;
-  liftList(source, "tx_power_info"_text, intake.myLTE.TxPower, {timestampOf(source)});
+void takeLteTxPower(const StoredMetric& metric) {
+  liftStamped(metric, "tx_power_info"_text, metric.stores.myLTE.TxPower);
 }
 
-void takeLteRsrpRsrqSinr(MetricValidator& intake) {
-  const Record& source = *intake.myLTERsrpRsrqSinrDict;
+void takeLteRsrpRsrqSinr(const StoredMetric& metric) {
+  auto& [record, stores, dates] = metric;
   Record parent;
-  if (const Value* timestamp = source.find("timestamp"_text)) parent.set("timestamp"_text, *timestamp);
-  intake.formatTimestampOf(parent);
-  liftList(source, "inst_values"_text, intake.myLTE.RsrpRsrqSinr, {timestampOf(parent)}, kSinrConversions);
+  if (const Value* timestamp = record.find("timestamp"_text)) parent.set("timestamp"_text, *timestamp);
+  formatTimestamp(parent, dates);
+  liftList(record, "inst_values"_text, stores.myLTE.RsrpRsrqSinr, {timestampOf(parent)}, kSinrConversions);
 }
 
-void takeLteCarrierAggregation(MetricValidator& intake) {
-  const Record& source = *intake.myLTECAStatusDict;
-  liftList(source, "scc_list"_text, intake.myLTE.CAStatusList, {timestampOf(source)}, kCarrierConversions);
+void takeLteCarrierAggregation(const StoredMetric& metric) {
+  liftStamped(metric, "scc_list"_text, metric.stores.myLTE.CAStatusList, kCarrierConversions);
 }
 
-void takeLteInterRatNeighbors(MetricValidator& intake) {
-  const Record& source = *intake.myLTEInterRatMeasDict;
-  liftList(source, "meas_nbr_utra"_text, intake.myLTE.UtraNbrsMeas, {timestampOf(source)}, kUtraConversions);
-  liftList(source, "meas_nbr_geran"_text, intake.myLTE.GeraNbrsMeas, {timestampOf(source)}, kGeranConversions);
+void takeLteInterRatNeighbors(const StoredMetric& metric) {
+  LTE& lte = metric.stores.myLTE;
+  liftStamped(metric, "meas_nbr_utra"_text, lte.UtraNbrsMeas, kUtraConversions);
+  liftStamped(metric, "meas_nbr_geran"_text, lte.GeraNbrsMeas, kGeranConversions);
 }
 
-void takeLteNeighbors(MetricValidator& intake) {
-  const Record& source = *intake.myLTEIntraRatMeasDict;
-  liftList(source, "meas_nbr_eutra"_text, intake.myLTE.EutraNbrsMeas, {timestampOf(source)}, kLteNeighborConversions);
+void takeLteNeighbors(const StoredMetric& metric) {
+  liftStamped(metric, "meas_nbr_eutra"_text, metric.stores.myLTE.EutraNbrsMeas, kLteNeighborConversions);
 }
 
-void takeActiveBearers(MetricValidator& intake) {
-  const Record& source = *intake.myCellularActiveBearerDict;
-  liftList(source, "bearer_contexts"_text, intake.myCommon.activeBearer, {timestampOf(source)});
+void takeActiveBearers(const StoredMetric& metric) {
+  liftStamped(metric, "bearer_contexts"_text, metric.stores.myCommon.activeBearer);
 }
 
-void takeEmmContext(MetricValidator& intake) {
-  Record& source = *intake.myLTEEMMContextDict;
-  replaceByText(source, "guti"_text, [](const Value& value) { return value.dictionary() != nullptr; });
-  replaceByText(source, "tai_list"_text, [](const Value& value) { return isRecordList(&value); });
+void takeEmmContext(const StoredMetric& metric) {
+  replaceByText(metric.record, "guti"_text, [](const Value& value) { return value.dictionary() != nullptr; });
+  replaceByText(metric.record, "tai_list"_text, [](const Value& value) { return isRecordList(&value); });
 }
 
-void takeUmtsServingCellMeasurement(MetricValidator& intake) {
-  const Record& source = *intake.myUMTSCellMeasDict;
-  liftList(source, "rx_info"_text, intake.myUMTS.rXInfo,
-           {timestampOf(source), {"connected_mode"_text, source.find("connected_mode"_text)}});
+void takeUmtsServingCellMeasurement(const StoredMetric& metric) {
+  const Record& record = metric.record;
+  liftList(record, "rx_info"_text, metric.stores.myUMTS.rXInfo,
+           {timestampOf(record), {"connected_mode"_text, record.find("connected_mode"_text)}});
 }
 
-void takeUmtsTxPower(MetricValidator& intake) {
-  const Record& source = *intake.myUMTSTxPowerDict;
-  liftList(source, "tx_power_info"_text, intake.myUMTS.TxPower, {timestampOf(source)});
+void takeUmtsTxPower(const StoredMetric& metric) {
+  liftStamped(metric, "tx_power_info"_text, metric.stores.myUMTS.TxPower);
 }
 
-void takeUmtsSelectionParameters(MetricValidator& intake) {
-  Record& source = *intake.myUMTSSelReselDict;
-  Record& parameters = intake.myUMTS.SelReselCellInfo;
-  replaceMultiBandInfo(source);
-  fillTemplate(parameters, source);
-  liftList(source, "eutra_prio_info"_text, intake.myUMTS.eUtraNbrs, {timestampOf(parameters)});
-  liftList(source, "utra_prio_info"_text, intake.myUMTS.utraNbrs, {timestampOf(parameters)});
-  liftList(source, "gsm_prio_info"_text, intake.myUMTS.geraNbrs, {timestampOf(parameters)});
+void takeUmtsSelectionParameters(const StoredMetric& metric) {
+  Record& record = metric.record;
+  UMTS& umts = metric.stores.myUMTS;
+  replaceMultiBandInfo(record);
+  fillTemplate(umts.SelReselCellInfo, record);
+  const Stamp timestamp = timestampOf(umts.SelReselCellInfo);
+  liftList(record, "eutra_prio_info"_text, umts.eUtraNbrs, {timestamp});
+  liftList(record, "utra_prio_info"_text, umts.utraNbrs, {timestamp});
+  liftList(record, "gsm_prio_info"_text, umts.geraNbrs, {timestamp});
 }
 
-void takeUmtsNeighbors(MetricValidator& intake) {
-  const Record& source = *intake.myUMTSNbrMeasDict;
-  liftList(source, "meas_utra_result"_text, intake.myUMTS.utraNbrMeas, {timestampOf(source)}, kUtraConversions);
-  liftList(source, "meas_gsm_result"_text, intake.myUMTS.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
-  liftList(source, "meas_lte_result"_text, intake.myUMTS.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
+void takeUmtsNeighbors(const StoredMetric& metric) {
+  UMTS& umts = metric.stores.myUMTS;
+  liftStamped(metric, "meas_utra_result"_text, umts.utraNbrMeas, kUtraConversions);
+  liftStamped(metric, "meas_gsm_result"_text, umts.geraNbrMeas, kGeranConversions);
+  liftStamped(metric, "meas_lte_result"_text, umts.eUtraNbrMeas, kEutraConversions);
 }
 
-void takeGsmNeighbors(MetricValidator& intake) {
-  const Record& source = *intake.myGSMNbrMeasDict;
-  liftList(source, "gsm_ncell_meas"_text, intake.myGSM.geraNbrMeas, {timestampOf(source)}, kGeranConversions);
-  liftList(source, "umts_ncell_meas"_text, intake.myGSM.utraNbrMeas, {timestampOf(source)}, kCpichConversions);
-  liftList(source, "lte_ncell_meas"_text, intake.myGSM.eUtraNbrMeas, {timestampOf(source)}, kEutraConversions);
+void takeGsmNeighbors(const StoredMetric& metric) {
+  GSM& gsm = metric.stores.myGSM;
+  liftStamped(metric, "gsm_ncell_meas"_text, gsm.geraNbrMeas, kGeranConversions);
+  liftStamped(metric, "umts_ncell_meas"_text, gsm.utraNbrMeas, kCpichConversions);
+  liftStamped(metric, "lte_ncell_meas"_text, gsm.eUtraNbrMeas, kEutraConversions);
 }
 
-void takeSimFiles(MetricValidator& intake) {
-  const Record& source = *intake.mySIMFileInfoDict;
-  liftList(source, "ef_list"_text, intake.myCommon.simContents, {timestampOf(source)});
+void takeSimFiles(const StoredMetric& metric) {
+  liftStamped(metric, "ef_list"_text, metric.stores.myCommon.simContents);
 }
 
 }  // namespace vesk

@@ -2,7 +2,9 @@
 
 #include <string>
 
+#include "corvik/constants.h"
 #include "intake/metric_table.h"
+#include "intake/value_conversions.h"
 #include "system/output_lines.h"
 #include "values/text_form.h"
 
@@ -10,8 +12,8 @@ namespace vesk {
 
 namespace {
 
-const Text metricIDKey = "kKeyMetricID"_text;
-const Text payloadKey = "kKeyPayload"_text;
+const Text& metricIDKey = corvik::kKeyMetricID;
+const Text& payloadKey = corvik::kKeyPayload;
 
 /// Of at least two characters, as of an unsigned number.
 std::string hexadecimal(std::int64_t number) {
@@ -31,13 +33,9 @@ void printRecord(std::string_view logText, const Dictionary& record) {
 }
 
 /// The record's timestamp while it is a number; absent when it is none that fits.
-std::optional<std::int64_t> millisecondsOf(const Dictionary& record) {
+std::optional<std::int64_t> millisecondsOf(const Record& record) {
   const Value* timestamp = record.find("timestamp"_text);
   return timestamp == nullptr ? std::nullopt : timestamp->integer();
-}
-
-void printNotHandled() {
-  OutputLines::print({"I dont care for this Metric"});
 }
 
 }  // namespace
@@ -69,58 +67,53 @@ void MetricValidator::eventsDidUpdate(const std::optional<Dictionary>& /*event*/
 }
 
 bool MetricValidator::validateMetric(const Dictionary& event) {
+  const TakenEvent taken = take(event);
+  if (eventObserver_) eventObserver_(taken);
+  if (taken.fate == EventFate::stored) return true;
+  OutputLines::print({"I dont care for this Metric"});
+  return false;
+}
+
+TakenEvent MetricValidator::take(const Dictionary& event) {
   const Value* id = event.find(metricIDKey);
   metricID = id == nullptr ? std::nullopt : id->integer();
   if (metricID && OutputLines::isOpen()) OutputLines::print({"Metric ID in Hex = ", hexadecimal(*metricID)});
 
   const HandledMetric* metric = metricID ? findHandledMetric(*metricID) : nullptr;
-  LatestRecord fields;
-  if (metric != nullptr) fields = metric->decode(payloadOf(event));
-  if (!fields) {
-    printNotHandled();
-    const EventFate fate = metric == nullptr ? EventFate::ignored : EventFate::undecodable;
-    if (eventObserver_) eventObserver_({fate, metricID, std::nullopt, nullptr});
-    return false;
-  }
+  if (metric == nullptr) return {.fate = EventFate::ignored, .metricId = metricID};
+  std::optional<Record> record = metric->decode(payloadOf(event));
+  if (!record) return {.fate = EventFate::undecodable, .metricId = metricID};
+  const auto timestamp = eventObserver_ ? millisecondsOf(*record) : std::nullopt;
+  return {EventFate::stored, metricID, timestamp, &store(*metric, std::move(*record))};
+}
 
-  const auto timestamp = eventObserver_ ? millisecondsOf(*fields) : std::nullopt;
-  LatestRecord& record = this->*metric->record;
-  record = std::move(fields);
+const Record& MetricValidator::store(const HandledMetric& metric, Record newRecord) {
+  Record& record = (stores.*metric.record).emplace(std::move(newRecord));
   const auto runExtraStep = [&] {
-    if (metric->extraStep != nullptr) metric->extraStep(*this);
+    if (metric.extraStep != nullptr) metric.extraStep({record, stores, dates_});
   };
-  switch (metric->order) {
+  switch (metric.order) {
     case StepOrder::timestampLogExtra:
-      formatTimestampOf(*record);
-      printRecord(metric->logText, *record);
+      formatTimestamp(record, dates_);
+      printRecord(metric.logText, record);
       runExtraStep();
       break;
     case StepOrder::timestampExtraLog:
-      formatTimestampOf(*record);
+      formatTimestamp(record, dates_);
       runExtraStep();
-      printRecord(metric->logText, *record);
+      printRecord(metric.logText, record);
       break;
     case StepOrder::logTimestampExtra:
-      printRecord(metric->logText, *record);
-      formatTimestampOf(*record);
+      printRecord(metric.logText, record);
+      formatTimestamp(record, dates_);
       runExtraStep();
       break;
     case StepOrder::logExtra:
-      printRecord(metric->logText, *record);
+      printRecord(metric.logText, record);
       runExtraStep();
       break;
   }
-  if (eventObserver_) eventObserver_({EventFate::stored, metricID, timestamp, &*record});
-  return true;
-}
-
-void MetricValidator::formatTimestampOf(Record& record) {
-  Value* timestamp = record.findForChange("timestamp"_text);
-  const std::optional<double> milliseconds = timestamp == nullptr ? std::nullopt : timestamp->number();
-  if (!milliseconds) return;
-  date_.clear();
-  dateFormat_.append(date_, *milliseconds);
-  *timestamp = Text::copy(date_);
+  return record;
 }
 
 }  // namespace vesk

@@ -1,20 +1,19 @@
 #pragma once
 
-#include <array>
 #include <cstdint>
 #include <functional>
 #include <memory>
 #include <optional>
-#include <string_view>
-#include <utility>
 
 #include "intake/date_format.h"
-#include "intake/technology_stores.h"
+#include "intake/stores.h"
 #include "link/corvik_wrapper.h"
 #include "messages/registry/metric_identifiers.h"
 #include "values/value.h"
 
 namespace vesk {
+
+struct HandledMetric;
 
 /// What became of a metric event.
 enum class EventFate {
@@ -29,22 +28,18 @@ enum class EventFate {
 struct TakenEvent {
   EventFate fate;
   /// Absent when the event had none.
-  std::optional<std::int64_t> metricId;
+  std::optional<std::int64_t> metricId{};
   /// What the record had under "timestamp" before that became a date: milliseconds since 1970-01-01 00:00:00 UTC.
   /// Absent unless stored, and where the record has none that fits.
-  std::optional<std::int64_t> timestamp;
+  std::optional<std::int64_t> timestamp{};
   /// The latest record of its kind; null unless stored.
-  const Dictionary* record;
+  const Record* record = nullptr;
 };
 
 /// Takes in every metric event: decodes it, keeps it as the latest record of its kind, and fills the technology
-/// stores. The one object of the process is shared(); everything happens on the main queue. Whoever shows the stores
-/// reads them here.
+/// stores. The one object of the process is shared(); everything happens on the main queue.
 class MetricValidator : public CorvikWrapperDelegate {
  public:
-  /// The latest record of a kind of metric; absent until the first one.
-  using LatestRecord = std::optional<Dictionary>;
-
   /// The one of the process. Made on the first call; it then listens to the shared wrapper and is its delegate.
   static const std::shared_ptr<MetricValidator>& shared();
   /// Another one, which listens to `wrapper` (null for none) and becomes its delegate: for tests.
@@ -65,96 +60,25 @@ class MetricValidator : public CorvikWrapperDelegate {
   /// cannot be decoded.
   bool validateMetric(const Dictionary& event);
 
-  /// Turns the record's "timestamp", milliseconds since 1970-01-01 00:00:00 UTC, into a date in words. One that is
-  /// missing or no number stays as it is.
-  void formatTimestampOf(Record& record);
-
   [[nodiscard]] const std::shared_ptr<CorvikWrapper>& sharedCorvikInstance() const { return mySharedCorvikInstance; }
 
   /// The metric identifier of the latest event; absent when it had none.
   std::optional<std::int64_t> metricID;
 
-  LTE myLTE;
-  UMTS myUMTS;
-  GSM myGSM;
-  Common myCommon;
-
-  LatestRecord myLTERRCStateDict;
-  LatestRecord myLTECDRXConfigDict;
-  LatestRecord myLTESCellInfoDict;
-  /// Stays absent: its metric is not handled.
-  LatestRecord myLTESCellMeasDict;
-  LatestRecord myLTESelReselDict;
-  LatestRecord myLTERsrpRsrqSinrDict;
-  LatestRecord myLTECompCarrDict;
-  LatestRecord myLTETxPowerDict;
-  LatestRecord myLTEInterRatMeasDict;
-  LatestRecord myLTEIntraRatMeasDict;
-  LatestRecord myLTECAStatusDict;
-  LatestRecord myLTEEMMContextDict;
-  LatestRecord myCellularMMCommonInfoDict;
-  LatestRecord myCellularActiveBearerDict;
-  LatestRecord myGMMContextDict;
-  LatestRecord myMMContextDict;
-  LatestRecord myUMTSRRCStateDict;
-  LatestRecord myUMTSRRCConfigDict;
-  LatestRecord myUMTSCellInfoDict;
-  LatestRecord myUMTSCellMeasDict;
-  LatestRecord myUMTSTxPowerDict;
-  LatestRecord myUMTSSelReselDict;
-  LatestRecord myUMTSNbrMeasDict;
-  LatestRecord myGSMScellInfoDict;
-  LatestRecord myGSMIdleConfigInfoDict;
-  LatestRecord myGSMIdleScellMeasDict;
-  LatestRecord myGSMConnRfMeasDict;
-  LatestRecord myGSMNbrMeasDict;
-  LatestRecord myGSMGPRSConfigDict;
-  LatestRecord mySIMFileInfoDict;
+  /// What the events so far have left behind; whoever shows it reads it here.
+  Stores stores;
 
  private:
   MetricValidator() = default;
 
+  TakenEvent take(const Dictionary& event);
+  /// Keeps the record as the latest of its metric, and takes the metric's steps.
+  const Record& store(const HandledMetric& metric, Record record);
+
   std::shared_ptr<CorvikWrapper> mySharedCorvikInstance;
-  DateFormat dateFormat_;
-  /// The date written last, kept for its storage.
-  std::string date_;
+  DateFormat dates_;
   std::function<void(std::int64_t)> arrivalObserver_;
   std::function<void(const TakenEvent&)> eventObserver_;
 };
-
-/// The names of the latest records and where they are, in the order of their declaration.
-inline constexpr std::array<std::pair<std::string_view, MetricValidator::LatestRecord MetricValidator::*>, 30>
-    kLatestRecords{{
-        {"myLTERRCStateDict", &MetricValidator::myLTERRCStateDict},
-        {"myLTECDRXConfigDict", &MetricValidator::myLTECDRXConfigDict},
-        {"myLTESCellInfoDict", &MetricValidator::myLTESCellInfoDict},
-        {"myLTESCellMeasDict", &MetricValidator::myLTESCellMeasDict},
-        {"myLTESelReselDict", &MetricValidator::myLTESelReselDict},
-        {"myLTERsrpRsrqSinrDict", &MetricValidator::myLTERsrpRsrqSinrDict},
-        {"myLTECompCarrDict", &MetricValidator::myLTECompCarrDict},
-        {"myLTETxPowerDict", &MetricValidator::myLTETxPowerDict},
-        {"myLTEInterRatMeasDict", &MetricValidator::myLTEInterRatMeasDict},
-        {"myLTEIntraRatMeasDict", &MetricValidator::myLTEIntraRatMeasDict},
-        {"myLTECAStatusDict", &MetricValidator::myLTECAStatusDict},
-        {"myLTEEMMContextDict", &MetricValidator::myLTEEMMContextDict},
-        {"myCellularMMCommonInfoDict", &MetricValidator::myCellularMMCommonInfoDict},
-        {"myCellularActiveBearerDict", &MetricValidator::myCellularActiveBearerDict},
-        {"myGMMContextDict", &MetricValidator::myGMMContextDict},
-        {"myMMContextDict", &MetricValidator::myMMContextDict},
-        {"myUMTSRRCStateDict", &MetricValidator::myUMTSRRCStateDict},
-        {"myUMTSRRCConfigDict", &MetricValidator::myUMTSRRCConfigDict},
-        {"myUMTSCellInfoDict", &MetricValidator::myUMTSCellInfoDict},
-        {"myUMTSCellMeasDict", &MetricValidator::myUMTSCellMeasDict},
-        {"myUMTSTxPowerDict", &MetricValidator::myUMTSTxPowerDict},
-        {"myUMTSSelReselDict", &MetricValidator::myUMTSSelReselDict},
-        {"myUMTSNbrMeasDict", &MetricValidator::myUMTSNbrMeasDict},
-        {"myGSMScellInfoDict", &MetricValidator::myGSMScellInfoDict},
-        {"myGSMIdleConfigInfoDict", &MetricValidator::myGSMIdleConfigInfoDict},
-        {"myGSMIdleScellMeasDict", &MetricValidator::myGSMIdleScellMeasDict},
-        {"myGSMConnRfMeasDict", &MetricValidator::myGSMConnRfMeasDict},
-        {"myGSMNbrMeasDict", &MetricValidator::myGSMNbrMeasDict},
-        {"myGSMGPRSConfigDict", &MetricValidator::myGSMGPRSConfigDict},
-        {"mySIMFileInfoDict", &MetricValidator::mySIMFileInfoDict},
-    }};
 
 }  // namespace vesk

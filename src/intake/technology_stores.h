@@ -1,5 +1,8 @@
 #pragma once
 
+#include <concepts>
+#include <type_traits>
+
 #include "values/shared_vector.h"
 #include "values/value.h"
 
@@ -26,6 +29,8 @@ struct LTE {
   RecordList MMCommonInfo = waitingForUpdate();
   Value IMSI = "Come Back Later"_text;
 
+  friend bool operator==(const LTE&, const LTE&) = default;
+
  private:
   [[nodiscard]] static Record initialSelReselCellInfo();
 };
@@ -42,6 +47,8 @@ struct UMTS {
   RecordList utraNbrMeas = waitingForUpdate();
   RecordList geraNbrMeas = waitingForUpdate();
 
+  friend bool operator==(const UMTS&, const UMTS&) = default;
+
  private:
   [[nodiscard]] static Record initialSelReselCellInfo();
 };
@@ -50,16 +57,24 @@ struct GSM {
   RecordList eUtraNbrMeas = waitingForUpdate();
   RecordList utraNbrMeas = waitingForUpdate();
   RecordList geraNbrMeas = waitingForUpdate();
+
+  friend bool operator==(const GSM&, const GSM&) = default;
 };
 
 struct Common {
   RecordList activeBearer = waitingForUpdate();
   RecordList simContents = waitingForUpdate();
+
+  friend bool operator==(const Common&, const Common&) = default;
 };
 
+/// Whether `T` is `Store`, const or not.
+template <class T, class Store>
+concept SameButConst = std::same_as<std::remove_const_t<T>, Store>;
+
 /// Calls `visit(name, field)` for each field of a store, in the order of its declaration.
-template <class Visit>
-void visitFields(const LTE& store, Visit visit) {
+template <SameButConst<LTE> Store, class Visit>
+void visitFields(Store& store, Visit visit) {
   visit("SelReselCellInfo", store.SelReselCellInfo);
   visit("EutraNbrs", store.EutraNbrs);
   visit("RsrpRsrqSinr", store.RsrpRsrqSinr);
@@ -72,8 +87,8 @@ void visitFields(const LTE& store, Visit visit) {
   visit("IMSI", store.IMSI);
 }
 
-template <class Visit>
-void visitFields(const UMTS& store, Visit visit) {
+template <SameButConst<UMTS> Store, class Visit>
+void visitFields(Store& store, Visit visit) {
   visit("rXInfo", store.rXInfo);
   visit("TxPower", store.TxPower);
   visit("SelReselCellInfo", store.SelReselCellInfo);
@@ -85,15 +100,15 @@ void visitFields(const UMTS& store, Visit visit) {
   visit("geraNbrMeas", store.geraNbrMeas);
 }
 
-template <class Visit>
-void visitFields(const GSM& store, Visit visit) {
+template <SameButConst<GSM> Store, class Visit>
+void visitFields(Store& store, Visit visit) {
   visit("eUtraNbrMeas", store.eUtraNbrMeas);
   visit("utraNbrMeas", store.utraNbrMeas);
   visit("geraNbrMeas", store.geraNbrMeas);
 }
 
-template <class Visit>
-void visitFields(const Common& store, Visit visit) {
+template <SameButConst<Common> Store, class Visit>
+void visitFields(Store& store, Visit visit) {
   visit("activeBearer", store.activeBearer);
   visit("simContents", store.simContents);
 }

@@ -3,6 +3,8 @@
 #include <array>
 #include <optional>
 
+#include "intake/date_format.h"
+
 namespace vesk {
 
 namespace {
@@ -27,6 +29,13 @@ void halveAndSubtract(Dictionary& record, const Text& key, float offset) {
 }
 
 }  // namespace
+
+void formatTimestamp(Dictionary& record, DateFormat& dates) {
+  Value* timestamp = record.findForChange("timestamp"_text);
+  if (timestamp == nullptr) return;
+  if (const std::optional<double> milliseconds = timestamp->number())
+    *timestamp = Text::copy(dates.write(*milliseconds));
+}
 
 void convertFields(Dictionary& record, std::span<const FieldConversion> conversions) {
   for (const auto& [key, convert] : conversions)

@@ -7,6 +7,12 @@
 /// From a value as the handset reports it to the one that an engineer reads.
 namespace vesk {
 
+class DateFormat;
+
+/// Turns the record's "timestamp", milliseconds since 1970-01-01 00:00:00 UTC, into a date in words. One that is
+/// missing or no number stays as it is.
+void formatTimestamp(Dictionary& record, DateFormat& dates);
+
 /// Converts the value under `key`, which is of `record`. One of a type that the conversion is not for stays as it is.
 using ConvertValue = void (*)(Dictionary& record, const Text& key);
 

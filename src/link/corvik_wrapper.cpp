@@ -38,7 +38,7 @@ std::shared_ptr<CorvikWrapper> CorvikWrapper::make() {
   // The queue is needed to the wrapper's end, and so has to be there before it.
   MainQueue& mainQueue = MainQueue::shared();
   return {new CorvikWrapper, [&mainQueue](CorvikWrapper* wrapper) {
-            mainQueue.async([ended = std::unique_ptr<CorvikWrapper>(wrapper)] {});
+            mainQueue.post([ended = std::unique_ptr<CorvikWrapper>(wrapper)] {});
           }};
 }
 
@@ -116,7 +116,7 @@ void CorvikWrapper::forward(const InterProcessDictionary& event, const char* lab
   }
   if (!isDelegateSet_) return;
   // The wrapper is there until what it has scheduled is done.
-  MainQueue::shared().async([this, dictionary = std::move(dictionary), deliver] {
+  MainQueue::shared().post([this, dictionary = std::move(dictionary), deliver] {
     if (const auto delegate = this->delegate()) ((*delegate).*deliver)(dictionary);
   });
 }

@@ -12,37 +12,37 @@
 
 namespace vesk {
 
-/// The program's only connection to the baseband manager service: sends commands, and forwards each event to
-/// its delegate on the main queue. Operations are for the main queue.
+/// The program's only connection to the baseband manager service. It sends commands to the service, and hands each
+/// event to its delegate on the main queue. Call it on the main queue only.
 ///
-/// Commands are sent only for the application identifier "vesk", and are false at once for any other. The
-/// outcome of one that was sent goes to the system log; true means that the service accepted it.
+/// A command answers true when the service has accepted it; the outcome is logged. For any application identifier but
+/// "vesk" it sends nothing and answers false.
 class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
  public:
   /// The wrapper of the process, made on first call, which connects to the service installed then.
   static std::shared_ptr<CorvikWrapper> sharedInstance();
-  /// The serial queue in whose turn the client library delivers events, one for the process.
+  /// The serial queue on which the client library delivers events. There is one for the process.
   static WorkQueue& queue();
 
-  /// One that connects to the service installed now. Once nobody holds it, it ends on the main queue, behind the events
-  /// that it has scheduled there; that of the process at the queue's own end, before which the service must be shut
-  /// down.
+  /// A wrapper that connects to the service installed now. When its last owner lets go, it is destroyed on the main
+  /// queue, behind the events that it has posted there. The wrapper of the process is destroyed with the queue itself:
+  /// shut the service down before.
   static std::shared_ptr<CorvikWrapper> make();
   CorvikWrapper(const CorvikWrapper&) = delete;
   CorvikWrapper& operator=(const CorvikWrapper&) = delete;
 
-  /// Sends the content of the file at `protofFilePath` as the metric configuration. False, and nothing sent,
-  /// when it cannot be read.
+  /// Sends the file at `protofFilePath` as the metric configuration. When it cannot be read, sends nothing and answers
+  /// false.
   bool addQuodraConfigForAppId(std::string_view appId, const std::string& protofFilePath);
   bool removeQuodraConfigForAppid(std::string_view appId);
-  /// Asks for one metric, which comes as an event.
+  /// Asks for one metric. The answer comes as an event.
   bool querySpecificMetric(std::string_view appId, std::int32_t triggerRef, std::int32_t triggerType,
                            std::int32_t triggerId, std::int32_t profileId, std::int32_t metricId);
 
-  /// Registers for metric and trigger events, and switches them off and on.
+  /// Registers for metric and trigger events, then switches events off and on.
   void listen();
 
-  /// Null when there is none, or none any more.
+  /// Null when none was set, or when it is gone.
   [[nodiscard]] std::shared_ptr<CorvikWrapperDelegate> delegate() const { return delegate_.lock(); }
   /// Held weakly. Without a delegate events are dropped.
   void setDelegate(std::weak_ptr<CorvikWrapperDelegate> delegate);
@@ -59,7 +59,7 @@ class CorvikWrapper : public std::enable_shared_from_this<CorvikWrapper> {
 
   std::shared_ptr<corvik::client::Manager> corvikManager_;
   std::weak_ptr<CorvikWrapperDelegate> delegate_;
-  /// What the handlers ask, on whatever thread they run; the delegate may have gone since.
+  /// Read by the handlers, on any thread. The delegate may be gone by then.
   std::atomic<bool> isDelegateSet_ = false;
 };
 

@@ -1,11 +1,11 @@
 #pragma once
 
 #include <cstddef>
-#include <functional>
 #include <memory>
 #include <span>
 #include <utility>
 
+#include "recording/timed_events.h"
 #include "system/file_descriptor.h"
 
 namespace vesk {
@@ -15,15 +15,12 @@ namespace vesk {
 class LineReader {
  public:
   enum class Found { line, tooLongLine, end, failure };
-  /// Called before every read(2), which may block. False ends the reading as if the input had ended.
-  using BeforeRead = std::function<bool(int descriptor)>;
-
   static constexpr std::size_t kLongestLine = std::size_t{8} << 20;
 
   /// `padding` bytes behind every line may be read, whatever they hold, and the first be overwritten.
   LineReader(FileDescriptor descriptor, std::size_t padding, std::size_t longestLine = kLongestLine);
 
-  void setBeforeRead(BeforeRead beforeRead) { beforeRead_ = std::move(beforeRead); }
+  void setBeforeRead(TimedEvents::BeforeRead beforeRead) { beforeRead_ = std::move(beforeRead); }
 
   /// Finds the next line. One beyond the longest is passed over without being kept. After a failure errno
   /// tells why, and so it stays.
@@ -47,7 +44,7 @@ class LineReader {
   FileDescriptor descriptor_;
   std::size_t padding_;
   std::size_t longestLine_;
-  BeforeRead beforeRead_;
+  TimedEvents::BeforeRead beforeRead_;
 
   std::unique_ptr<char[]> buffer_;
   std::size_t capacity_;

@@ -5,6 +5,7 @@
 #include <cstring>
 
 #include "recording/hex.h"
+#include "values/ascii.h"
 #include "values/text_form.h"
 #include "values/utf8.h"
 
@@ -28,25 +29,6 @@ constexpr int kDeepest = 500;
 
 constexpr unsigned kReading =
     rapidjson::kParseInsituFlag | rapidjson::kParseStopWhenDoneFlag | rapidjson::kParseNumbersAsStringsFlag;
-
-/// Whether all characters are known to be printable ASCII; they are looked at by eights, the last eight at their end.
-bool isPlain(std::string_view line) {
-  constexpr std::size_t kStep = 8;
-  constexpr std::uint64_t kEach = 0x0101010101010101;
-  if (line.size() < kStep) return false;
-  std::uint64_t seen = 0;
-  const auto look = [&seen](const char* place) {
-    std::uint64_t eight = 0;
-    std::memcpy(&eight, place, kStep);
-    // Less 0x20, the lowest control character comes to 0xE0 or more.
-    seen |= eight | (eight - kEach * 0x20);
-  };
-  const char* const last = line.data() + line.size() - kStep;
-  for (const char* place = line.data(); place < last; place += kStep)
-    look(place);
-  look(last);
-  return (seen & kEach * 0x80) == 0;
-}
 
 /// Why no JSON text can hold these characters; null when one can. The reader leaves it unchecked whether texts are
 /// UTF-8 and, where it looks at sixteen characters at once, some of the control characters.
@@ -202,7 +184,7 @@ bool RecordedEventParser::readFields(std::span<char> line, Fields& fields) {
   const std::size_t first = text.find_first_not_of(kBlanks);
   if (first == std::string_view::npos || text[first] != '{') return fail("no JSON object");
   text = text.substr(0, text.find_last_not_of(kBlanks) + 1);
-  if (!isPlain(text)) {
+  if (printableAsciiSize(text) < text.size()) {
     if (const char* reason = whyNoJson(text)) return fail(reason);
   }
   const bool isClosed = text.back() == '}';

@@ -8,15 +8,9 @@
 #include <string_view>
 #include <vector>
 
-namespace vesk {
+#include "recording/timed_events.h"
 
-/// One metric event of a recording.
-struct RecordedEvent {
-  /// Seconds since the recording began: finite, not negative.
-  double at;
-  std::int64_t metricId;
-  std::span<const std::uint8_t> payload;
-};
+namespace vesk {
 
 /// Appends a metric identifier as JSON: "0x3C4E04", or an integer where it is negative.
 void appendMetricId(std::string& out, std::int64_t metricId);

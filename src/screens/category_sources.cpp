@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 
+#include "intake/metric_table.h"
 #include "messages/gsm/gsm.h"
 #include "messages/lte/lte.h"
 #include "messages/nas/nas.h"
@@ -14,39 +15,41 @@ namespace vesk {
 namespace {
 
 using namespace metrics;
-using Intake = MetricValidator;
 
-/// A latest record.
+/// The latest record of a metric.
 template <auto record>
-constexpr CategorySource latest(std::string_view area, std::string_view category, std::int64_t metric) {
+constexpr CategorySource latest(std::string_view area, std::string_view category) {
   return {.area = area,
           .category = category,
           .kind = SourceKind::metricRecord,
-          .latestRecord = [](const Intake& intake) { return intake.*record; },
-          .metric = metric};
+          .latestRecord = [](const Stores& stores) { return stores.*record; },
+          .metric = kMetricOfRecord<record>};
 }
 
+/// A record of a technology store, which the metric changes.
 template <auto store, auto field>
 constexpr CategorySource record(std::string_view area, std::string_view category, std::int64_t metric) {
   return {.area = area,
           .category = category,
           .kind = SourceKind::storeRecord,
-          .storeRecord = [](const Intake& intake) { return intake.*store.*field; },
+          .storeRecord = [](const Stores& stores) { return stores.*store.*field; },
           .metric = metric};
 }
 
+/// A list of a technology store, with a section for each element.
 template <auto store, auto field, class Element>
 constexpr CategorySource list(std::string_view area, std::string_view category, std::string_view headerPrefix,
                               std::int64_t metric) {
   return {.area = area,
           .category = category,
           .kind = SourceKind::storeList,
-          .list = [](const Intake& intake) { return intake.*store.*field; },
+          .list = [](const Stores& stores) { return stores.*store.*field; },
           .headerPrefix = headerPrefix,
           .elementClass = Element::kClassName,
           .metric = metric};
 }
 
+/// The first element of such a list.
 template <auto store, auto field, class Element>
 constexpr CategorySource first(std::string_view area, std::string_view category, std::int64_t metric) {
   CategorySource source = list<store, field, Element>(area, category, {}, metric);
@@ -58,36 +61,37 @@ constexpr CategorySource placeholder(std::string_view area, std::string_view cat
   return {.area = area, .category = category, .kind = SourceKind::placeholder};
 }
 
-constexpr auto lte = &Intake::myLTE;
-constexpr auto umts = &Intake::myUMTS;
-constexpr auto gsm = &Intake::myGSM;
-constexpr auto common = &Intake::myCommon;
+constexpr auto lte = &Stores::myLTE;
+constexpr auto umts = &Stores::myUMTS;
+constexpr auto gsm = &Stores::myGSM;
+constexpr auto common = &Stores::myCommon;
 
 // clang-format off
+/// The menu, in its order.
 constexpr std::array kSources{
     placeholder("Device Info", "IMSI"),
     placeholder("Device Info", "IMEISV"),
     list<common, &Common::simContents, ElementaryFile>("Device Info", "SIM Files", "SIM Content ", K_SIM_FILE_INFO),
 
-    latest<&Intake::myLTEEMMContextDict>("LTE", "NAS", K_LTE_EMM_CTXT),
-    latest<&Intake::myLTERRCStateDict>("LTE", "RRC State", K_LTE_RRC_STATE),
-    latest<&Intake::myLTESCellInfoDict>("LTE", "Serving Cell Info", K_LTE_SCELL_INFO),
+    latest<&Stores::myLTEEMMContextDict>("LTE", "NAS"),
+    latest<&Stores::myLTERRCStateDict>("LTE", "RRC State"),
+    latest<&Stores::myLTESCellInfoDict>("LTE", "Serving Cell Info"),
     first<lte, &LTE::RsrpRsrqSinr, RsrpRsrqSinr>("LTE", "Serving Cell Meas", K_LTE_RSRP_RSRQ_SINR),
     list<lte, &LTE::TxPower, TxPowerInfo>("LTE", "Tx Power", "TxPowerInfo ", K_LTE_TX_POWER),
     record<lte, &LTE::SelReselCellInfo>("LTE", "Sel Resel Parameters", K_LTE_SEL_RESEL_INFO),
     list<lte, &LTE::EutraNbrs, NbrEutra>("LTE", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_LTE_SEL_RESEL_INFO),
-    latest<&Intake::myLTECDRXConfigDict>("LTE", "C-DRX", K_LTE_CDRX_CONFIG),
+    latest<&Stores::myLTECDRXConfigDict>("LTE", "C-DRX"),
     list<lte, &LTE::EutraNbrsMeas, EgwErrcNbrEutraMeas>("LTE", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_LTE_INTRARAT_MEAS),
     list<lte, &LTE::UtraNbrsMeas, EgwErrcNbrUtraMeas>("LTE", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_LTE_INTERRAT_MEAS),
     list<lte, &LTE::GeraNbrsMeas, EgwErrcNbrGeranMeas>("LTE", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_LTE_INTERRAT_MEAS),
     list<lte, &LTE::CAStatusList, SecondaryComponentCarrier>("LTE", "CA Status", "Component Carrier ", K_LTE_CA_STATUS),
     list<common, &Common::activeBearer, BearerContext>("LTE", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 
-    latest<&Intake::myGMMContextDict>("UMTS", "NAS GMM", K_CELLULAR_GMM_CTXT),
-    latest<&Intake::myMMContextDict>("UMTS", "NAS MM", K_CELLULAR_MM_CTXT),
-    latest<&Intake::myUMTSRRCStateDict>("UMTS", "RRC State", K_UMTS_RRC_STATE),
-    latest<&Intake::myUMTSRRCConfigDict>("UMTS", "RRC Configuration", K_UMTS_RRC_CONFIG),
-    latest<&Intake::myUMTSCellInfoDict>("UMTS", "Serving Cell Info", K_UMTS_SCELL_INFO),
+    latest<&Stores::myGMMContextDict>("UMTS", "NAS GMM"),
+    latest<&Stores::myMMContextDict>("UMTS", "NAS MM"),
+    latest<&Stores::myUMTSRRCStateDict>("UMTS", "RRC State"),
+    latest<&Stores::myUMTSRRCConfigDict>("UMTS", "RRC Configuration"),
+    latest<&Stores::myUMTSCellInfoDict>("UMTS", "Serving Cell Info"),
     list<umts, &UMTS::rXInfo, RxInfo>("UMTS", "Serving Cell Meas", "RxInfo ", K_UMTS_SCELL_MEAS),
     list<umts, &UMTS::TxPower, TxPowerInfo>("UMTS", "Tx Power", "TxPowerInfo ", K_UMTS_TX_POWER),
     record<umts, &UMTS::SelReselCellInfo>("UMTS", "Sel Resel Parameters", K_UMTS_SEL_RESEL_INFO),
@@ -99,24 +103,27 @@ constexpr std::array kSources{
     list<umts, &UMTS::geraNbrMeas, GsmCellMeasResult>("UMTS", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_UMTS_NCELL_MEAS),
     list<common, &Common::activeBearer, BearerContext>("UMTS", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 
-    latest<&Intake::myGMMContextDict>("GSM", "NAS GMM", K_CELLULAR_GMM_CTXT),
-    latest<&Intake::myMMContextDict>("GSM", "NAS MM", K_CELLULAR_MM_CTXT),
-    latest<&Intake::myGSMScellInfoDict>("GSM", "Serving Cell Info", K_GSM_SCELL_INFO),
-    latest<&Intake::myGSMIdleConfigInfoDict>("GSM", "Idle Config", K_GSM_IDLE_CONFIG),
-    latest<&Intake::myGSMIdleScellMeasDict>("GSM", "Idle Serv Cell Meas", K_GSM_IDLE_SCELL_MEAS),
-    latest<&Intake::myGSMConnRfMeasDict>("GSM", "Connected Serv Cell Meas", K_GSM_CS_RF_MEAS),
-    latest<&Intake::myGSMGPRSConfigDict>("GSM", "GSM GPRS Config", K_GSM_GPRS_CONFIG),
+    latest<&Stores::myGMMContextDict>("GSM", "NAS GMM"),
+    latest<&Stores::myMMContextDict>("GSM", "NAS MM"),
+    latest<&Stores::myGSMScellInfoDict>("GSM", "Serving Cell Info"),
+    latest<&Stores::myGSMIdleConfigInfoDict>("GSM", "Idle Config"),
+    latest<&Stores::myGSMIdleScellMeasDict>("GSM", "Idle Serv Cell Meas"),
+    latest<&Stores::myGSMConnRfMeasDict>("GSM", "Connected Serv Cell Meas"),
+    latest<&Stores::myGSMGPRSConfigDict>("GSM", "GSM GPRS Config"),
     list<gsm, &GSM::eUtraNbrMeas, LteNcellMeas>("GSM", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_GSM_NCELL_MEAS),
     list<gsm, &GSM::utraNbrMeas, UmtsNcellMeas>("GSM", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_GSM_NCELL_MEAS),
     list<gsm, &GSM::geraNbrMeas, GsmNcellMeas>("GSM", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_GSM_NCELL_MEAS),
     list<common, &Common::activeBearer, BearerContext>("GSM", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 };
 // clang-format on
-static_assert(kSources.size() == 42);
 
 constexpr CategorySource kUnknown = placeholder({}, {});
 
 }  // namespace
+
+std::span<const CategorySource> categorySources() {
+  return kSources;
+}
 
 const CategorySource& sourceOf(std::string_view area, std::string_view category) {
   const auto* found = std::find_if(kSources.begin(), kSources.end(), [&](const CategorySource& source) {
@@ -131,19 +138,19 @@ std::string_view messageClassOf(const CategorySource& source) {
   return metricClass == nullptr ? std::string_view{} : metricClass->name;
 }
 
-RecordList shownRecords(const CategorySource& source, const MetricValidator& intake) {
+RecordList shownRecords(const CategorySource& source, const Stores& stores) {
   RecordList records;
   switch (source.kind) {
     case SourceKind::metricRecord:
-      if (auto record = source.latestRecord(intake)) records.append(*std::move(record));
+      if (auto record = source.latestRecord(stores)) records.append(*std::move(record));
       break;
     case SourceKind::storeRecord:
-      records.append(source.storeRecord(intake));
+      records.append(source.storeRecord(stores));
       break;
     case SourceKind::storeList:
-      return source.list(intake);
+      return source.list(stores);
     case SourceKind::firstElement:
-      if (const RecordList list = source.list(intake); list.size() > 0) records.append(list[0]);
+      if (const RecordList list = source.list(stores); list.size() > 0) records.append(list[0]);
       break;
     case SourceKind::placeholder:
       break;

@@ -2,9 +2,10 @@
 
 #include <cstdint>
 #include <optional>
+#include <span>
 #include <string_view>
 
-#include "intake/metric_validator.h"
+#include "intake/stores.h"
 
 namespace vesk {
 
@@ -22,15 +23,15 @@ enum class SourceKind {
   placeholder,
 };
 
-/// Where the values of one category come from.
+/// A category of the menu, and where its values come from.
 struct CategorySource {
   std::string_view area;
   std::string_view category;
   SourceKind kind;
-  /// What the kind reads, from the intake as it is at the time of the call; null for the other kinds.
-  MetricValidator::LatestRecord (*latestRecord)(const MetricValidator& intake) = nullptr;
-  Record (*storeRecord)(const MetricValidator& intake) = nullptr;
-  RecordList (*list)(const MetricValidator& intake) = nullptr;
+  /// What the kind reads, from the stores as they are at the time of the call; null for the other kinds.
+  LatestRecord (*latestRecord)(const Stores& stores) = nullptr;
+  Record (*storeRecord)(const Stores& stores) = nullptr;
+  RecordList (*list)(const Stores& stores) = nullptr;
   /// What stands before the number of an element in the header of its section.
   std::string_view headerPrefix{};
   /// The message class of a list's elements.
@@ -38,6 +39,9 @@ struct CategorySource {
   /// The metric that changes the source; absent for a placeholder.
   std::optional<std::int64_t> metric{};
 };
+
+/// The categories of all areas, in the order in which the menu shows them.
+[[nodiscard]] std::span<const CategorySource> categorySources();
 
 /// The source of a pair of labels. A pair that no menu has is a placeholder.
 [[nodiscard]] const CategorySource& sourceOf(std::string_view area, std::string_view category);
@@ -47,6 +51,6 @@ struct CategorySource {
 
 /// The records that the source's screen shows, one a section; none for a placeholder, and for a kind of metric that has
 /// not come.
-[[nodiscard]] RecordList shownRecords(const CategorySource& source, const MetricValidator& intake);
+[[nodiscard]] RecordList shownRecords(const CategorySource& source, const Stores& stores);
 
 }  // namespace vesk

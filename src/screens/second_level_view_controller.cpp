@@ -29,12 +29,12 @@ std::optional<Record> SecondLevelViewController::recordOf(std::size_t section) c
   const CategorySource& from = source();
   switch (from.kind) {
     case SourceKind::metricRecord:
-      return from.latestRecord(*myMetricValidator);
+      return from.latestRecord(myMetricValidator->stores);
     case SourceKind::storeRecord:
-      return from.storeRecord(*myMetricValidator);
+      return from.storeRecord(myMetricValidator->stores);
     case SourceKind::storeList:
     case SourceKind::firstElement: {
-      const RecordList list = from.list(*myMetricValidator);
+      const RecordList list = from.list(myMetricValidator->stores);
       if (section < list.size()) return list[section];
       break;
     }
@@ -55,14 +55,14 @@ void SecondLevelViewController::didLeaveNavigationStack() {
 }
 
 void SecondLevelViewController::update() {
-  MainQueue::shared().async([screen = weak_from_this()] {
+  MainQueue::shared().post([screen = weak_from_this()] {
     if (const auto alive = screen.lock()) alive->tableView().reloadData();
   });
 }
 
 std::size_t SecondLevelViewController::numberOfSections() {
   const CategorySource& from = source();
-  return from.kind == SourceKind::storeList ? from.list(*myMetricValidator).size() : 1;
+  return from.kind == SourceKind::storeList ? from.list(myMetricValidator->stores).size() : 1;
 }
 
 std::optional<Text> SecondLevelViewController::headerTitle(std::size_t section) {

@@ -8,12 +8,12 @@
 
 namespace vesk {
 
-/// The whole content of the file at `path`; absent, with errno telling why, when it cannot be read, as for a
-/// directory, or when it is beyond 256 MiB.
+/// The whole content of the file at `path`. Absent when it cannot be read or is larger than 256 MiB; errno then says
+/// why.
 [[nodiscard]] std::optional<Data> readFile(const std::string& path);
 
-/// A way of one's own to the terminal behind `descriptor`, where no write ever blocks: a terminal that has room takes
-/// no more than that, however little. Not open when no terminal is there.
+/// Opens the terminal behind `descriptor` once more, for writing without blocking: a write takes what there is room
+/// for. Not open when `descriptor` is no terminal.
 [[nodiscard]] FileDescriptor openUnblocked(int descriptor);
 
 }  // namespace vesk

@@ -8,7 +8,8 @@
 #include <string>
 #include <string_view>
 
-#include "system/file_descriptor.h"
+#include "system/clock.h"
+#include "system/descriptor_writer.h"
 #include "system/wake_up.h"
 
 namespace vesk {
@@ -42,8 +43,7 @@ class DescriptorSink : public OutputSink {
   /// always waiting. Must outlive the sink.
   void setInterrupt(const WakeUp* interrupt) { interrupt_ = interrupt; }
   /// From `deadline` on a reader that takes nothing for as long as `patience` has failed. Absent for never.
-  void setDeadline(std::optional<std::chrono::steady_clock::time_point> deadline,
-                   std::chrono::milliseconds patience = std::chrono::seconds(1)) {
+  void setDeadline(std::optional<Clock::Instant> deadline, Clock::Duration patience = std::chrono::seconds(1)) {
     deadline_ = deadline;
     patience_ = patience;
   }
@@ -53,28 +53,14 @@ class DescriptorSink : public OutputSink {
   [[nodiscard]] bool hasFailed() const { return hasFailed_; }
 
  private:
-  enum class Room { some, interrupted, neverAgain };
-
-  using Instant = std::chrono::steady_clock::time_point;
-
-  /// When a reader that takes nothing from now on has failed; absent for never.
-  [[nodiscard]] std::optional<Instant> endOfPatience() const;
-  /// `wasRefused` says that there was room just now, but too little.
-  [[nodiscard]] Room waitForRoom(std::optional<Instant> end, bool wasRefused) const;
-  /// write(2), of some of the bytes, where there is room.
-  [[nodiscard]] ssize_t writeWhatFits(std::string_view bytes) const;
   void fail(const char* reason);
 
-  int descriptor_;
+  DescriptorWriter writer_;
   std::string name_;
   bool isTerminal_;
-  /// The terminal, where writing does not block; not open where the descriptor is none.
-  FileDescriptor terminal_;
-  /// The most that is written at once where it may not block; a pipe that has room at all has room for this.
-  std::size_t chunk_;
   const WakeUp* interrupt_ = nullptr;
-  std::optional<std::chrono::steady_clock::time_point> deadline_;
-  std::chrono::milliseconds patience_{};
+  std::optional<Clock::Instant> deadline_;
+  Clock::Duration patience_{};
   FailureHandler onFailure_;
   bool hasFailed_ = false;
   std::string buffer_;

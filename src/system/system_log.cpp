@@ -1,21 +1,16 @@
 #include "system/system_log.h"
 
-#include <algorithm>
 #include <atomic>
-#include <cerrno>
 #include <chrono>
-#include <climits>
 #include <cstdarg>
 #include <cstdio>
 #include <fcntl.h>
 #include <mutex>
-#include <poll.h>
 #include <syslog.h>
 #include <unistd.h>
 #include <utility>
 
-#include "system/clock.h"
-#include "system/file.h"
+#include "system/descriptor_writer.h"
 #include "values/visible_text.h"
 
 namespace vesk {
@@ -35,11 +30,7 @@ class SyslogSink : public LogSink {
 class DescriptorLogSink : public LogSink {
  public:
   DescriptorLogSink(FileDescriptor descriptor, std::chrono::milliseconds patience)
-      : descriptor_(std::move(descriptor)), patience_(patience) {
-    if (FileDescriptor unblocked = openUnblocked(descriptor_.get()); unblocked.isOpen()) {
-      descriptor_ = std::move(unblocked);
-    }
-  }
+      : writer_(std::move(descriptor)), patience_(patience) {}
 
   void write(std::string_view line) override {
     std::string whole;
@@ -49,42 +40,20 @@ class DescriptorLogSink : public LogSink {
     }
     whole += line;
     whole += '\n';
-    const std::size_t left = leftOf(whole);
-    if (left == 0) {
+    // The reader is waited for once; when it has let that pass, no more until it reads.
+    const std::chrono::milliseconds patience = dropped_ > 0 ? std::chrono::milliseconds(0) : patience_;
+    const std::size_t taken = writer_.write(whole, {.end = std::chrono::steady_clock::now() + patience}).count;
+    if (taken == whole.size()) {
       dropped_ = 0;
       isCut_ = false;
     } else {
       ++dropped_;
-      if (left < whole.size()) isCut_ = true;
+      if (taken > 0) isCut_ = true;
     }
   }
 
  private:
-  /// How many bytes the reader does not take. It is waited for once; when it has let that pass, no more until it reads.
-  std::size_t leftOf(std::string_view bytes) {
-    using std::chrono::steady_clock;
-    const auto deadline = steady_clock::now() + (dropped_ > 0 ? std::chrono::milliseconds(0) : patience_);
-    while (!bytes.empty()) {
-      const int wait = pollTimeout(deadline - steady_clock::now());
-      const ssize_t written = writeWithin(wait, bytes);
-      if (written > 0) {
-        bytes.remove_prefix(static_cast<std::size_t>(written));
-      } else if (wait == 0 || (written < 0 && errno != EINTR && errno != EAGAIN)) {
-        break;
-      }
-    }
-    return bytes.size();
-  }
-
-  /// write(2), of some of the bytes, once there is room; 0 when there is none within that many milliseconds.
-  [[nodiscard]] ssize_t writeWithin(int milliseconds, std::string_view bytes) const {
-    pollfd polled{descriptor_.get(), POLLOUT, 0};
-    const int ready = poll(&polled, 1, milliseconds);
-    if (ready <= 0) return ready;
-    return ::write(descriptor_.get(), bytes.data(), std::min<std::size_t>(bytes.size(), PIPE_BUF));
-  }
-
-  FileDescriptor descriptor_;
+  DescriptorWriter writer_;
   std::chrono::milliseconds patience_;
   /// Lines since the reader last took one, and whether the first of them was written in part.
   std::size_t dropped_ = 0;

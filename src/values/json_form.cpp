@@ -23,11 +23,6 @@ constexpr std::array<bool, 256> kIsPlain = [] {
   return table;
 }();
 
-/// The control characters U+0080 to U+009F: C2, then a byte below A0.
-bool isLateControl(std::string_view character) {
-  return character.size() == 2 && character[0] == '\xC2' && static_cast<unsigned char>(character[1]) < 0xA0;
-}
-
 }  // namespace
 
 void JsonWriter::write(float number) {
@@ -91,10 +86,11 @@ std::size_t JsonWriter::putPlain(std::string_view text) {
 }
 
 void JsonWriter::putEscaped(std::string_view character) {
-  if (isLateControl(character)) {
-    putCodeUnit(static_cast<unsigned char>(character[1]));
-  } else if (character.size() == 1 && static_cast<unsigned char>(character[0]) < 0x80) {
+  const char32_t codePoint = utf8CharacterSize(character) == 0 ? U'\uFFFD' : codePointOf(character);
+  if (codePoint < 0x80) {
     putEscaped(character[0]);
+  } else if (isControl(codePoint)) {
+    putCodeUnit(codePoint);
   } else {
     flush();
     appendUtf8(out_, character);

@@ -16,55 +16,48 @@ inline constexpr bool kIsSanitized =
 inline constexpr bool kIsSanitized = false;
 #endif
 
-/// Memory for the many small objects that an event is made of and that live no longer than it does: what a thread gives
-/// back is kept, within bounds, for its next request of about that size. An event is made by one thread and ends on
-/// another, so what one has too much of goes to those that have none, many blocks at a time. Under a sanitizer of
-/// memory or threads every block comes from the heap, in the size that was asked for, so that its checks see them all.
+/// A thread cache for the many small objects that an event is made of and that live no longer than it does: what a
+/// thread gives back is kept, within bounds, for its next request of about that size. Under a sanitizer of memory or
+/// threads every block comes from the heap, in the size that was asked for, so that its checks see them all.
 class RecycledMemory {
  public:
   /// `size` bytes, aligned for every ordinary type; throws std::bad_alloc.
   [[nodiscard]] static void* allocate(std::size_t size) {
     const std::size_t kind = kindOf(size);
     if (kIsSanitized || kind >= kKinds) return ::operator new(size);
-    Stock& stock = stocks_[kind];
-    if (stock.count == 0) return allocateFromOutside(kind);
-    // The next one may lie where another core has it.
-    if (stock.count > 1) __builtin_prefetch(stock.blocks[stock.count - 2], 1);
-    return stock.blocks[--stock.count];
+    Blocks& blocks = cache_[kind];
+    if (blocks.count == 0) return ::operator new((kind + 1) * kStep);
+    return blocks.blocks[--blocks.count];
   }
 
   /// Gives back what allocate() gave for the same size.
   static void release(void* memory, std::size_t size) noexcept {
     const std::size_t kind = kindOf(size);
     if (kIsSanitized || kind >= kKinds) return ::operator delete(memory);
-    Stock& stock = stocks_[kind];
-    if (stock.count == stock.room) return releaseToOutside(memory, kind);
-    stock.blocks[stock.count++] = memory;
+    Blocks& blocks = cache_[kind];
+    if (blocks.count == blocks.room) return releaseBeyondRoom(memory, kind);
+    blocks.blocks[blocks.count++] = memory;
   }
 
  private:
   /// Blocks of one kind that are a multiple of this in size.
   static constexpr std::size_t kStep = 32;
   static constexpr std::size_t kKinds = 32;
-  /// How many blocks go from one thread to another.
-  static constexpr std::uint32_t kLot = 32;
+  /// How many blocks of one kind a thread keeps.
+  static constexpr std::uint32_t kMost = 64;
 
-  /// The blocks of one kind that a thread has.
-  struct Stock {
+  struct Blocks {
     std::uint32_t count;
     /// None before the thread's first use and after its end.
     std::uint32_t room;
-    std::array<void*, std::size_t{2} * kLot> blocks;
+    std::array<void*, kMost> blocks;
   };
   struct Keeper;
 
   static std::size_t kindOf(std::size_t size) { return (size - 1) / kStep; }
-  static void* allocateFromOutside(std::size_t kind);
-  static void releaseToOutside(void* memory, std::size_t kind) noexcept;
-  /// Whether this thread keeps blocks.
-  static bool isOpen();
+  static void releaseBeyondRoom(void* memory, std::size_t kind) noexcept;
 
-  static inline constinit thread_local std::array<Stock, kKinds> stocks_{};
+  static inline constinit thread_local std::array<Blocks, kKinds> cache_{};
 };
 
 /// RecycledMemory for the standard containers and std::allocate_shared.

@@ -53,6 +53,28 @@ std::size_t utf8CharacterSize(std::string_view bytes) {
   return 0;
 }
 
+char32_t codePointOf(std::string_view character) {
+  const std::uint8_t lead = byteAt(character, 0);
+  if (lead < 0x80) return lead;
+  auto codePoint = static_cast<char32_t>(lead & (0x7FU >> character.size()));
+  for (std::size_t index = 1; index < character.size(); ++index)
+    codePoint = codePoint << 6 | (byteAt(character, index) & 0x3FU);
+  return codePoint;
+}
+
+void appendCodePoint(std::string& out, char32_t codePoint) {
+  const auto trailing = [codePoint](unsigned shift) { return static_cast<char>(0x80 | (codePoint >> shift & 0x3F)); };
+  if (codePoint < 0x80) {
+    out += static_cast<char>(codePoint);
+  } else if (codePoint < 0x800) {
+    out += {static_cast<char>(0xC0 | codePoint >> 6), trailing(0)};
+  } else if (codePoint < 0x10000) {
+    out += {static_cast<char>(0xE0 | codePoint >> 12), trailing(6), trailing(0)};
+  } else {
+    out += {static_cast<char>(0xF0 | codePoint >> 18), trailing(12), trailing(6), trailing(0)};
+  }
+}
+
 void appendUtf8(std::string& out, std::string_view bytes) {
   while (!bytes.empty()) {
     const std::size_t size = utf8CharacterSize(bytes);

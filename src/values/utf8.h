@@ -12,4 +12,15 @@ void appendUtf8(std::string& out, std::string_view bytes);
 /// The number of bytes of the well-formed character that `bytes` starts with; 0 when it starts with none.
 [[nodiscard]] std::size_t utf8CharacterSize(std::string_view bytes);
 
+/// The code point of one well-formed character.
+[[nodiscard]] char32_t codePointOf(std::string_view character);
+
+/// Appends the character of `codePoint`, at most U+10FFFF.
+void appendCodePoint(std::string& out, char32_t codePoint);
+
+/// Whether `codePoint` acts on a terminal instead of being shown: U+0000 to U+001F, U+007F to U+009F.
+[[nodiscard]] constexpr bool isControl(char32_t codePoint) {
+  return codePoint < 0x20 || (0x7F <= codePoint && codePoint < 0xA0);
+}
+
 }  // namespace vesk

@@ -94,21 +94,6 @@ class Value {
   /// equally.
   using Held = std::variant<bool, std::int64_t, std::uint64_t, float, Text, Data, Array, Dictionary>;
 
-  Value(const Value& other) : held_(other.held_) {}
-  Value(Value&& other) noexcept : held_(std::move(other.held_)) {}
-  Value& operator=(const Value& other) {
-    held_ = other.held_;
-    return *this;
-  }
-  Value& operator=(Value&& other) noexcept {
-    held_ = std::move(other.held_);
-    return *this;
-  }
-  ~Value() {
-    // Most values are numbers, and have nothing to give back.
-    if (held_.index() >= kFirstOwner) held_.~Held();
-  }
-
   Value(std::same_as<bool> auto value) : held_(value) {}
   Value(std::signed_integral auto value) : held_(std::int64_t{value}) {}
   template <std::unsigned_integral Number>
@@ -141,13 +126,7 @@ class Value {
   friend bool operator==(const Value& a, const Value& b);
 
  private:
-  /// The alternatives before this one are plain.
-  static constexpr std::size_t kFirstOwner = 4;
-  static_assert(std::is_same_v<std::variant_alternative_t<kFirstOwner, Held>, Text>);
-
-  union {
-    Held held_;
-  };
+  Held held_;
 };
 
 struct Dictionary::Entry {

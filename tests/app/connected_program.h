@@ -57,15 +57,7 @@ struct ProcessConnection {
 /// connected to that service; each of these starts with empty stores.
 class ConnectedProgram {
  public:
-  ConnectedProgram() {
-    const auto fresh = MetricValidator::listeningTo(nullptr);
-    for (const auto& [name, record] : kLatestRecords)
-      (*intake).*record = (*fresh).*record;
-    intake->myLTE = fresh->myLTE;
-    intake->myUMTS = fresh->myUMTS;
-    intake->myGSM = fresh->myGSM;
-    intake->myCommon = fresh->myCommon;
-  }
+  ConnectedProgram() { intake->stores = {}; }
   ConnectedProgram(const ConnectedProgram&) = delete;
   ConnectedProgram& operator=(const ConnectedProgram&) = delete;
   ~ConnectedProgram() {

@@ -22,51 +22,22 @@
 namespace vesk {
 namespace {
 
-/// What an intake holds, to be put back.
-struct Stores {
-  explicit Stores(const MetricValidator& intake)
-      : lte(intake.myLTE), umts(intake.myUMTS), gsm(intake.myGSM), common(intake.myCommon) {
-    for (const auto& [name, member] : kLatestRecords)
-      records.push_back(intake.*member);
-  }
-  void putInto(MetricValidator& intake) const {
-    intake.myLTE = lte;
-    intake.myUMTS = umts;
-    intake.myGSM = gsm;
-    intake.myCommon = common;
-    for (std::size_t index = 0; index < records.size(); ++index)
-      intake.*kLatestRecords[index].second = records[index];
-  }
-
-  LTE lte;
-  UMTS umts;
-  GSM gsm;
-  Common common;
-  std::vector<MetricValidator::LatestRecord> records;
-};
+void shrink(Record& record) {
+  if (!record.empty()) record.erase((record.end() - 1)->key);
+}
+void shrink(RecordList& list) {
+  if (list.size() > 0) list.erase(list.size() - 1);
+  if (list.size() > 0) shrink(list.mutableItems()[0]);
+}
+void shrink(Value& /*value*/) {}
 
 /// Takes everything from the lists and records of the stores, one entry at a time.
-void shrinkStores(MetricValidator& intake) {
-  struct Shrink {
-    // The visitor sees stores that never change; these do.
-    void operator()(std::string_view, const RecordList& list) const {
-      if (list.size() > 0) const_cast<RecordList&>(list).erase(list.size() - 1);
-      if (list.size() > 0) operator()({}, list[0]);
-    }
-    void operator()(std::string_view, const Record& record) const {
-      if (!record.empty()) const_cast<Record&>(record).erase((record.end() - 1)->key);
-    }
-    void operator()(std::string_view, const Value&) const {}
-  };
-  visitFields(intake.myLTE, Shrink{});
-  visitFields(intake.myUMTS, Shrink{});
-  visitFields(intake.myGSM, Shrink{});
-  visitFields(intake.myCommon, Shrink{});
-  for (const auto& [name, member] : kLatestRecords) {
-    auto& record = intake.*member;
-    if (record) Shrink{}({}, *record);
+void shrinkStores(Stores& stores) {
+  visitTechnologyFields(stores, [](std::string_view, auto& field) { shrink(field); });
+  visitLatestRecords(stores, [](std::string_view, LatestRecord& record) {
+    if (record) shrink(*record);
     if (record && record->empty()) record.reset();
-  }
+  });
 }
 
 /// Finds less in the stores each time that its table asks it for something.
@@ -88,7 +59,7 @@ class ShrinkingScreen : public SecondLevelViewController {
 
  private:
   ShrinkingScreen& shrunk() {
-    if (isShrinking) shrinkStores(*MetricValidator::shared());
+    if (isShrinking) shrinkStores(MetricValidator::shared()->stores);
     return *this;
   }
 };
@@ -175,8 +146,8 @@ TEST_F(ScreensUnderFire, NothingOfAPayloadReachesTheTerminalAsAControl) {
 TEST_F(ScreensUnderFire, AStoreThatShrinksBetweenEveryCountAndCellLeavesRowsEmptyUntilItIsFilled) {
   const RecordedOutput output;
   fillStores();
-  MetricValidator& intake = *MetricValidator::shared();
-  const Stores filled(intake);
+  Stores& stores = MetricValidator::shared()->stores;
+  const Stores filled = stores;
   const std::shared_ptr<NavigationController> stack = layout_.makeRootStack();
   constexpr std::array kKeys{Key::Down, Key::Up, Key::PageDown, Key::PageUp, Key::End, Key::Home, Key::Tab};
   std::mt19937 random(1);
@@ -187,7 +158,7 @@ TEST_F(ScreensUnderFire, AStoreThatShrinksBetweenEveryCountAndCellLeavesRowsEmpt
     ShrinkingScreen::isShrinking = true;
     for (int number = 0; number < 60; ++number) {
       if (number % 10 == 0) {
-        filled.putInto(intake);
+        stores = filled;
         table.reloadData();
       }
       if (number % 15 == 0) desk.type(number % 2 == 0 ? U"/1\r" : U"f");
@@ -195,7 +166,7 @@ TEST_F(ScreensUnderFire, AStoreThatShrinksBetweenEveryCountAndCellLeavesRowsEmpt
       EXPECT_FALSE(desk.picture().empty());
     }
     ShrinkingScreen::isShrinking = false;
-    filled.putInto(intake);
+    stores = filled;
     Desk later(*stack, {60, 20});
     table.reloadData();
     EXPECT_EQ(later.picture(), whole);

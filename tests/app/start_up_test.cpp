@@ -127,7 +127,7 @@ TEST(StartUp, WithoutAConfigurationTheStoresStillTakeWhatTheServiceDelivers) {
   EXPECT_EQ(output.lines(),
             (Lines{"Metric Log File path doesnt exist", "Metric ID in Hex =  3C0013",
                    "Received SIM Card File Info is  {ef_list: [{ef_id: 28423}]}", "Received Valid Metric"}));
-  ASSERT_EQ(program.intake->myCommon.simContents.size(), 1U);
+  ASSERT_EQ(program.intake->stores.myCommon.simContents.size(), 1U);
 }
 
 /// Runs in a process of its own: elsewhere the link is connected for good.

@@ -57,15 +57,23 @@ TEST(Snippet, IsQuotedWhenItCannotBeFilledIn) {
 }
 
 TEST(Snippet, BreaksALineThatIsTooLong) {
-  const std::string call = "f(" + std::string(60, 'x') + ");";
-  const auto conditionOf = [&](std::size_t width) {
-    return std::string(width - 2 - call.size() - std::string_view("if () ").size(), 'c');
+  struct Case {
+    std::string line;
+    std::string broken;
   };
-  EXPECT_EQ(conditional(conditionOf(120), call), "if (" + conditionOf(120) + ") " + call + "\n");
-  EXPECT_EQ(conditional(conditionOf(121), call), "if (" + conditionOf(121) + ") {\n  " + call + "\n}\n");
-  const auto headOf = [&](std::size_t width) { return std::string(width - 2 - call.size() - 5, 'h'); };
-  EXPECT_EQ(inlineFunction(headOf(120), call), headOf(120) + " { " + call + " }\n");
-  EXPECT_EQ(inlineFunction(headOf(121), call), headOf(121) + " {\n  " + call + "\n}\n");
+  const Case cases[] = {
+      {"if (!f(x).g($x$)) return (false);", "if (!f(x).g($x$)) {\n  return (false);\n}"},
+      {"void f($x$) { g({}); }", "void f($x$) {\n  g({});\n}"},
+      {"g($x$);", "g($x$);"},
+  };
+  for (const auto& [line, broken] : cases) {
+    // Below a class, which indents by two.
+    const std::size_t room = kLineWidth - 2 - (line.size() - 3);
+    const Variables fits{{"x", std::string(room, 'x')}};
+    const Variables isTooLong{{"x", std::string(room + 1, 'x')}};
+    EXPECT_EQ(expandToFit(line, fits), expand(line, fits));
+    EXPECT_EQ(expandToFit(line, isTooLong), expand(broken, isTooLong));
+  }
 }
 
 }  // namespace

@@ -2,7 +2,6 @@
 
 #include <limits>
 
-#include "emit.h"
 #include "messages/codec/proto_writer.h"
 #include "messages/proto_schema.h"
 
@@ -10,22 +9,23 @@ namespace vesk {
 
 namespace {
 
-using messagegen::Field;
-using messagegen::FieldType;
+std::uint32_t numberOf(const FieldDescriptor& field) {
+  return static_cast<std::uint32_t>(field.number());
+}
 
 class Filler {
  public:
   explicit Filler(Filling filling) : isExtreme_(filling == Filling::extreme) {}
 
-  FilledMessage fill(const messagegen::MessageType& message) {
-    message_ = &message;
+  FilledMessage fill(const Descriptor& message) {
     FilledMessage filled;
     ProtoWriter writer;
-    for (const Field& field : messagegen::fieldsByNumber(message)) {
-      filled.dictionary.set(Text::copy(field.name), field.repeated ? addList(field, writer) : addOne(field, writer));
+    for (const auto& [number, field] : fieldsByNumber(message)) {
+      const Value value = field->is_repeated() ? addList(*field, writer) : addOne(*field, writer);
+      filled.dictionary.set(Text::copy(field->name()), value);
       filled.fieldEnds.push_back(writer.written().size());
       // The elements of a list are fields of their own.
-      if (field.isMessageList()) {
+      if (field->is_repeated() && !field->is_packable()) {
         filled.fieldEnds.insert(filled.fieldEnds.end() - 1, elementEnds_.begin(), elementEnds_.end() - 1);
       }
     }
@@ -34,9 +34,9 @@ class Filler {
   }
 
  private:
-  Value addList(const Field& field, ProtoWriter& writer) {
+  Value addList(const FieldDescriptor& field, ProtoWriter& writer) {
     Array array;
-    if (field.isMessage()) {
+    if (!field.is_packable()) {
       std::vector<std::size_t> ends;
       for (int count = 0; count < 2; ++count) {
         array.append(addOne(field, writer));
@@ -45,7 +45,7 @@ class Filler {
       elementEnds_ = std::move(ends);
     } else {
       WriterMark mark{};
-      writer.beginSection(mark, field.number);
+      writer.beginSection(mark, numberOf(field));
       for (int count = 0; count < 3; ++count)
         array.append(addNumber(field, writer, ProtoWriter::kNoKey));
       writer.endSection(mark);
@@ -53,50 +53,51 @@ class Filler {
     return array;
   }
 
-  Value addOne(const Field& field, ProtoWriter& writer) {
-    const std::string letters = "field " + field.name;
-    switch (field.type) {
-      case FieldType::string:
-        writer.writeString(Text::copy(letters), field.number);
+  Value addOne(const FieldDescriptor& field, ProtoWriter& writer) {
+    const std::string letters = "field " + field.name();
+    switch (field.type()) {
+      case FieldDescriptor::TYPE_STRING:
+        writer.writeString(Text::copy(letters), numberOf(field));
         return Text::copy(letters);
-      case FieldType::bytes: {
+      case FieldDescriptor::TYPE_BYTES: {
         const Data data = Data::copy(Bytes(letters.begin(), letters.end()));
-        writer.writeBytes(data, field.number);
+        writer.writeBytes(data, numberOf(field));
         return data;
       }
-      case FieldType::message: {
-        FilledMessage part = Filler(*this).fill(schema().at(field.typeName));
-        writer.writeBytes(Data::copy(part.payload), field.number);
+      case FieldDescriptor::TYPE_MESSAGE: {
+        FilledMessage part = Filler(*this).fill(*field.message_type());
+        writer.writeBytes(Data::copy(part.payload), numberOf(field));
         return part.dictionary;
       }
       default:
-        return addNumber(field, writer, field.number);
+        return addNumber(field, writer, numberOf(field));
     }
   }
 
-  Value addNumber(const Field& field, ProtoWriter& writer, std::uint32_t number) {
+  Value addNumber(const FieldDescriptor& field, ProtoWriter& writer, std::uint32_t number) {
     const std::uint32_t next = ++last_;
     constexpr auto kMin = std::numeric_limits<std::int32_t>::min();
-    switch (field.type) {
-      case FieldType::uint64: {
+    switch (field.type()) {
+      case FieldDescriptor::TYPE_UINT64: {
         const std::uint64_t value = isExtreme_ ? ~std::uint64_t{next} : next;
         writer.writeUInt64(value, number);
         return value;
       }
-      case FieldType::sint32:
-      case FieldType::int32: {
+      case FieldDescriptor::TYPE_SINT32:
+      case FieldDescriptor::TYPE_INT32: {
         const auto value = static_cast<std::int32_t>(next) + (isExtreme_ ? kMin : 0);
-        field.type == FieldType::int32 ? writer.writeInt32(value, number) : writer.writeSInt32(value, number);
+        field.type() == FieldDescriptor::TYPE_INT32 ? writer.writeInt32(value, number)
+                                                    : writer.writeSInt32(value, number);
         return value;
       }
-      case FieldType::boolean:
+      case FieldDescriptor::TYPE_BOOL:
         writer.writeBool(true, number);
         return true;
-      case FieldType::enumeration: {
-        const auto& values = enumerationOf(*message_, field).values;
-        const auto& value = isExtreme_ ? values.back() : values[1];
-        writer.writeInt32(value.number, number);
-        return Text::copy(value.name);
+      case FieldDescriptor::TYPE_ENUM: {
+        const auto* enumeration = field.enum_type();
+        const auto* value = enumeration->value(isExtreme_ ? enumeration->value_count() - 1 : 1);
+        writer.writeInt32(value->number(), number);
+        return Text::copy(value->name());
       }
       default:
         writer.writeUInt32(isExtreme_ ? ~next : next, number);
@@ -105,7 +106,6 @@ class Filler {
   }
 
   bool isExtreme_;
-  const messagegen::MessageType* message_ = nullptr;
   std::uint32_t last_ = 0;
   std::vector<std::size_t> elementEnds_;
 };
@@ -113,7 +113,7 @@ class Filler {
 }  // namespace
 
 FilledMessage filledMessage(std::string_view className, Filling filling) {
-  return Filler(filling).fill(schema().find(className)->second);
+  return Filler(filling).fill(declaredMessage(className));
 }
 
 }  // namespace vesk

@@ -4,7 +4,7 @@
 #include <functional>
 #include <gtest/gtest.h>
 
-#include "messages/kinds.h"
+#include "messages/messagegen/kinds.h"
 #include "support/allocations.h"
 #include "support/bytes.h"
 #include "support/steps.h"

@@ -1,41 +1,16 @@
 // What our writers write, protobuf reads as the same fields and writes as the same bytes.
 
-#include <cstdlib>
-#include <fstream>
-#include <google/protobuf/descriptor.pb.h>
 #include <google/protobuf/dynamic_message.h>
 
 #include "messages/every_message.h"
 #include "messages/filled_message.h"
+#include "messages/proto_schema.h"
 #include "support/decoded.h"
 
 namespace vesk {
 namespace {
 
 namespace pb = google::protobuf;
-using pb::FieldDescriptor;
-
-/// Makes messages of the schema, as protoc understood it.
-class Peer {
- public:
-  Peer() {
-    std::ifstream file(VESK_DESCRIPTORS, std::ios::binary);
-    pb::FileDescriptorSet files;
-    if (!files.ParseFromIstream(&file)) std::abort();
-    for (const pb::FileDescriptorProto& each : files.file()) {
-      if (pool_.BuildFile(each) == nullptr) std::abort();
-    }
-  }
-
-  std::unique_ptr<pb::Message> make(std::string_view className) {
-    const pb::Descriptor* type = pool_.FindMessageTypeByName("metrics." + std::string(className));
-    return std::unique_ptr<pb::Message>(factory_.GetPrototype(type)->New());
-  }
-
- private:
-  pb::DescriptorPool pool_;
-  pb::DynamicMessageFactory factory_;
-};
 
 Dictionary dictionaryOf(const pb::Message& message);
 
@@ -94,12 +69,12 @@ class PeerAgrees : public testing::TestWithParam<MessageClass> {};
 INSTANTIATE_TEST_SUITE_P(Schema, PeerAgrees, testing::ValuesIn(metrics::kEveryMessage), nameOfTest);
 
 TEST_P(PeerAgrees, OnTheFieldsAndOnTheBytes) {
-  static Peer peer;
+  pb::DynamicMessageFactory factory;
   for (const Filling filling : {Filling::small, Filling::extreme}) {
     const auto ours = GetParam().decode(filledMessage(GetParam().name, filling).payload);
     ProtoWriter writer;
     ours->writeTo(writer);
-    const auto theirs = peer.make(GetParam().name);
+    const std::unique_ptr<pb::Message> theirs(factory.GetPrototype(&declaredMessage(GetParam().name))->New());
     ASSERT_TRUE(theirs->ParseFromArray(writer.written().data(), static_cast<int>(writer.written().size())));
     EXPECT_TRUE(theirs->GetReflection()->GetUnknownFields(*theirs).empty());
     EXPECT_EQ(dictionaryOf(*theirs), ours->dictionaryRepresentation()) << shown(*ours);

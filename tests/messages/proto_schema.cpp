@@ -1,52 +1,61 @@
 #include "messages/proto_schema.h"
 
-#include <fstream>
-#include <iterator>
-#include <optional>
-
-#include "resolver.h"
+#include <cstdlib>
+#include <filesystem>
+#include <google/protobuf/compiler/importer.h>
+#include <iostream>
 
 namespace vesk {
 
 namespace {
 
-struct Schema {
-  std::map<std::string, messagegen::MessageType, std::less<>> messages;
-  /// Those of the files, not those that a message contains.
-  std::map<std::string, messagegen::Enumeration> enumerations;
+namespace fs = std::filesystem;
+namespace pb = google::protobuf;
 
+class Schema : private pb::compiler::MultiFileErrorCollector {
+ public:
   Schema() {
-    const auto readSource = [](const std::string& path) {
-      std::ifstream file(std::string(VESK_SCHEMA) + '/' + path);
-      return std::optional(std::string(std::istreambuf_iterator<char>(file), {}));
-    };
-    for (const char* path :
-         {"gsm/gsm.proto", "lte/lte.proto", "nas/nas.proto", "shared/sys_band.proto", "wcdma/wcdma.proto"}) {
-      const messagegen::ProtoFile file = messagegen::loadProto(path, readSource);
-      for (const auto& enumeration : file.enumerations)
-        enumerations[enumeration.name] = enumeration;
-      for (const auto& message : file.messages)
-        messages[message.name] = message;
+    tree_.MapPath("", VESK_SCHEMA);
+    for (const auto& entry : fs::recursive_directory_iterator(VESK_SCHEMA)) {
+      if (entry.path().extension() != ".proto") continue;
+      const pb::FileDescriptor* file = importer_.Import(fs::relative(entry.path(), VESK_SCHEMA));
+      for (int index = 0; index < file->message_type_count(); ++index)
+        messages_.push_back(file->message_type(index));
     }
   }
-};
 
-const Schema& theSchema() {
-  static const Schema kSchema;
-  return kSchema;
-}
+  [[nodiscard]] const std::vector<const Descriptor*>& messages() const { return messages_; }
+
+ private:
+  void AddError(const std::string& file, int line, int column, const std::string& message) override {
+    std::cerr << file << ':' << line + 1 << ':' << column + 1 << ": " << message << '\n';
+    std::abort();
+  }
+
+  pb::compiler::DiskSourceTree tree_;
+  pb::compiler::Importer importer_{&tree_, this};
+  std::vector<const Descriptor*> messages_;
+};
 
 }  // namespace
 
-const std::map<std::string, messagegen::MessageType, std::less<>>& schema() {
-  return theSchema().messages;
+const std::vector<const Descriptor*>& declaredMessages() {
+  static const Schema kSchema;
+  return kSchema.messages();
 }
 
-const messagegen::Enumeration& enumerationOf(const messagegen::MessageType& message, const messagegen::Field& field) {
-  for (const messagegen::Enumeration& each : message.enumerations) {
-    if (each.name == field.typeName) return each;
+const Descriptor& declaredMessage(std::string_view name) {
+  for (const Descriptor* message : declaredMessages()) {
+    if (message->name() == name) return *message;
   }
-  return theSchema().enumerations.at(field.typeName);
+  std::abort();
+}
+
+std::map<int, const FieldDescriptor*> fieldsByNumber(const Descriptor& message) {
+  std::map<int, const FieldDescriptor*> fields;
+  for (int index = 0; index < message.field_count(); ++index)
+    fields[message.field(index)->number()] = message.field(index);
+  return fields;
 }
 
 }  // namespace vesk

@@ -1,17 +1,20 @@
 #pragma once
 
+#include <google/protobuf/descriptor.h>
 #include <map>
-#include <string>
+#include <string_view>
+#include <vector>
 
-#include "schema.h"
-
+/// The .proto files themselves, as libprotobuf reads them.
 namespace vesk {
 
-/// The .proto files themselves, by the names of their messages.
-[[nodiscard]] const std::map<std::string, messagegen::MessageType, std::less<>>& schema();
+using google::protobuf::Descriptor;
+using google::protobuf::FieldDescriptor;
 
-/// The enumeration of a field of `message`.
-[[nodiscard]] const messagegen::Enumeration& enumerationOf(const messagegen::MessageType& message,
-                                                           const messagegen::Field& field);
+[[nodiscard]] const std::vector<const Descriptor*>& declaredMessages();
+/// Ends the program when there is none of that name.
+[[nodiscard]] const Descriptor& declaredMessage(std::string_view name);
+
+[[nodiscard]] std::map<int, const FieldDescriptor*> fieldsByNumber(const Descriptor& message);
 
 }  // namespace vesk

@@ -1,6 +1,5 @@
 // What no rule derives: irregular keys, numbers that are left out, values without a name.
 
-#include <algorithm>
 #include <gtest/gtest.h>
 #include <map>
 
@@ -43,12 +42,12 @@ TEST(Schema, LeavesNumbersOut) {
       {"RsrpRsrqSinr", "1 4-5 7-8 10-11"},
   };
   std::size_t fields = 0;
-  for (const auto& [name, message] : schema()) {
+  for (const Descriptor* message : declaredMessages()) {
+    const std::string& name = message->name();
     std::vector<std::int32_t> numbers;
-    for (const auto& field : message.fields)
-      numbers.push_back(static_cast<std::int32_t>(field.number));
+    for (const auto& [number, field] : fieldsByNumber(*message))
+      numbers.push_back(number);
     fields += numbers.size();
-    std::sort(numbers.begin(), numbers.end());
     const auto row = gaps.find(name);
     if (row != gaps.end()) {
       EXPECT_EQ(rangesOf(numbers), row->second) << name;
@@ -56,7 +55,7 @@ TEST(Schema, LeavesNumbersOut) {
       EXPECT_EQ(numbers.back(), static_cast<std::int32_t>(numbers.size())) << name << ' ' << rangesOf(numbers);
     }
   }
-  EXPECT_EQ(schema().size(), 54U);
+  EXPECT_EQ(declaredMessages().size(), 54U);
   EXPECT_EQ(fields, 348U);
 }
 

@@ -11,10 +11,6 @@ namespace vesk {
 
 namespace {
 
-using messagegen::Field;
-using messagegen::FieldType;
-using messagegen::MessageType;
-
 /// Thrown where the bytes are no encoding of a message.
 struct Malformed {};
 
@@ -108,23 +104,26 @@ void skip(Key key, Rest& rest, int depth) {
   }
 }
 
-Value nameOf(const messagegen::Enumeration& enumeration, std::int32_t number) {
-  for (const messagegen::Enumerator& each : enumeration.values) {
-    if (each.number == number) return Text::copy(each.name);
-  }
-  return Text::copy("(unknown: " + std::to_string(number) + ")");
+Value nameOf(const google::protobuf::EnumDescriptor& enumeration, std::int32_t number) {
+  const auto* value = enumeration.FindValueByNumber(number);
+  return Text::copy(value != nullptr ? value->name() : "(unknown: " + std::to_string(number) + ")");
+}
+
+/// Whether its values come as varints.
+bool isScalar(const FieldDescriptor& field) {
+  return FieldDescriptor::IsTypePackable(field.type());
 }
 
 /// A message as it is put together from what arrives, field by field.
 class MessageModel {
  public:
-  explicit MessageModel(const MessageType& type) : type_(type) {}
+  explicit MessageModel(const Descriptor& type) : type_(type) {}
 
   void read(Rest rest) {
     while (!rest.empty()) {
       const Key key = keyOf(rest);
       if (key.wireType == 4) return;
-      if (const Field* field = declared(key.number)) {
+      if (const FieldDescriptor* field = declared(key.number)) {
         readField(*field, key, rest);
       } else if (kMetricNumbers.contains(key.number)) {
         // The length of a section around the message itself, whose content follows.
@@ -136,85 +135,79 @@ class MessageModel {
   }
 
   [[nodiscard]] Dictionary dictionary() const {
-    std::map<std::uint32_t, const Field*> fieldsByNumber;
-    for (const Field& field : type_.fields)
-      fieldsByNumber[field.number] = &field;
     Dictionary dictionary;
-    for (const auto& [number, field] : fieldsByNumber) {
+    for (const auto& [number, field] : fieldsByNumber(type_)) {
       const auto found = arrived_.find(number);
       const bool hasArrived = found != arrived_.end() && !found->second.empty();
-      if (hasArrived && !field->repeated) {
-        dictionary.set(Text::copy(field->name), found->second.back());
-      } else if (hasArrived || field->isRepeatedScalar()) {
+      if (hasArrived && !field->is_repeated()) {
+        dictionary.set(Text::copy(field->name()), found->second.back());
+      } else if (hasArrived || field->is_packable()) {
         Array array;
         if (hasArrived) {
           for (const Value& each : found->second)
             array.append(each);
         }
-        dictionary.set(Text::copy(field->name), array);
+        dictionary.set(Text::copy(field->name()), array);
       }
     }
     return dictionary;
   }
 
  private:
-  [[nodiscard]] const Field* declared(std::uint64_t number) const {
-    for (const Field& field : type_.fields) {
-      if (field.number == number) return &field;
-    }
-    return nullptr;
+  [[nodiscard]] const FieldDescriptor* declared(std::uint64_t number) const {
+    return type_.FindFieldByNumber(static_cast<int>(number));
   }
 
-  void readField(const Field& field, Key key, Rest& rest) {
-    std::vector<Value>& values = arrived_[field.number];
-    if (field.isRepeatedScalar() && key.wireType == 2) {
+  void readField(const FieldDescriptor& field, Key key, Rest& rest) {
+    std::vector<Value>& values = arrived_[field.number()];
+    if (field.is_packable() && key.wireType == 2) {
       for (Rest packed(rest.section()); !packed.empty();)
         values.push_back(scalar(field, packed.varint()));
-    } else if (!field.isObject()) {
+    } else if (isScalar(field)) {
       values.push_back(scalar(field, rest.varint()));
     } else {
       values.push_back(object(field, rest.section()));
     }
   }
 
-  [[nodiscard]] Value scalar(const Field& field, std::uint64_t varint) const {
+  [[nodiscard]] static Value scalar(const FieldDescriptor& field, std::uint64_t varint) {
     const auto low = static_cast<std::uint32_t>(varint);
     const auto signedLow = static_cast<std::int32_t>(low);
-    switch (field.type) {
-      case FieldType::uint64:
+    switch (field.type()) {
+      case FieldDescriptor::TYPE_UINT64:
         return varint;
-      case FieldType::int32:
+      case FieldDescriptor::TYPE_INT32:
         return signedLow;
-      case FieldType::sint32:
+      case FieldDescriptor::TYPE_SINT32:
         // 0, -1, 1, -2, 2 and so on.
         return low % 2 == 0 ? std::int64_t{low / 2} : -std::int64_t{low / 2} - 1;
-      case FieldType::boolean:
+      case FieldDescriptor::TYPE_BOOL:
         return varint != 0;
-      case FieldType::enumeration:
-        return nameOf(enumerationOf(type_, field), signedLow);
+      case FieldDescriptor::TYPE_ENUM:
+        return nameOf(*field.enum_type(), signedLow);
       default:
         return low;
     }
   }
 
-  [[nodiscard]] static Value object(const Field& field, std::span<const std::uint8_t> section) {
-    if (field.type == FieldType::bytes) return Data::copy(section);
-    if (field.type == FieldType::string) return Text::copy(std::string(section.begin(), section.end()));
-    MessageModel message(schema().at(field.typeName));
+  [[nodiscard]] static Value object(const FieldDescriptor& field, std::span<const std::uint8_t> section) {
+    if (field.type() == FieldDescriptor::TYPE_BYTES) return Data::copy(section);
+    if (field.type() == FieldDescriptor::TYPE_STRING) return Text::copy(std::string(section.begin(), section.end()));
+    MessageModel message(*field.message_type());
     message.read(Rest(section));
     return message.dictionary();
   }
 
-  const MessageType& type_;
+  const Descriptor& type_;
   /// The values of each field in the order in which they came.
-  std::map<std::uint32_t, std::vector<Value>> arrived_;
+  std::map<int, std::vector<Value>> arrived_;
 };
 
 }  // namespace
 
 std::optional<Dictionary> modelledDictionary(std::string_view className, std::span<const std::uint8_t> payload) {
   try {
-    MessageModel message(schema().find(className)->second);
+    MessageModel message(declaredMessage(className));
     message.read(Rest(payload));
     return message.dictionary();
   } catch (const Malformed&) {

@@ -6,9 +6,7 @@
 #include <vector>
 
 #include "intake/metric_validator.h"
-#include "messages/gsm/gsm.h"
 #include "messages/lte/lte.h"
-#include "messages/wcdma/wcdma.h"
 #include "screens/detail_text.h"
 #include "screens/first_level_view_controller.h"
 #include "screens/second_level_view_controller.h"
@@ -20,6 +18,7 @@
 #include "system/main_queue.h"
 #include "system/run_loop.h"
 #include "toolkit/system_appearance.h"
+#include "values/text_form.h"
 
 namespace vesk {
 namespace {
@@ -32,13 +31,7 @@ class Screens : public testing::Test {
   Screens() {
     setenv("TZ", "UTC", 1);
     tzset();
-    const auto fresh = MetricValidator::listeningTo(nullptr);
-    for (const auto& [name, record] : kLatestRecords)
-      (*intake).*record = (*fresh).*record;
-    intake->myLTE = fresh->myLTE;
-    intake->myUMTS = fresh->myUMTS;
-    intake->myGSM = fresh->myGSM;
-    intake->myCommon = fresh->myCommon;
+    intake->stores = {};
   }
 
   static std::shared_ptr<SecondLevelViewController> open(std::string_view area, std::string_view category) {
@@ -75,90 +68,82 @@ class Screens : public testing::Test {
   std::shared_ptr<MetricValidator> intake = MetricValidator::shared();
 };
 
-TEST_F(Screens, TheMenuHasItsCategories) {
-  const VeskViewItems items;
-  const std::vector<std::size_t> counts{3, 13, 15, 11};
-  ASSERT_EQ(items.launchViewItemNames.size(), counts.size());
-  EXPECT_EQ(items.firstLevelViewItems.size(), counts.size());
-  for (std::size_t area = 0; area < counts.size(); ++area) {
-    EXPECT_EQ(items.categoriesOf(items.launchViewItemNames[area].view()).size(), counts[area]);
-  }
-  EXPECT_EQ(items.categoriesOf("GSM")[6], "GSM GPRS Config");
-  EXPECT_TRUE(items.categoriesOf("gsm").empty());
-}
-
-TEST_F(Screens, EveryPairShowsItsSourceBeforeAnyEvent) {
-  std::size_t pairs = 0;
-  std::string kinds;
+TEST_F(Screens, EveryCategoryShowsItsSourceInTheOrderOfTheMenu) {
+  int number = 0;
+  visitTechnologyFields(intake->stores, [&](std::string_view name, auto& field) {
+    const Record record{{Text::copy(name), ++number}};
+    if constexpr (std::is_same_v<decltype(field), RecordList&>) {
+      field.clear();
+      field.append(record);
+    } else {
+      field = record;
+    }
+  });
+  visitLatestRecords(intake->stores, [](std::string_view name, LatestRecord& record) {
+    record = Record{{Text::copy(name), ""_text}};
+  });
+  std::string all;
   for (const Text& area : VeskViewItems::shared().launchViewItemNames) {
     for (const Text& category : VeskViewItems::shared().categoriesOf(area.view())) {
-      ++pairs;
-      SCOPED_TRACE(std::string(area.view()) + " " + std::string(category.view()));
-      const CategorySource& source = sourceOf(area.view(), category.view());
-      const std::string text = shown(*open(area.view(), category.view()));
-      switch (source.kind) {
-        case SourceKind::metricRecord:
-          kinds += 'D';
-          EXPECT_EQ(text, "[-] -=-");
-          break;
-        case SourceKind::storeRecord:
-          kinds += 'S';
-          EXPECT_TRUE(text.starts_with("[-] timestamp= ")) << text;
-          break;
-        case SourceKind::storeList:
-          kinds += 'L';
-          EXPECT_TRUE(source.headerPrefix.ends_with(' '));
-          EXPECT_EQ(text, "[" + std::string(source.headerPrefix) + "0] Waiting for Update=Waiting for Update");
-          break;
-        case SourceKind::firstElement:
-          kinds += 'F';
-          EXPECT_EQ(text, "[-] Waiting for Update=Waiting for Update");
-          break;
-        case SourceKind::placeholder:
-          kinds += 'P';
-          EXPECT_EQ(text, "[-] Come back later=Come back later");
-          EXPECT_FALSE(source.metric.has_value());
-          break;
-      }
+      all += std::string(category.view()) + ": " + shown(*open(area.view(), category.view())) + ' ';
+      appendUpperHex(all, static_cast<std::uint64_t>(sourceOf(area.view(), category.view()).metric.value_or(0)));
+      all += '\n';
     }
   }
-  EXPECT_EQ(pairs, 42U);
-  EXPECT_EQ(kinds, "PPLDDDFLSLDLLLLLDDDDDLLSLLLLLLLDDDDDDDLLLL");
-  EXPECT_EQ(output.lines(), std::vector<std::string>{"You are screwed"});
-  EXPECT_EQ(shown(*open("LTE", "Tx Powers")), "[-] Come back later=Come back later");
-  EXPECT_EQ(shown(*open("", "")), "[-] Come back later=Come back later");
+  EXPECT_EQ(all,
+            "IMSI: [-] Come back later=Come back later 0\nIMEISV: [-] Come back later=Come back later 0\n"
+            "SIM Files: [SIM Content 0] simContents=24 3C0013\nNAS: [-] myLTEEMMContextDict= 3CD50C\n"
+            "RRC State: [-] myLTERRCStateDict= 3C4E04\nServing Cell Info: [-] myLTESCellInfoDict= 3C40C2\n"
+            "Serving Cell Meas: [-] RsrpRsrqSinr=3 3C4F6A\nTx Power: [TxPowerInfo 0] TxPower=4 3CD302\n"
+            "Sel Resel Parameters: [-] SelReselCellInfo=1 3CD30E\n"
+            "EUTRA Neighbor Info: [EUTRA Neighbor 0] EutraNbrs=2 3CD30E\nC-DRX: [-] myLTECDRXConfigDict= 3C4E18\n"
+            "LTE Neighbor Cell Meas: [LTE Neighbor 0] EutraNbrsMeas=5 3CD30F\n"
+            "UMTS Neighbor Cell Meas: [UMTS Neighbor 0] UtraNbrsMeas=6 3CD310\n"
+            "GSM Neighbor Cell Meas: [GSM Neighbor 0] GeraNbrsMeas=7 3CD310\n"
+            "CA Status: [Component Carrier 0] CAStatusList=8 3CD313\nActive Bearers: [PDP 0] activeBearer=23 3CD50D\n"
+            "NAS GMM: [-] myGMMContextDict= 3CD50B\nNAS MM: [-] myMMContextDict= 3CD50A\n"
+            "RRC State: [-] myUMTSRRCStateDict= 3CD112\nRRC Configuration: [-] myUMTSRRCConfigDict= 3CD113\n"
+            "Serving Cell Info: [-] myUMTSCellInfoDict= 3C300C\nServing Cell Meas: [RxInfo 0] rXInfo=11 3CD102\n"
+            "Tx Power: [TxPowerInfo 0] TxPower=12 3CD103\nSel Resel Parameters: [-] SelReselCellInfo=13 3CD104\n"
+            "EUTRA Neighbor Info: [EUTRA Neighbor 0] eUtraNbrs=14 3CD104\n"
+            "UTRA Neighbor Info: [UTRA Neighbor 0] utraNbrs=15 3CD104\n"
+            "GSM Neighbor Info: [GSM Neighbor 0] geraNbrs=16 3CD104\n"
+            "LTE Neighbor Cell Meas: [LTE Neighbor 0] eUtraNbrMeas=17 3CD105\n"
+            "UMTS Neighbor Cell Meas: [UMTS Neighbor 0] utraNbrMeas=18 3CD105\n"
+            "GSM Neighbor Cell Meas: [GSM Neighbor 0] geraNbrMeas=19 3CD105\n"
+            "Active Bearers: [PDP 0] activeBearer=23 3CD50D\nNAS GMM: [-] myGMMContextDict= 3CD50B\n"
+            "NAS MM: [-] myMMContextDict= 3CD50A\nServing Cell Info: [-] myGSMScellInfoDict= 3C2E0C\n"
+            "Idle Config: [-] myGSMIdleConfigInfoDict= 3CD001\n"
+            "Idle Serv Cell Meas: [-] myGSMIdleScellMeasDict= 3CD002\n"
+            "Connected Serv Cell Meas: [-] myGSMConnRfMeasDict= 3CD003\n"
+            "GSM GPRS Config: [-] myGSMGPRSConfigDict= 3CD00C\n"
+            "LTE Neighbor Cell Meas: [LTE Neighbor 0] eUtraNbrMeas=20 3CD009\n"
+            "UMTS Neighbor Cell Meas: [UMTS Neighbor 0] utraNbrMeas=21 3CD009\n"
+            "GSM Neighbor Cell Meas: [GSM Neighbor 0] geraNbrMeas=22 3CD009\n"
+            "Active Bearers: [PDP 0] activeBearer=23 3CD50D\n");
 }
 
-TEST_F(Screens, ShowWhatTheStoresHold) {
-  intake->myUMTS.TxPower.clear();
-  intake->myUMTS.TxPower.append({{"pucch_tx_power"_text, -5}, {"timestamp"_text, "now"_text}});
-  intake->myUMTS.TxPower.append({{"pusch_tx_power"_text, 2.5F}});
-  EXPECT_EQ(shown(*open("UMTS", "Tx Power")),
-            "[TxPowerInfo 0] pucch_tx_power=-5 timestamp=now[TxPowerInfo 1] pusch_tx_power=2.5");
+TEST_F(Screens, ShowPlaceholdersBeforeAnyEvent) {
+  for (const CategorySource& source : categorySources())
+    EXPECT_NE(shown(*open(source.area, source.category)), "");
+  EXPECT_EQ(output.lines(), std::vector<std::string>{"You are screwed"}) << "said for the serving cell of LTE alone";
+  EXPECT_EQ(shown(*open("LTE", "Serving Cell Info")), "[-] -=-");
   EXPECT_EQ(shown(*open("LTE", "Tx Power")), "[TxPowerInfo 0] Waiting for Update=Waiting for Update");
-
-  intake->myLTE.RsrpRsrqSinr.clear();
+  EXPECT_EQ(shown(*open("LTE", "Tx Powers")), "[-] Come back later=Come back later");
+  intake->stores.myLTE.RsrpRsrqSinr.clear();
   EXPECT_EQ(shown(*open("LTE", "Serving Cell Meas")), "[-]");
-  for (const int rsrp : {-95, -96, -97})
-    intake->myLTE.RsrpRsrqSinr.append({{"rsrp0"_text, rsrp}});
+  intake->stores.myLTE.RsrpRsrqSinr.append({{"rsrp0"_text, -95}});
+  intake->stores.myLTE.RsrpRsrqSinr.append({{"rsrp0"_text, -96}});
   EXPECT_EQ(shown(*open("LTE", "Serving Cell Meas")), "[-] rsrp0=-95");
-
-  intake->myGSM.geraNbrMeas.clear();
-  EXPECT_EQ(shown(*open("GSM", "GSM Neighbor Cell Meas")), "");
-
-  KCellularGsmGprsConfig gprs;
-  gprs.setRac(7);
-  intake->validateMetric(metricEvent(K_GSM_GPRS_CONFIG, gprs));
-  EXPECT_EQ(shown(*open("GSM", "GSM GPRS Config")), "[-] rac=7");
 }
 
 TEST_F(Screens, ASourceThatShrinksAfterTheCountGivesEmptyRows) {
-  intake->myLTE.TxPower.clear();
-  intake->myLTE.TxPower.append({{"a"_text, 1}, {"b"_text, 2}});
-  intake->myLTE.TxPower.append({{"c"_text, 3}});
+  intake->stores.myLTE.TxPower.clear();
+  intake->stores.myLTE.TxPower.append({{"a"_text, 1}, {"b"_text, 2}});
+  intake->stores.myLTE.TxPower.append({{"c"_text, 3}});
   const auto screen = open("LTE", "Tx Power");
-  intake->myLTE.TxPower.clear();
-  intake->myLTE.TxPower.append({{"a"_text, 9}});
+  intake->stores.myLTE.TxPower.clear();
+  intake->stores.myLTE.TxPower.append({{"a"_text, 9}});
   EXPECT_EQ(shown(*screen), "[TxPowerInfo 0] a=9 -=-[TxPowerInfo 1] -=-");
   screen->tableView().reloadData();
   EXPECT_EQ(shown(*screen), "[TxPowerInfo 0] a=9");
@@ -205,15 +190,12 @@ TEST_F(Screens, PassTheSelectionOnlyFromACellToTheScreenItIsFor) {
   VeskViewController launch;
   FirstLevelViewController first;
   const auto second = std::make_shared<SecondLevelViewController>();
-  ThirdLevelViewController other;
   TableViewCell cell("any"_text, CellStyle::Basic, CellAccessory::None);
   cell.setMainText("UMTS"_text);
-
   launch.prepareForTransition({"t", launch, first}, nullptr);
   launch.prepareForTransition({"t", launch, first}, &launch);
-  launch.prepareForTransition({"t", launch, other}, &cell);
-  EXPECT_FALSE(first.seguedThroughRow.has_value());
-  EXPECT_FALSE(other.seguedThroughRow.has_value());
+  launch.prepareForTransition({"t", launch, *second}, &cell);
+  EXPECT_FALSE(first.seguedThroughRow.has_value() || second->seguedThroughRow.has_value());
   launch.prepareForTransition({"t", launch, first}, &cell);
   EXPECT_EQ(first.seguedThroughRow, std::optional("UMTS"_text));
 
@@ -223,9 +205,6 @@ TEST_F(Screens, PassTheSelectionOnlyFromACellToTheScreenItIsFor) {
   first.prepareForTransition({"t", first, *second}, &cell);
   EXPECT_EQ(second->firstSelection, std::optional("UMTS"_text));
   EXPECT_EQ(second->seguedThroughRow, std::optional("Tx Power"_text));
-  cell.setMainText(std::nullopt);
-  first.prepareForTransition({"t", first, *second}, &cell);
-  EXPECT_FALSE(second->seguedThroughRow.has_value());
 }
 
 TEST_F(Screens, TheOtherScreensShowTheMenuAndNothing) {
@@ -239,6 +218,7 @@ TEST_F(Screens, TheOtherScreensShowTheMenuAndNothing) {
   EXPECT_EQ(shown(first), "[-] IMSI=- IMEISV=- SIM Files=-");
   EXPECT_FALSE(first.tableView().footerView().has_value());
   FirstLevelViewController lost;
+  lost.seguedThroughRow = "gsm"_text;
   lost.loadViewIfNeeded();
   EXPECT_EQ(shown(lost), "[-]");
   ThirdLevelViewController third;

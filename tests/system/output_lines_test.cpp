@@ -45,27 +45,23 @@ TEST(AppendVisible, FindsAControlCharacterAtEveryPlace) {
   }
 }
 
-TEST(DescriptorSink, GathersLinesUntilFlushed) {
+TEST(DescriptorSink, GathersLinesUntilFlushedWaitsForASlowReaderAndLosesNothing) {
   Pipe pipe;
-  DescriptorSink sink(pipe.writing.get(), "pipe");
-  fcntl(pipe.reading.get(), F_SETFL, O_NONBLOCK);
-  sink.write("one");
-  sink.write("two");
-  EXPECT_EQ(readSome(pipe.reading), "");
-  sink.flush();
-  EXPECT_EQ(readSome(pipe.reading), "one\ntwo\n");
-}
-
-TEST(DescriptorSink, WaitsForASlowReaderAndLosesNothing) {
-  Pipe pipe;
-  std::string received;
-  std::thread reader([&] {
-    for (std::string some = readSome(pipe.reading); !some.empty(); some = readSome(pipe.reading))
-      received += some;
-  });
   std::string sent;
+  std::string received;
+  std::thread reader;
   {
     DescriptorSink sink(pipe.writing.get(), "pipe");
+    sink.write("one");
+    fcntl(pipe.reading.get(), F_SETFL, O_NONBLOCK);
+    EXPECT_EQ(readSome(pipe.reading), "");
+    sink.flush();
+    EXPECT_EQ(readSome(pipe.reading), "one\n");
+    fcntl(pipe.reading.get(), F_SETFL, 0);
+    reader = std::thread([&] {
+      for (std::string some = readSome(pipe.reading); !some.empty(); some = readSome(pipe.reading))
+        received += some;
+    });
     for (int number = 0; number < 20000; ++number) {
       const std::string line = "line " + std::to_string(number);
       sink.write(line);
@@ -91,48 +87,41 @@ TEST(DescriptorSink, RemembersAClosedPipeAndTellsOnce) {
   EXPECT_EQ(reasons, std::vector<std::string>{"standard output: Broken pipe"});
 }
 
+void writeAMegabyte(DescriptorSink& sink) {
+  const std::string line(1000, 'x');
+  for (int number = 0; number < 1000; ++number)
+    sink.write(line);
+  sink.flush();
+}
+
 TEST(DescriptorSink, DoesNotWaitForABlockedReaderOnceInterrupted) {
   Pipe pipe;
   const WakeUp interrupt;
   interrupt.signal();
   DescriptorSink sink(pipe.writing.get(), "pipe");
   sink.setInterrupt(&interrupt);
-  const std::string line(1000, 'x');
-  for (int number = 0; number < 1000; ++number)
-    sink.write(line);
-  sink.flush();
+  writeAMegabyte(sink);
   EXPECT_FALSE(sink.hasFailed());
   EXPECT_FALSE(readSome(pipe.reading).empty());
 }
 
-TEST(DescriptorSink, GivesATerminalUpThatHasStoppedReading) {
+TEST(DescriptorSink, GivesAReaderUpThatHasStoppedReadingWhenTheTimeIsOver) {
+  const Pipe pipe;
   const FileDescriptor user(posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC));
   ASSERT_EQ(grantpt(user.get()), 0);
   ASSERT_EQ(unlockpt(user.get()), 0);
-  const FileDescriptor blocking(open(ptsname(user.get()), O_WRONLY | O_NOCTTY | O_CLOEXEC));
-  std::vector<std::string> reasons;
-  DescriptorSink sink(blocking.get(), "terminal");
-  sink.setFailureHandler([&](const std::string& reason) { reasons.push_back(reason); });
-  sink.setDeadline(std::chrono::steady_clock::now() - std::chrono::hours(1), std::chrono::milliseconds(0));
-  const std::string line(1500, 'x');
-  for (int number = 0; number < 1000; ++number)
-    sink.write(line);
-  EXPECT_EQ(reasons, std::vector<std::string>{"terminal: nobody reads it"});
-}
-
-TEST(DescriptorSink, GivesABlockedReaderUpWhenTheTimeIsOver) {
-  Pipe pipe;
-  std::vector<std::string> reasons;
-  DescriptorSink sink(pipe.writing.get(), "pipe");
-  sink.setFailureHandler([&](const std::string& reason) { reasons.push_back(reason); });
-  sink.setDeadline(std::chrono::steady_clock::now() - std::chrono::hours(1), std::chrono::milliseconds(0));
-  sink.write("in time");
-  sink.flush();
-  EXPECT_FALSE(sink.hasFailed());
-  const std::string line(1000, 'x');
-  for (int number = 0; number < 1000; ++number)
-    sink.write(line);
-  EXPECT_EQ(reasons, std::vector<std::string>{"pipe: nobody reads it"});
+  const FileDescriptor terminal(open(ptsname(user.get()), O_WRONLY | O_NOCTTY | O_CLOEXEC));
+  for (const int writing : {pipe.writing.get(), terminal.get()}) {
+    std::vector<std::string> reasons;
+    DescriptorSink sink(writing, "reader");
+    sink.setFailureHandler([&](const std::string& reason) { reasons.push_back(reason); });
+    sink.setDeadline(std::chrono::steady_clock::now() - std::chrono::hours(1), std::chrono::milliseconds(0));
+    sink.write("in time");
+    sink.flush();
+    EXPECT_FALSE(sink.hasFailed());
+    writeAMegabyte(sink);
+    EXPECT_EQ(reasons, std::vector<std::string>{"reader: nobody reads it"});
+  }
   EXPECT_TRUE(readSome(pipe.reading).starts_with("in time\nxxx"));
 }
 

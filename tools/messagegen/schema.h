@@ -1,75 +1,44 @@
 #pragma once
 
-#include <cstdint>
+#include <google/protobuf/descriptor.h>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
-#include "diagnostic.h"
-
-/// What the .proto files say, with every type name resolved.
+/// What protoc understood of a .proto file.
 namespace messagegen {
 
-using Comment = std::vector<std::string>;
+using google::protobuf::Descriptor;
+using google::protobuf::EnumDescriptor;
+using google::protobuf::EnumValueDescriptor;
+using google::protobuf::FieldDescriptor;
+using google::protobuf::FileDescriptor;
+using google::protobuf::SourceLocation;
 
-struct Enumerator {
-  std::string name;
-  std::int32_t number;
-};
+/// All in the order in which they are declared.
+[[nodiscard]] std::vector<const Descriptor*> messagesOf(const FileDescriptor& file);
+[[nodiscard]] std::vector<const EnumDescriptor*> enumerationsOf(const FileDescriptor& file);
+[[nodiscard]] std::vector<const EnumDescriptor*> enumerationsOf(const Descriptor& message);
+[[nodiscard]] std::vector<const EnumValueDescriptor*> valuesOf(const EnumDescriptor& enumeration);
+[[nodiscard]] std::vector<const FieldDescriptor*> fieldsOf(const Descriptor& message);
+/// In the order of their numbers, in which every operation takes them.
+[[nodiscard]] std::vector<const FieldDescriptor*> fieldsByNumber(const Descriptor& message);
 
-struct Enumeration {
-  Comment comment;
-  std::string name;
-  /// The message it is nested in; empty at file level.
-  std::string owner;
-  std::vector<Enumerator> values;
-};
+/// Where a declaration stands or, with the path that descriptor.proto gives to it, another part of a file.
+template <class Declaration, class... Path>
+[[nodiscard]] SourceLocation locationOf(const Declaration& declaration, const Path&... path) {
+  SourceLocation location{};
+  (void)declaration.GetSourceLocation(path..., &location);
+  return location;
+}
 
-/// How a field is laid out on the wire and held in the class.
-enum class FieldType { uint32, int32, sint32, uint64, boolean, enumeration, string, bytes, message };
+/// The lines of the comment directly before the declaration.
+[[nodiscard]] std::vector<std::string> commentLines(const SourceLocation& location);
 
-struct Field {
-  Comment comment;
-  std::string name;
-  Position position;
-  bool repeated;
-  FieldType type = FieldType::uint32;
-  /// As written: a scalar's name, or that of an enumeration or message.
-  std::string typeName;
-  Position typePosition;
-  /// The first value of an enumeration, which is its default.
-  std::string defaultName;
-  std::uint32_t number;
-
-  [[nodiscard]] bool isMessage() const { return type == FieldType::message; }
-  [[nodiscard]] bool isObject() const { return isMessage() || type == FieldType::string || type == FieldType::bytes; }
-  [[nodiscard]] bool isMessageList() const { return repeated && isMessage(); }
-  [[nodiscard]] bool isRepeatedScalar() const { return repeated && !isMessage(); }
-  /// A scalar with a presence bit.
-  [[nodiscard]] bool isOptionalScalar() const { return !repeated && !isObject(); }
-};
-
-struct MessageType {
-  Comment comment;
-  std::string name;
-  std::vector<Enumeration> enumerations;
-  /// In the order in which they are declared.
-  std::vector<Field> fields;
-};
-
-struct Import {
-  /// Relative to the schema's root.
-  std::string path;
-  Position position;
-};
-
-struct ProtoFile {
-  /// Relative to the schema's root, as imports name it.
-  std::string path;
-  std::string package;
-  std::vector<Import> imports;
-  std::vector<Enumeration> enumerations;
-  /// Each after the messages that it contains.
-  std::vector<MessageType> messages;
+/// A .proto file is refused; what() is "lte/lte.proto:3:5: what is wrong; what to do".
+class Refusal : public std::runtime_error {
+ public:
+  Refusal(const FileDescriptor& file, const SourceLocation& location, const std::string& text);
 };
 
 }  // namespace messagegen

@@ -86,30 +86,46 @@ class Expansion {
   std::string out_;
 };
 
+/// Behind the parenthesis that closes the first one.
+std::size_t endOfCondition(std::string_view statement) {
+  std::size_t end = statement.find('(');
+  int open = 0;
+  do {
+    open += statement[end] == '(' ? 1 : statement[end] == ')' ? -1 : 0;
+    ++end;
+  } while (open > 0);
+  return end;
+}
+
+std::string fitted(std::string_view line) {
+  if (kIndentation.size() + line.size() <= kLineWidth) return std::string(line) + '\n';
+  const bool isStatement = line.starts_with("if (");
+  const std::size_t head = isStatement ? endOfCondition(line) : line.find(" { ");
+  if (head == std::string_view::npos) return std::string(line) + '\n';
+  std::string_view action = line.substr(head + (isStatement ? 1 : 3));
+  if (!isStatement) action.remove_suffix(2);
+  return expand("$head$ {\n  $action$\n}\n",
+                {{"head", std::string(line.substr(0, head))}, {"action", std::string(action)}});
+}
+
 }  // namespace
 
 std::string expand(std::string_view snippet, const Variables& variables) {
   return Expansion(snippet, variables).run();
 }
 
-std::string expandLine(std::string_view snippet, const Variables& variables) {
+std::string expandInline(std::string_view snippet, const Variables& variables) {
   std::string line = expand(snippet, variables);
-  line.pop_back();
+  if (line.ends_with('\n')) line.pop_back();
   return line;
 }
 
-std::string conditional(std::string_view condition, std::string_view statement) {
-  const std::string head = "if (" + std::string(condition) + ") ";
-  const std::string body(statement);
-  if (kIndentation.size() + head.size() + body.size() <= kLineWidth) return head + body + "\n";
-  return head + "{\n" + std::string(kIndentation) + body + "\n}\n";
-}
-
-std::string inlineFunction(std::string_view head, std::string_view statement) {
-  const std::string open = std::string(head) + " {";
-  const std::string body(statement);
-  if (kIndentation.size() + open.size() + body.size() + 3 <= kLineWidth) return open + " " + body + " }\n";
-  return open + "\n" + std::string(kIndentation) + body + "\n}\n";
+std::string expandToFit(std::string_view snippet, const Variables& variables) {
+  const std::string expanded = expand(snippet, variables);
+  std::string out;
+  for (std::string_view rest = expanded; !rest.empty();)
+    out += fitted(takeLine(rest));
+  return out;
 }
 
 }  // namespace messagegen

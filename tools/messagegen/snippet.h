@@ -17,13 +17,11 @@ inline constexpr std::size_t kLineWidth = 120;
 /// takes its line away. Throws std::logic_error that quotes the snippet when it names an unknown variable.
 [[nodiscard]] std::string expand(std::string_view snippet, const Variables& variables);
 
-/// The same for a snippet of one line, without its line feed.
-[[nodiscard]] std::string expandLine(std::string_view snippet, const Variables& variables);
+/// The same for a part of a line.
+[[nodiscard]] std::string expandInline(std::string_view snippet, const Variables& variables);
 
-/// `if (condition) statement`, on one line where it fits.
-[[nodiscard]] std::string conditional(std::string_view condition, std::string_view statement);
-
-/// `head { statement }`, on one line where it fits below a class.
-[[nodiscard]] std::string inlineFunction(std::string_view head, std::string_view statement);
+/// The same for statements `if (condition) action` and functions `head { action }` that will stand indented by one
+/// level: where one is too long for its line, the action gets a line of its own, between braces.
+[[nodiscard]] std::string expandToFit(std::string_view snippet, const Variables& variables);
 
 }  // namespace messagegen

@@ -7,7 +7,7 @@ namespace vesk::handset {
 namespace {
 
 /// dB: the cell reselection hysteresis, and the margin of a handover.
-constexpr double kCellMargin = 6;
+constexpr double kGsmCellMargin = 6;
 
 }  // namespace
 
@@ -31,7 +31,7 @@ std::optional<Departure> GsmMode::step(const Surroundings& now) {
 
 void GsmMode::considerOtherCells(const Surroundings& now, const GsmSignal* signal) {
   const auto& heard = now.radio.gsm();
-  const bool isBetter = !heard.empty() && (signal == nullptr || heard.front().rxLev > signal->rxLev + kCellMargin);
+  const bool isBetter = !heard.empty() && (signal == nullptr || heard.front().rxLev > signal->rxLev + kGsmCellMargin);
   if (betterCell_.hasHeld(isBetter, now.nowMs)) camp(*heard.front().cell, now);
 }
 

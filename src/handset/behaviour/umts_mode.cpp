@@ -9,9 +9,9 @@ using namespace metrics;
 namespace {
 
 /// dBm: below this the handset seeks another technology.
-constexpr double kLeastLevel = -110;
+constexpr double kUmtsLeastLevel = -110;
 /// dB.
-constexpr double kCellMargin = 3;
+constexpr double kUmtsCellMargin = 3;
 
 }  // namespace
 
@@ -46,7 +46,7 @@ std::optional<Departure> UmtsMode::considerLeaving(const Surroundings& now, cons
     changeState(State::KWCDMA_RRC_CONN_STATE_INACTIVE, now, std::nullopt, Release::KRRC_REL_CELL_CHANGED);
     return Departure{Technology::lte, isHandover};
   }
-  const bool isLost = (signal == nullptr || signal->rscp < kLeastLevel) && !isUmtsUsable(now.radio);
+  const bool isLost = (signal == nullptr || signal->rscp < kUmtsLeastLevel) && !isUmtsUsable(now.radio);
   if (outOfReach_.hasHeld(isLost && isGsmUsable(now.radio), now.nowMs)) {
     changeState(State::KWCDMA_RRC_CONN_STATE_INACTIVE, now, std::nullopt,
                 isConnected() ? Release::KRRC_REL_RELEASE_OOSA : Release::KRRC_REL_NO_CELL);
@@ -57,7 +57,7 @@ std::optional<Departure> UmtsMode::considerLeaving(const Surroundings& now, cons
 
 void UmtsMode::considerOtherCells(const Surroundings& now, const UmtsSignal* signal) {
   const auto& heard = now.radio.umts();
-  const bool isBetter = !heard.empty() && (signal == nullptr || heard.front().rscp > signal->rscp + kCellMargin);
+  const bool isBetter = !heard.empty() && (signal == nullptr || heard.front().rscp > signal->rscp + kUmtsCellMargin);
   if (betterCell_.hasHeld(isBetter, now.nowMs)) camp(*heard.front().cell, now);
 }
 

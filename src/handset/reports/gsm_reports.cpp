@@ -11,8 +11,8 @@ using namespace metrics;
 namespace {
 
 /// A call's measurement report has room for six.
-constexpr std::size_t kMostNeighbours = 6;
-constexpr std::size_t kMostOfOtherTechnology = 4;
+constexpr std::size_t kGsmMostNeighbours = 6;
+constexpr std::size_t kGsmMostOfOtherTechnology = 4;
 
 constexpr SysBand kBand = SysBand::SYS_BAND_GSM_PGSM_900;
 constexpr std::uint32_t kBandNumber = static_cast<std::uint32_t>(kBand);
@@ -126,7 +126,7 @@ KCellularGsmCsRfMeasurement makeGsmDedicated(const GsmSignal& serving, Random& r
 KCellularGsmGrrEventMeasCr makeGsmNeighbours(const Radio& radio, const GsmCell& serving) {
   KCellularGsmGrrEventMeasCr report;
   for (const GsmSignal& signal : radio.gsm()) {
-    if (report.gsmNcellMeasCount() == kMostNeighbours) break;
+    if (report.gsmNcellMeasCount() == kGsmMostNeighbours) break;
     if (signal.cell == &serving) continue;
     auto neighbour = std::make_shared<GsmNcellMeas>();
     neighbour->setMcc(kMcc);
@@ -139,7 +139,7 @@ KCellularGsmGrrEventMeasCr makeGsmNeighbours(const Radio& radio, const GsmCell& 
     report.addGsmNcellMeas(std::move(neighbour));
   }
   for (const UmtsSignal& signal : radio.umts()) {
-    if (report.umtsNcellMeasCount() == kMostOfOtherTechnology) break;
+    if (report.umtsNcellMeasCount() == kGsmMostOfOtherTechnology) break;
     auto neighbour = std::make_shared<UmtsNcellMeas>();
     neighbour->setCellType(0);
     neighbour->setCpichSc(signal.cell->scramblingCode);
@@ -149,7 +149,7 @@ KCellularGsmGrrEventMeasCr makeGsmNeighbours(const Radio& radio, const GsmCell& 
     report.addUmtsNcellMeas(std::move(neighbour));
   }
   for (const LteSignal& signal : radio.lte()) {
-    if (report.lteNcellMeasCount() == kMostOfOtherTechnology) break;
+    if (report.lteNcellMeasCount() == kGsmMostOfOtherTechnology) break;
     auto neighbour = std::make_shared<LteNcellMeas>();
     neighbour->setPhysicalCellId(signal.cell->pci);
     neighbour->setBandwidth(signal.cell->carrier->bandwidthCode);

@@ -11,18 +11,18 @@ using namespace metrics;
 
 namespace {
 
-constexpr std::size_t kMostNeighbours = 8;
-constexpr std::size_t kMostOfOtherTechnology = 4;
+constexpr std::size_t kLteMostNeighbours = 8;
+constexpr std::size_t kLteMostOfOtherTechnology = 4;
 
 /// Levels are broadcast in steps of 2 dB.
-constexpr std::int32_t kLeastLevel = -62;
+constexpr std::int32_t kLteLeastLevel = -62;
 constexpr std::int32_t kLeastQuality = -18;
 constexpr std::int32_t kMaxPowerDbm = 23;
 
 std::shared_ptr<NbrEutra> makeNeighbourCarrier(const LteCarrier& carrier) {
   auto neighbour = std::make_shared<NbrEutra>();
   neighbour->setEarfcn(carrier.earfcn);
-  neighbour->setQRxlevMin(kLeastLevel);
+  neighbour->setQRxlevMin(kLteLeastLevel);
   neighbour->setQQualMin(kLeastQuality);
   neighbour->setQOffset(0);
   neighbour->setPmax(kMaxPowerDbm);
@@ -103,7 +103,7 @@ KCellularLteSelReselCellInfo makeLteSelection(const LteCell& serving) {
   info.setMoDataAcBarringFactor(95);
   info.setMoDataAcBarringTime(16);
   info.setMoDataAcBarringForSpecialAc(0);
-  info.setQRxLevMin(kLeastLevel);
+  info.setQRxLevMin(kLteLeastLevel);
   info.setQQualMin(kLeastQuality);
   info.setQHyst(4);
   info.setSNonIntraSearchP(8);
@@ -180,7 +180,7 @@ KCellularLteTxPower makeLteTxPower(const LteSignal& serving, Random& random) {
 KCellularLteNbrEutraCellMeas makeLteNeighbours(const Radio& radio, const LteCell& serving) {
   KCellularLteNbrEutraCellMeas report;
   for (const LteSignal& signal : radio.lte()) {
-    if (report.measNbrEutrasCount() == kMostNeighbours) break;
+    if (report.measNbrEutrasCount() == kLteMostNeighbours) break;
     if (signal.cell == &serving) continue;
     auto neighbour = std::make_shared<EgwErrcNbrEutraMeas>();
     neighbour->setNbrEarfcn(signal.cell->carrier->earfcn);
@@ -196,7 +196,7 @@ KCellularLteNbrEutraCellMeas makeLteNeighbours(const Radio& radio, const LteCell
 KCellularLteNbrInterRatCellMeas makeLteOtherTechnologies(const Radio& radio) {
   KCellularLteNbrInterRatCellMeas report;
   for (const UmtsSignal& signal : radio.umts()) {
-    if (report.measNbrUtrasCount() == kMostOfOtherTechnology) break;
+    if (report.measNbrUtrasCount() == kLteMostOfOtherTechnology) break;
     auto neighbour = std::make_shared<EgwErrcNbrUtraMeas>();
     neighbour->setUarfcn(kUarfcn);
     neighbour->setPsc(signal.cell->scramblingCode);
@@ -205,7 +205,7 @@ KCellularLteNbrInterRatCellMeas makeLteOtherTechnologies(const Radio& radio) {
     report.addMeasNbrUtra(std::move(neighbour));
   }
   for (const GsmSignal& signal : radio.gsm()) {
-    if (report.measNbrGeransCount() == kMostOfOtherTechnology) break;
+    if (report.measNbrGeransCount() == kLteMostOfOtherTechnology) break;
     auto neighbour = std::make_shared<EgwErrcNbrGeranMeas>();
     neighbour->setArfcn(signal.cell->arfcn);
     neighbour->setBsic(signal.cell->bsic);

@@ -10,8 +10,8 @@ using namespace metrics;
 
 namespace {
 
-constexpr std::size_t kMostNeighbours = 6;
-constexpr std::size_t kMostOfOtherTechnology = 4;
+constexpr std::size_t kUmtsMostNeighbours = 6;
+constexpr std::size_t kUmtsMostOfOtherTechnology = 4;
 
 /// Broadcast: the least RSCP in dBm and Ec/N0 in dB.
 constexpr double kLeastRscp = -115;
@@ -61,7 +61,7 @@ KCellularWcdmaSelReselCellInfo makeUmtsSelection(const Radio& radio, const UmtsS
   own->setPrio(kUmtsPriority);
   info.addUtraPrioInfo(std::move(own));
   for (const GsmSignal& signal : radio.gsm()) {
-    if (info.gsmPrioInfosCount() == kMostOfOtherTechnology) break;
+    if (info.gsmPrioInfosCount() == kUmtsMostOfOtherTechnology) break;
     auto frequency = std::make_shared<GsmFreqInfo>();
     frequency->setArfcn(signal.cell->arfcn);
     frequency->setPrio(kGsmPriority);
@@ -108,7 +108,7 @@ KCellularWcdmaTxPower makeUmtsTxPower(const UmtsSignal& serving, Random& random)
 KCellularWcdmaNbrCellMeas makeUmtsNeighbours(const Radio& radio, const UmtsCell& serving) {
   KCellularWcdmaNbrCellMeas report;
   for (const UmtsSignal& signal : radio.umts()) {
-    if (report.measUtraResultsCount() == kMostNeighbours) break;
+    if (report.measUtraResultsCount() == kUmtsMostNeighbours) break;
     if (signal.cell == &serving) continue;
     auto result = std::make_shared<UtraCellMeasResult>();
     result->setUarfcn(kUarfcn);
@@ -119,7 +119,7 @@ KCellularWcdmaNbrCellMeas makeUmtsNeighbours(const Radio& radio, const UmtsCell&
     report.addMeasUtraResult(std::move(result));
   }
   for (const GsmSignal& signal : radio.gsm()) {
-    if (report.measGsmResultsCount() == kMostOfOtherTechnology) break;
+    if (report.measGsmResultsCount() == kUmtsMostOfOtherTechnology) break;
     auto result = std::make_shared<GsmCellMeasResult>();
     result->setArfcn(signal.cell->arfcn);
     result->setBsic(signal.cell->bsic);
@@ -127,7 +127,7 @@ KCellularWcdmaNbrCellMeas makeUmtsNeighbours(const Radio& radio, const UmtsCell&
     report.addMeasGsmResult(std::move(result));
   }
   for (const LteSignal& signal : radio.lte()) {
-    if (report.measLteResultsCount() == kMostOfOtherTechnology) break;
+    if (report.measLteResultsCount() == kUmtsMostOfOtherTechnology) break;
     auto result = std::make_shared<LteCellMeasResult>();
     result->setEarfcn(signal.cell->carrier->earfcn);
     result->setPhyCellId(signal.cell->pci);

@@ -14,35 +14,13 @@ constexpr std::uint64_t tagOf(std::int64_t metricId) {
   return static_cast<std::uint64_t>(metricId) & 0xFFFF;
 }
 
-/// The labels are for the reader of the table. Not every one is the name of a message class.
+/// The labels are for the reader of the table.
 using MetricLabels = std::unordered_map<std::uint64_t, std::string_view>;
 
 const MetricLabels& metricLabels() {
   static const MetricLabels kLabels{
-      {tagOf(K_LTE_RRC_STATE), "KCellularLteRrcState"},
-      {tagOf(K_LTE_CDRX_CONFIG), "KCellularLteCdrxConfig"},
-      {tagOf(K_LTE_RLF), "KCellularLteRadioLinkFailure"},
-      {tagOf(K_LTE_SCELL_INFO), "KCellularLteScellInfo"},
-      {tagOf(K_LTE_SEL_RESEL_INFO), "KCellularLteSelReselCellInfo"},
-      {tagOf(K_LTE_SCELL_MEAS), "KCellularLteServingCellMeasurement"},
-      {tagOf(K_LTE_TX_POWER), "KCellularLteTxPower"},
+      // Of two labels of one metric the first holds. These are not the names of message classes.
       {tagOf(K_LTE_RSRP_RSRQ_SINR), "KCellularRsrpRsrqSinr"},
-      {tagOf(K_LTE_EMM_CTXT), "KCellularEmmContext"},
-      {tagOf(K_LTE_COMPCARR_INFO), "KCellularLteComponentCarrierInfo"},
-      {tagOf(K_LTE_CA_STATUS), "KCellularLteCarrierAggregationStatus"},
-      {tagOf(K_LTE_INTERRAT_MEAS), "KCellularLteNbrInterRatCellMeas"},
-      {tagOf(K_LTE_INTRARAT_MEAS), "KCellularLteNbrEutraCellMeas"},
-      {tagOf(K_CELLULAR_MM_INFO), "KCellularMmCommonInfo"},
-      {tagOf(K_CELLULAR_ACTIVE_BEARER), "KCellularActivatedBearerContexts"},
-      {tagOf(K_UMTS_RRC_STATE), "KCellularWcdmaRrcConnectionState"},
-      {tagOf(K_UMTS_SCELL_INFO), "KCellularWcdmaCellInfo"},
-      {tagOf(K_UMTS_SCELL_MEAS), "KCellularWcdmaScellMeasurement"},
-      {tagOf(K_UMTS_TX_POWER), "KCellularWcdmaTxPower"},
-      {tagOf(K_UMTS_NCELL_MEAS), "KCellularWcdmaNbrCellMeas"},
-      {tagOf(K_UMTS_SEL_RESEL_INFO), "KCellularWcdmaSelReselCellInfo"},
-      {tagOf(K_UMTS_RRC_CONFIG), "KCellularWcdmaRrcConfiguration"},
-      {tagOf(K_CELLULAR_MM_CTXT), "KCellularMmContext"},
-      {tagOf(K_CELLULAR_GMM_CTXT), "KCellularGmmContext"},
       {tagOf(K_GSM_SCELL_INFO), "kCellularGsmScellInfo"},
       {tagOf(K_GSM_IDLE_CONFIG), "kCellularGsmIdleConfig"},
       {tagOf(K_GSM_IDLE_SCELL_MEAS), "kCellularGsmIdleScellMeasurement"},
@@ -50,6 +28,8 @@ const MetricLabels& metricLabels() {
       {tagOf(K_GSM_NCELL_MEAS), "kCellularGsmGrrEventMeasCr"},
       {tagOf(K_GSM_GPRS_CONFIG), "kCellularGsmGprsConfig"},
       {tagOf(K_SIM_FILE_INFO), "kCellularSimCardFiles"},
+#define KNOWN_METRIC(constant, identifier, label) {tagOf(constant), label},
+#include "messages/registry/metrics.def"
   };
   return kLabels;
 }

@@ -72,17 +72,8 @@ bool setUpCharacterLocale() {
   return std::setlocale(LC_CTYPE, "C.UTF-8") != nullptr && isLocaleUtf8();
 }
 
-char32_t codePointOf(std::string_view character) {
-  const auto lead = static_cast<unsigned char>(character[0]);
-  if (lead < 0x80) return lead;
-  auto codePoint = static_cast<char32_t>(lead & (0x7FU >> character.size()));
-  for (const char byte : character.substr(1))
-    codePoint = codePoint << 6 | (static_cast<unsigned char>(byte) & 0x3FU);
-  return codePoint;
-}
-
 int columnWidth(char32_t codePoint) {
-  if (codePoint < 0x20 || (0x7F <= codePoint && codePoint < 0xA0)) return -1;
+  if (isControl(codePoint)) return -1;
   if (codePoint < 0x7F) return 1;
   if (isWithin(codePoint, kLayoutControls)) return -1;
   if (MB_CUR_MAX > 1) return wcwidth(static_cast<wchar_t>(codePoint));

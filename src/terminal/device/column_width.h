@@ -9,9 +9,6 @@ namespace vesk {
 /// when the system has neither: then only ASCII can be shown.
 bool setUpCharacterLocale();
 
-/// The code point of one well-formed UTF-8 character.
-[[nodiscard]] char32_t codePointOf(std::string_view character);
-
 /// The columns that a printable character takes: 1, 2, or 0 for a mark that combines with the one before.
 /// -1 for a character that must not reach a terminal: controls, and those that turn the direction of text.
 /// The C library's answer where the locale is a UTF-8 one, a coarse table's elsewhere.

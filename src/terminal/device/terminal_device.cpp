@@ -5,7 +5,6 @@
 #include <cerrno>
 #include <chrono>
 #include <fcntl.h>
-#include <poll.h>
 #include <sys/epoll.h>
 #include <sys/ioctl.h>
 #include <sys/timerfd.h>
@@ -47,6 +46,7 @@ std::optional<FileDescriptor> TerminalDevice::openControllingTerminal() {
 
 TerminalDevice::TerminalDevice(FileDescriptor terminal, Switches switches)
     : terminal_(std::move(terminal)),
+      writer_(FileDescriptor::borrowed(terminal_.get())),
       events_(epoll_create1(EPOLL_CLOEXEC)),
       timer_(timerfd_create(CLOCK_MONOTONIC, TFD_NONBLOCK | TFD_CLOEXEC)),
       switches_(std::move(switches)) {
@@ -79,7 +79,8 @@ void TerminalDevice::enter() {
 void TerminalDevice::leave() {
   terminal_signals::disarm();
   write(switches_.leave);
-  waitForTerminal();
+  writeOn(kPatience);
+  unwritten_.clear();
   setModes(terminal_.get(), original_);
 }
 
@@ -93,7 +94,7 @@ TerminalDevice::Arrived TerminalDevice::receive() {
   std::uint64_t expirations = 0;
   [[maybe_unused]] const ssize_t ticks = read(timer_.get(), &expirations, sizeof expirations);
   signalled_.clear();
-  writeOn();
+  writeOn(Clock::Duration::zero());
   const auto [isResized, isStopWanted, isContinued] = terminal_signals::take();
   Arrived arrived{.bytes = {}, .isResized = isResized, .isStopWanted = isStopWanted, .isContinued = isContinued};
 
@@ -131,40 +132,22 @@ Size TerminalDevice::size() const {
 
 void TerminalDevice::write(std::string_view bytes) {
   unwritten_ += bytes;
-  writeOn();
+  writeOn(Clock::Duration::zero());
 }
 
-void TerminalDevice::writeOn() {
+void TerminalDevice::writeOn(Clock::Duration patience) {
   if (unwritten_.empty()) return;
-  std::string_view rest = unwritten_;
-  bool hasRoom = true;
-  while (!rest.empty() && hasRoom && !isGone_) {
-    const ssize_t written = ::write(terminal_.get(), rest.data(), rest.size());
-    if (written >= 0) {
-      rest.remove_prefix(static_cast<std::size_t>(written));
-    } else if (errno == EAGAIN) {
-      hasRoom = false;
-    } else if (errno != EINTR) {
-      isGone_ = true;
-    }
+  std::size_t taken = unwritten_.size();
+  if (!isGone_) {
+    const auto written = writer_.write(unwritten_, {.end = std::chrono::steady_clock::now() + patience});
+    isGone_ = written.outcome == DescriptorWriter::Outcome::failed;
+    if (!isGone_) taken = written.count;
   }
-  unwritten_.erase(0, isGone_ ? unwritten_.size() : unwritten_.size() - rest.size());
+  unwritten_.erase(0, taken);
   epoll_event event{};
   event.events = unwritten_.empty() ? EPOLLIN : EPOLLIN | EPOLLOUT;
   event.data.fd = terminal_.get();
   epoll_ctl(events_.get(), EPOLL_CTL_MOD, terminal_.get(), &event);
-}
-
-/// Until it has taken everything, or is given up.
-void TerminalDevice::waitForTerminal() {
-  using std::chrono::steady_clock;
-  const steady_clock::time_point deadline = steady_clock::now() + kPatience;
-  while (isBehind()) {
-    const int wait = pollTimeout(deadline - steady_clock::now());
-    pollfd polled{terminal_.get(), POLLOUT, 0};
-    if (wait == 0 || poll(&polled, 1, wait) == 0) unwritten_.clear();
-    writeOn();
-  }
 }
 
 }  // namespace vesk

@@ -6,6 +6,7 @@
 #include <termios.h>
 
 #include "system/clock.h"
+#include "system/descriptor_writer.h"
 #include "system/file_descriptor.h"
 #include "system/wake_up.h"
 #include "terminal/device/grid.h"
@@ -66,10 +67,11 @@ class TerminalDevice {
  private:
   void leave();
   void watch(int descriptor);
-  void writeOn();
-  void waitForTerminal();
+  /// Writes what the terminal takes, waiting for it no longer than `patience` in all.
+  void writeOn(Clock::Duration patience);
 
   FileDescriptor terminal_;
+  DescriptorWriter writer_;
   FileDescriptor events_;
   FileDescriptor timer_;
   WakeUp signalled_;

@@ -2,7 +2,6 @@
 
 #include <utility>
 
-#include "terminal/device/column_width.h"
 #include "terminal/input/input_sequence.h"
 #include "values/utf8.h"
 

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "values/utf8.h"
+
 namespace vesk {
 
 namespace {
@@ -28,24 +30,6 @@ const KeyBinding kBindings[] = {
     {Action::Last, {{Key::End}}, "", "the last row"},
 };
 
-void appendCharacter(std::string& out, char32_t character) {
-  if (character < 0x80) {
-    out += static_cast<char>(character);
-  } else if (character < 0x800) {
-    out += static_cast<char>(0xC0 | character >> 6);
-    out += static_cast<char>(0x80 | (character & 0x3F));
-  } else if (character < 0x10000) {
-    out += static_cast<char>(0xE0 | character >> 12);
-    out += static_cast<char>(0x80 | (character >> 6 & 0x3F));
-    out += static_cast<char>(0x80 | (character & 0x3F));
-  } else {
-    out += static_cast<char>(0xF0 | character >> 18);
-    out += static_cast<char>(0x80 | (character >> 12 & 0x3F));
-    out += static_cast<char>(0x80 | (character >> 6 & 0x3F));
-    out += static_cast<char>(0x80 | (character & 0x3F));
-  }
-}
-
 }  // namespace
 
 std::span<const KeyBinding> keyBindings() {
@@ -67,7 +51,7 @@ std::string nameOf(const BoundKey& key) {
   switch (key.key) {
     case Key::Character: {
       std::string name;
-      appendCharacter(name, key.character);
+      appendCodePoint(name, key.character);
       return name;
     }
     case Key::Enter:

@@ -3,19 +3,14 @@
 #include <algorithm>
 #include <utility>
 
+#include "values/ascii.h"
+
 namespace vesk {
 
 namespace {
 
-char lowered(char letter) {
-  return 'A' <= letter && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
-}
-
 bool contains(const std::optional<Text>& text, std::string_view part) {
-  if (!text) return false;
-  const std::string_view whole = text->view();
-  return std::search(whole.begin(), whole.end(), part.begin(), part.end(),
-                     [](char a, char b) { return lowered(a) == lowered(b); }) != whole.end();
+  return text && containsIgnoringCase(text->view(), part);
 }
 
 }  // namespace
