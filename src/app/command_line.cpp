@@ -20,6 +20,7 @@
 #include "app/report_command.h"
 #include "app/run_command.h"
 #include "app/series_command.h"
+#include "app/serve_command.h"
 #include "app/show_command.h"
 #include "app/simulate_command.h"
 #include "app/stores_command.h"
@@ -99,6 +100,7 @@ class CommandLine {
     addSeries();
     addReadings();
     addReport();
+    addServe();
     addRedact();
     addSimulate();
   }
@@ -124,42 +126,72 @@ class CommandLine {
 
  private:
   void addRunOptions() {
-    CLI::Option* replay =
-        program_.add_option("--replay", run_.source.replay, "Feed it a recording, not simulated events; - is stdin")
-            ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
-    program_
+    addSourceOptions(program_, run_.source);
+    addRedactOption(program_, run_.isRedacted);
+    addRuleOptions(program_, run_.rules);
+    addDurationOption(program_, run_.duration);
+    addLogOption(program_, kProgramLog);
+    program_.callback([this] {
+      if (program_.get_subcommands().empty()) command_ = [this] { return runProgram(run_); };
+    });
+  }
+
+  /// Where the events of a running program come from.
+  static void addSourceOptions(CLI::App& command, SourceOptions& source) {
+    CLI::Option* replay =
+        command.add_option("--replay", source.replay, "Feed it a recording, not simulated events; - is stdin")
+            ->type_name("FILE");
+    command
         .add_option_function<std::string>(
             "--speed",
-            [this](const std::string& text) {
-              if (parseSpeed(text, run_.source.playback.speed)) return;
+            [&source](const std::string& text) {
+              if (parseSpeed(text, source.playback.speed)) return;
               throw CLI::ValidationError("--speed", "expected a positive number or max, got " + text);
             },
             "Replay so many seconds in one: a number, or max")
         ->type_name("N")
         ->default_str("1")
         ->needs(replay);
-    program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")
+    command.add_option("--seed", source.seed, "Which drive of the simulated handset")
         ->type_name("N")
         ->check(CLI::NonNegativeNumber.description(""))
         ->excludes(replay);
-    program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
-    addRedactOption(program_, run_.isRedacted);
-    addRuleOptions(program_, run_.rules);
-    program_
+    command.add_flag("--loop", source.playback.loops, "Replay from the start again at the end")->needs(replay);
+  }
+
+  static void addDurationOption(CLI::App& command, std::optional<std::chrono::nanoseconds>& duration) {
+    command
         .add_option_function<double>(
             "--seconds",
-            [this](double seconds) {
-              run_.duration =
-                  std::chrono::duration_cast<std::chrono::nanoseconds>(std::chrono::duration<double>(seconds));
+            [&duration](double seconds) {
+              duration = std::chrono::duration_cast<std::chrono::nanoseconds>(std::chrono::duration<double>(seconds));
             },
             "End after that many seconds")
         ->type_name("N")
         ->check(secondsFrom(0.001));
-    addLogOption(program_, kProgramLog);
-    program_.callback([this] {
-      if (program_.get_subcommands().empty()) command_ = [this] { return runProgram(run_); };
-    });
+  }
+
+  void addServe() {
+    CLI::App* serve = program_.add_subcommand("serve", "Show the live page to browsers, and metrics to Prometheus");
+    serve->add_option("--port", serve_.server.port, "Where; 0 for any that is free")
+        ->type_name("N")
+        ->default_str("8080");
+    serve
+        ->add_option("--bind", serve_.server.address,
+                     "The address to listen on; on any but 127.0.0.1 others can read all that the handset tells")
+        ->type_name("ADDRESS")
+        ->default_str("127.0.0.1");
+    serve->add_option("--host", serve_.server.names, "A name of this machine that browsers may ask for")
+        ->type_name("NAME")
+        ->allow_extra_args(false);
+    addSourceOptions(*serve, serve_.source);
+    addRedactOption(*serve, serve_.isRedacted);
+    addRuleOptions(*serve, serve_.rules);
+    addDurationOption(*serve, serve_.duration);
+    addLogOption(*serve, kDataLog);
+    serve->footer(kServeExamples);
+    serve->final_callback([this] { command_ = [this] { return runServe(serve_); }; });
   }
 
   void addDecode() {
@@ -231,7 +263,8 @@ class CommandLine {
   void addReport() {
     CLI::App* report = program_.add_subcommand("report", "Write what a drive was as one HTML page");
     addRecording(*report, report_.input);
-    report->add_option("-o,--output", report_.output, "The file to write; standard output without it")->type_name("OUT");
+    report->add_option("-o,--output", report_.output, "The file to write; standard output without it")
+        ->type_name("OUT");
     addLogOption(*report, kDataLog);
     report->footer(kReportExamples);
     report->final_callback([this] { command_ = [this] { return runReport(report_); }; });
@@ -354,6 +387,7 @@ class CommandLine {
   RecordingInput input_;
   TimelineOptions timeline_;
   ReportOptions report_;
+  ServeOptions serve_;
   bool asJson_ = false;
   bool asCsv_ = false;
   std::optional<std::string> logTo_;

@@ -9,7 +9,7 @@ namespace vesk {
 std::optional<insight::Reading> readingOfRow(std::string_view area, std::string_view category, std::size_t section,
                                              std::size_t row) {
   const CategorySource& source = sourceOf(area, category);
-  const RecordList records = shownRecords(source, *MetricValidator::shared());
+  const RecordList records = shownRecords(source, MetricValidator::shared()->stores);
   if (section >= records.size() || row >= records[section].size()) return std::nullopt;
   const Record& record = records[section];
   return insight::readingOf(messageClassOf(source), record, record.begin()[row]);

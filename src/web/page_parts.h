@@ -14,6 +14,7 @@ struct PagePart {
 /// HTML with {{policy}}, {{style}}, {{drive}} and {{script}} where these belong.
 extern const PagePart kPageHtml;
 extern const PagePart kPageStyle;
+extern const PagePart kPageIcon;
 /// The charts of dygraphs, then the page's own script.
 extern const PagePart kChartScript;
 extern const PagePart kPageScript;

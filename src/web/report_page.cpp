@@ -69,7 +69,8 @@ void writeReport(const Report& report, const std::function<void(std::string_view
   fillIn(kPageHtml.content, write, [&](std::string_view mark) {
     if (mark == "policy") write(policyOfReport());
     if (mark == "style") inElement("<style>", kPageStyle.content, "</style>");
-    if (mark == "drive") inElement("<script type=\"application/json\" id=\"report\">", driveOfReport(report), "</script>");
+    if (mark == "drive")
+      inElement("<script type=\"application/json\" id=\"report\">", driveOfReport(report), "</script>");
     if (mark != "script") return;
     inElement("<script>", kChartScript.content, "</script>\n");
     inElement("<script>", kPageScript.content, "</script>");

@@ -10,6 +10,9 @@ const chartGroups = [
   {title: 'RXQUAL', unit: '', names: ['gsm.rxqual']},
 ];
 
+// The legends stand above the charts; the library's own brings style attributes, which the page's policy forbids.
+Dygraph.PLUGINS = Dygraph.PLUGINS.filter((plugin) => plugin !== Dygraph.Plugins.Legend);
+
 const tickSteps = [0.1, 0.2, 0.5, 1, 2, 5, 10, 15, 30, 60, 120, 300, 600, 900, 1800, 3600, 7200, 10800, 21600, 43200, 86400,
   172800, 432000, 864000, 2592000, 8640000].map((seconds) => 1000 * seconds);
 
@@ -79,7 +82,6 @@ class Chart {
     this.graph = new Dygraph(this.plot, this.rows, {
       labels: ['position', ...this.names],
       ...this.looks(),
-      legend: 'never',
       connectSeparatedPoints: true,
       drawGapEdgePoints: true,
       axisLabelFontSize: 12,
@@ -94,7 +96,6 @@ class Chart {
       drawCallback: (graph, isFirst) => { if (!isFirst) this.charts.follow(this); },
       zoomCallback: () => this.charts.zoomed(),
     });
-    // Its canvas tells a reader nothing that the label does not.
     this.plot.append(this.cursor);
   }
 
@@ -177,16 +178,18 @@ class Chart {
 }
 
 class Charts {
-  constructor(section, drive) {
+  /** `trail`, in milliseconds, is how much of the end shows at first and is followed; without it the whole drive does. */
+  constructor(section, drive, trail) {
     this.section = section;
     this.drive = drive;
+    this.trail = trail;
     this.charts = [];
-    /** What of the drive shows: positions; null for all of it. */
+    /** What of the drive shows, as positions; null for the whole drive or, with a trail, its end. */
     this.window = null;
     this.isFollowing = false;
     this.moment = element('p', {id: 'moment', class: 'quiet', 'aria-live': 'polite'});
     this.controls = element('div', {class: 'row', role: 'group', 'aria-label': 'What the charts show'},
-      button('whole drive', () => this.show(null)),
+      button('whole drive', () => this.showWhole()), trail ? button('now', () => this.showTrail(trail)) : '',
       button('+', () => this.zoom(0.5), {'aria-label': 'zoom in'}), button('−', () => this.zoom(2), {'aria-label': 'zoom out'}),
       button('◀', () => this.move(-0.5), {'aria-label': 'earlier'}), button('▶', () => this.move(0.5), {'aria-label': 'later'}),
       element('ul', {class: 'legend'}, ...[['change', 'cell change'], ['reestablished', 're-establishment'], ['drop', 'drop'], ['gap', 'gap in time']]
@@ -206,7 +209,7 @@ class Charts {
       .filter(([, names]) => names.length > 0);
     const layout = JSON.stringify(groups.map(([, names]) => names));
     if (layout === this.layout) {
-      const window = this.window || [0, Math.max(this.drive.end, 1)];
+      const window = this.range();
       this.isFollowing = true;
       for (const chart of this.charts) chart.update(window);
       this.isFollowing = false;
@@ -223,7 +226,7 @@ class Charts {
 
   show(window) {
     this.window = window;
-    const shown = window || [0, Math.max(this.drive.end, 1)];
+    const shown = this.range();
     this.isFollowing = true;
     for (const chart of this.charts) chart.graph.updateOptions({dateWindow: shown});
     this.isFollowing = false;
@@ -241,11 +244,21 @@ class Charts {
   /** A double click unzooms a chart: then all of them show the whole drive. */
   zoomed() {
     if (this.charts.some((chart) => chart.graph.isZoomed('x'))) return;
+    this.showWhole();
+  }
+
+  showWhole() {
+    this.trail = null;
+    this.show(null);
+  }
+
+  showTrail(trail) {
+    this.trail = trail;
     this.show(null);
   }
 
   range() {
-    return this.window || [0, Math.max(this.drive.end, 1)];
+    return this.window || [this.trail ? Math.max(this.drive.end - this.trail, 0) : 0, Math.max(this.drive.end, 1)];
   }
 
   zoom(factor) {
@@ -253,7 +266,7 @@ class Charts {
     const isPointInView = this.pointed >= from && this.pointed <= to;
     const middle = isPointInView ? this.pointed : (from + to) / 2;
     const width = Math.max((to - from) * factor, 1000);
-    if (width >= this.drive.end) return this.show(null);
+    if (width >= this.drive.end) return this.showWhole();
     return this.clamped(middle - width / 2, width);
   }
 
@@ -270,7 +283,7 @@ class Charts {
   keyPressed(event) {
     const actions = {
       ArrowLeft: () => this.move(-0.25), ArrowRight: () => this.move(0.25), '+': () => this.zoom(0.5), '=': () => this.zoom(0.5),
-      '-': () => this.zoom(2), '0': () => this.show(null), Home: () => this.clamped(0, this.range()[1] - this.range()[0]),
+      '-': () => this.zoom(2), '0': () => this.showWhole(), Home: () => this.clamped(0, this.range()[1] - this.range()[0]),
       End: () => this.clamped(this.drive.end, this.range()[1] - this.range()[0]),
     };
     if (event.ctrlKey || event.altKey || event.metaKey || !actions[event.key]) return;

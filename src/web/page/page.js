@@ -15,4 +15,4 @@ function startReport(report) {
 
 const reportData = byId('report');
 if (reportData) startReport(JSON.parse(reportData.textContent));
-else startLive();
+else new LivePage().start();
