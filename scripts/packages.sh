@@ -11,6 +11,7 @@ build     g++                 g++
 build     rapidjson-dev       /usr/include/rapidjson/reader.h
 build     libcli11-dev        /usr/include/CLI/CLI.hpp
 build     libncurses-dev      /usr/include/ncursesw/curses.h
+build     libjs-dygraphs      /usr/share/javascript/dygraphs/dygraph.min.js
 build     protobuf-compiler   protoc
 build     libprotobuf-dev     /usr/include/google/protobuf/message.h
 build     libprotoc-dev       /usr/include/google/protobuf/compiler/plugin.h
@@ -28,6 +29,12 @@ readme    bsdutils            script
 readme    protobuf-compiler   protoc
 load      time                /usr/bin/time
 load      diffutils           cmp
+page      chromium            chromium
+page      chromium-driver     chromedriver
+page      python3             python3
+metrics   prometheus          prometheus
+metrics   curl                curl
+metrics   jq                  jq
 shell     shellcheck          shellcheck
 '
 

@@ -15,7 +15,7 @@ using insight::Kpi;
 using insight::KpiDescription;
 using insight::writeField;
 
-constexpr std::array<std::string_view, kMarkCount> kMarkNames{"change", "reestablished", "drop"};
+constexpr std::array<std::string_view, kMarkCount> kMarkNames{"change", "reestablished", "drop", "technology"};
 
 /// Writes one JSON array of numbers, pair by pair.
 class Pairs {

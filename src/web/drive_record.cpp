@@ -11,6 +11,7 @@ std::optional<Mark> markOf(const insight::TimelineEvent& event) {
   using insight::EventKind;
   if (event.kind == EventKind::drop) return Mark::drop;
   if (event.kind == EventKind::reestablished) return Mark::reestablishment;
+  if (event.kind == EventKind::technology) return Mark::technologyChange;
   const auto* change = std::get_if<insight::CellChange>(&event.fields);
   return change != nullptr && change->from ? std::optional(Mark::cellChange) : std::nullopt;
 }

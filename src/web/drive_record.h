@@ -43,8 +43,8 @@ struct MarkPoint {
 };
 
 /// The kinds of marks in a chart.
-enum class Mark : std::uint8_t { cellChange, reestablishment, drop };
-inline constexpr std::size_t kMarkCount = 3;
+enum class Mark : std::uint8_t { cellChange, reestablishment, drop, technologyChange };
+inline constexpr std::size_t kMarkCount = 4;
 
 /// Where a stretch of the drive begins: its charts run over counted time, without the gaps between.
 struct StretchBegin {

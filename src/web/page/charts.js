@@ -41,7 +41,8 @@ function chartRows(drive, names) {
       points.push([series[at], column, series[at + 1]]);
       const next = series[at + 2];
       if (next === undefined) continue;
-      const isBroken = next - series[at] > longest || drive.stretchAt(next) !== drive.stretchAt(series[at]);
+      const isBroken = next - series[at] > longest || drive.stretchAt(next) !== drive.stretchAt(series[at]) ||
+        drive.changesTechnology(series[at], next);
       if (isBroken) points.push([series[at] + 1, column, NaN]);
     }
   });
@@ -93,10 +94,15 @@ class Chart {
       },
       underlayCallback: (context, area, graph) => this.underlay(context, area, graph),
       highlightCallback: (event, position) => this.charts.pointAt(position),
-      drawCallback: (graph, isFirst) => { if (!isFirst) this.charts.follow(this); },
+      drawCallback: (graph, isFirst) => { if (!isFirst) this.drawn(); },
       zoomCallback: () => this.charts.zoomed(),
     });
     this.plot.append(this.cursor);
+  }
+
+  drawn() {
+    if (this.charts.pointed !== undefined) this.pointAt(this.charts.pointed);
+    this.charts.follow(this);
   }
 
   looks() {
@@ -105,6 +111,7 @@ class Chart {
       gridLineColor: color('grid'),
       axisLineColor: color('line'),
       strokeWidth: 1.3,
+      yRangePad: 6,
     };
   }
 
@@ -230,7 +237,6 @@ class Charts {
     this.isFollowing = true;
     for (const chart of this.charts) chart.graph.updateOptions({dateWindow: shown});
     this.isFollowing = false;
-    if (this.pointed !== undefined) this.pointAt(this.pointed);
   }
 
   /** A chart was zoomed or moved by hand: the others do the same. */
@@ -294,7 +300,7 @@ class Charts {
   /** Shows the half minutes before and after a position, and what held there. */
   showMoment(position) {
     const width = Math.min(this.range()[1] - this.range()[0], 2 * knownFor);
-    this.pointed = position;
+    this.pointAt(position);
     this.clamped(position - width / 2, width);
     this.section.scrollIntoView();
   }
@@ -317,7 +323,9 @@ class Charts {
       else high = middle;
     }
     if (low < 0 || position - series[2 * low] > knownFor) return null;
-    return this.drive.stretchAt(series[2 * low]) === this.drive.stretchAt(position) ? series[2 * low + 1] : null;
+    const isForgotten = this.drive.stretchAt(series[2 * low]) !== this.drive.stretchAt(position) ||
+      this.drive.changesTechnology(series[2 * low], position);
+    return isForgotten ? null : series[2 * low + 1];
   }
 
   /** Full units of time: of the day where the drive is one stretch, else of the drive. */

@@ -56,6 +56,19 @@ class Drive {
     return this.stretches.filter((_, at) => at % 2 === 0).slice(1);
   }
 
+  /** Whether the technology changed after one position, up to the other: values are not known across it. */
+  changesTechnology(after, upTo) {
+    const changes = this.marks.technology;
+    let low = -1;
+    let high = changes.length;
+    while (high - low > 1) {
+      const middle = (low + high) >> 1;
+      if (changes[middle] <= after) low = middle;
+      else high = middle;
+    }
+    return high < changes.length && changes[high] <= upTo;
+  }
+
   /** The name of the cell that serves there; null for none. */
   cellAt(position) {
     let cell = -1;
