@@ -26,11 +26,13 @@ class Overview {
       this.graded(`${{LTE: 'lte.rsrp', UMTS: 'umts.rscp', GSM: 'gsm.rxlev'}[cell.technology]}`, cell.level),
       this.graded(`${{LTE: 'lte.rsrq', UMTS: 'umts.ecno'}[cell.technology]}`, cell.quality),
       rounded(cell.difference, 0), duration(Math.max(cell.age_ms, 0))]);
+    const scrolled = this.section.querySelector('.table')?.scrollLeft || 0;
     fill(this.section, element('div', {class: 'kpis'}, ...tiles),
       facts([['time (UTC)', now.time === null ? null : dateAndTime(now.time).slice(0, 19)], ['technology', now.technology],
         ['cell', now.cell], ['RRC', words(now.rrc)], ['area', now.area], ['EMM', words(now.emm)], ['MM', words(now.mm)],
         ['GMM', words(now.gmm)], ['events', grouped(now.events)]]),
       table(columns, rows, 'Cells heard'));
+    this.section.querySelector('.table').scrollLeft = scrolled;
   }
 
   graded(name, value) {
