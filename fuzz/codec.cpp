@@ -1,38 +1,15 @@
 // The first byte names a message class, the others are a payload for it.
 
-#include <algorithm>
-
-#include "messages/message_classes.h"
-#include "messages/wire_model.h"
+#include "message_properties.h"
 #include "property.h"
 #include "support/allocations.h"
-#include "values/text_form.h"
+#include "wire_model.h"
 
 namespace vesk {
-
 namespace {
 
 using Payload = std::span<const std::uint8_t>;
 using Message = std::shared_ptr<ProtoCodable>;
-
-/// Equal, and in the same order.
-bool isSame(const Dictionary& a, const Dictionary& b) {
-  return a == b && textOf(a) == textOf(b);
-}
-
-void requireSame(const ProtoCodable& a, const ProtoCodable& b) {
-  require(a.isEqual(b) && b.isEqual(a), "both are equal");
-  require(a.hash() == b.hash(), "equal messages have equal hashes");
-  require(isSame(a.dictionaryRepresentation(), b.dictionaryRepresentation()), "equal messages show the same");
-}
-
-void checkJson(const ProtoCodable& message) {
-  std::string direct;
-  message.appendJson(direct);
-  std::string ofDictionary;
-  appendJson(ofDictionary, message.dictionaryRepresentation());
-  require(direct == ofDictionary, "the JSON of a message is that of its dictionary");
-}
 
 Message decodeWithinBounds(const MessageClass& messageClass, Payload payload) {
   // The smallest element is two bytes of the wire, the largest object some hundred bytes of memory, and a list that
@@ -45,31 +22,6 @@ Message decodeWithinBounds(const MessageClass& messageClass, Payload payload) {
   require(allocatedBytes() - before <= kMostForNone + kMostForAByte * payload.size(),
           "the memory that reading takes is in proportion to the input");
   return message;
-}
-
-void checkWriting(const MessageClass& messageClass, const ProtoCodable& message, std::size_t payloadSize) {
-  ProtoWriter writer;
-  message.writeTo(writer);
-  const Payload written = writer.written();
-  // A negative int32 may come in five bytes and goes in ten; nothing else grows.
-  require(written.size() <= 2 * payloadSize, "a message is written in at most twice the bytes it came in");
-  const Message again = messageClass.decode(written);
-  require(again != nullptr, "what was written can be read");
-  requireSame(*again, message);
-  ProtoWriter second;
-  again->writeTo(second);
-  require(std::equal(written.begin(), written.end(), second.written().begin(), second.written().end()),
-          "what was read from written bytes is written in the same bytes");
-}
-
-void checkCopies(const MessageClass& messageClass, const ProtoCodable& message) {
-  requireSame(*messageClass.deepCopy(message), message);
-  const Message copied = messageClass.decode({});
-  messageClass.copyTo(message, *copied);
-  requireSame(*copied, message);
-  const Message merged = messageClass.decode({});
-  messageClass.merge(message, *merged);
-  requireSame(*merged, message);
 }
 
 /// In a section keyed by a metric that no class declares.
@@ -90,12 +42,12 @@ void checkCodec(const MessageClass& messageClass, Payload payload) {
   if (message == nullptr) return;
   require(isSame(message->dictionaryRepresentation(), *modelled), "the reader reads what the rules of the wire say");
   checkJson(*message);
+  checkFields(messageClass, payload);
   checkWriting(messageClass, *message, payload.size());
   checkCopies(messageClass, *message);
 }
 
 }  // namespace
-
 }  // namespace vesk
 
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {

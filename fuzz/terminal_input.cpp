@@ -1,81 +1,16 @@
 // The first bytes say how large the terminal is and how its input is cut; the others are what it sends.
 
-#include <algorithm>
 #include <bit>
-#include <vector>
 
-#include "property.h"
+#include "keyboard.h"
+#include "odd_interface.h"
 #include "shown.h"
-#include "support/allocations.h"
-#include "support/fake_interface.h"
 #include "support/pictures.h"
-#include "terminal/input/input_machine.h"
 
 namespace vesk {
-
 namespace {
 
-using namespace std::chrono_literals;
-
-using Events = std::vector<InputEvent>;
-
 constexpr auto kAlmostAnEscape = InputMachine::kLoneEscape - 1ms;
-
-/// An input machine and the clock that it is told the time of.
-class Keyboard {
- public:
-  void send(std::string_view bytes) { machine_.feed(bytes, now_, events_); }
-  void wait(Clock::Duration time) {
-    now_ += time;
-    machine_.advance(now_, events_);
-  }
-  /// Until whatever was begun is given up.
-  void pause() { wait(InputMachine::kUnfinishedSequence); }
-
-  [[nodiscard]] bool isWaiting() const { return machine_.deadline().has_value(); }
-  [[nodiscard]] const Events& events() const { return events_; }
-
- private:
-  InputMachine machine_;
-  Clock::Instant now_{1h};
-  Events events_;
-};
-
-void requireMeaningful(const InputEvent& event) {
-  if (const auto* key = std::get_if<KeyEvent>(&event)) {
-    const bool isSurrogate = 0xD800 <= key->character && key->character <= 0xDFFF;
-    require(key->character <= 0x10FFFF && !isSurrogate, "a key types a character");
-    require((key->key == Key::Character) == (key->character != 0), "only character keys type");
-  } else {
-    const auto& mouse = std::get<MouseEvent>(event);
-    require(mouse.column >= 0 && mouse.line >= 0, "the mouse is in the terminal");
-  }
-}
-
-/// Sent as a whole and given time.
-Events eventsOf(std::string_view bytes) {
-  Keyboard keyboard;
-  const std::uint64_t before = allocatedBytes();
-  keyboard.send(bytes);
-  require(allocatedBytes() - before <= 1024 + 4 * sizeof(InputEvent) * keyboard.events().size(),
-          "what a sequence has collected is bounded");
-  if (!keyboard.isWaiting()) {
-    Keyboard same = keyboard;
-    same.pause();
-    require(same.events() == keyboard.events(), "a machine that waits for nothing has nothing");
-  }
-  keyboard.pause();
-  require(!keyboard.isWaiting(), "nothing is waited for for ever");
-  require(keyboard.events().size() <= bytes.size(), "an event takes at least a byte");
-  std::for_each(keyboard.events().begin(), keyboard.events().end(), requireMeaningful);
-
-  Events expected = keyboard.events();
-  expected.emplace_back(KeyEvent{.character = 'q'});
-  keyboard.send("q");
-  require(keyboard.events() == expected, "after a pause a key is that key");
-  expected.pop_back();
-  return expected;
-}
 
 void checkInput(std::string_view bytes, std::size_t pieceSize) {
   const Events whole = eventsOf(bytes);
@@ -89,51 +24,19 @@ void checkInput(std::string_view bytes, std::size_t pieceSize) {
 
   const std::size_t middle = std::min(pieceSize, bytes.size());
   Events apart = eventsOf(bytes.substr(0, middle));
-  const Events behind = eventsOf(bytes.substr(middle));
-  apart.insert(apart.end(), behind.begin(), behind.end());
+  for (const InputEvent& event : eventsOf(bytes.substr(middle)))
+    apart.push_back(event);
   Keyboard pausing;
-  pausing.send(bytes.substr(0, middle));
-  pausing.pause();
-  pausing.send(bytes.substr(middle));
-  pausing.pause();
-  require(pausing.events() == apart, "a pause ends a sequence");
-}
-
-/// Values as no metric should have them.
-class OddFields : public FakeTableScreen {
- public:
-  OddFields() {
-    content = {{"many"_text, {}}, {std::nullopt, {}}, {"odd"_text, {}}};
-    for (int index = 0; index < 30; ++index)
-      content[0].rows.push_back(row("row " + std::to_string(index), "1"));
-    content[2].rows = {
-        row("lines", "first\nsecond \x1B[31m\n\n- third"),
-        row("", ""),
-        row(std::string(300, 'k'), std::string(2000, 'v')),
-        row("漢字漢字", "e\u0301\u202E📶\xC3\x80\xFF\t\x9B"),
-        {std::nullopt, "alone"_text},
-    };
+  for (const std::string_view piece : {bytes.substr(0, middle), bytes.substr(middle)}) {
+    pausing.send(piece);
+    pausing.pause();
   }
-};
-
-const InterfaceLayout& layout() {
-  static const InterfaceLayout theLayout({
-      .rootStack = makeStackOf<NavigationController>,
-      .firstScreen = "Areas",
-      .screens = {{"Areas", makeScreenOf<FakeAreas>, "Vesk"},
-                  {"Categories", makeScreenOf<FakeCategories>, ""},
-                  {"Fields", makeScreenOf<OddFields>, ""}},
-      .cells = {{"LaunchView", CellStyle::Basic, CellAccessory::Disclosure},
-                {"FirstClickView", CellStyle::Basic, CellAccessory::Disclosure},
-                {"SecondClickView", CellStyle::RightDetail, CellAccessory::None}},
-      .transitions = {{"Areas", "showArea", "Categories"}, {"Categories", "showCategory", "Fields"}},
-  });
-  return theLayout;
+  require(pausing.events() == apart, "a pause ends a sequence");
 }
 
 /// Whatever is typed, there is something to see.
 void checkScreens(const Events& events, Size size) {
-  const std::shared_ptr<NavigationController> stack = layout().makeRootStack();
+  const std::shared_ptr<NavigationController> stack = oddInterface().makeRootStack();
   stack->loadViewIfNeeded();
   DiagnosticLines diagnostics(20);
   diagnostics.append("Metric ID in Hex =  3C4E04");
@@ -145,13 +48,11 @@ void checkScreens(const Events& events, Size size) {
     // A look takes much longer than an event: few of them, most at the start.
     if (std::has_single_bit(index + 1)) requireDrawable(desk.grid(), size);
   }
-  std::swap(size.columns, size.lines);
-  desk.resize(size);
-  requireDrawable(desk.grid(), size);
+  desk.resize({size.lines, size.columns});
+  requireDrawable(desk.grid(), {size.lines, size.columns});
 }
 
 }  // namespace
-
 }  // namespace vesk
 
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {

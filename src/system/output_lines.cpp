@@ -12,7 +12,7 @@ namespace vesk {
 
 namespace {
 
-constexpr std::size_t kMuch = 65536;
+constexpr std::size_t kFullBuffer = 65536;
 
 std::unique_ptr<OutputSink>& sinkInForce() {
   static std::unique_ptr<OutputSink> theSink = std::make_unique<DescriptorSink>(STDOUT_FILENO, "standard output");
@@ -30,7 +30,7 @@ void DescriptorSink::write(std::string_view line) {
   if (hasFailed_) return;
   buffer_ += line;
   buffer_ += '\n';
-  if (isTerminal_ || buffer_.size() >= kMuch) flush();
+  if (isTerminal_ || buffer_.size() >= kFullBuffer) flush();
 }
 
 void DescriptorSink::flush() {

@@ -7,11 +7,16 @@
 
 namespace vesk {
 
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#if defined(__has_feature)
+#if __has_feature(address_sanitizer) || __has_feature(memory_sanitizer) || __has_feature(thread_sanitizer)
+#define VESK_SANITIZED
+#endif
+#elif defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#define VESK_SANITIZED
+#endif
+
+#ifdef VESK_SANITIZED
 inline constexpr bool kIsSanitized = true;
-#elif defined(__has_feature)
-inline constexpr bool kIsSanitized =
-    __has_feature(address_sanitizer) || __has_feature(memory_sanitizer) || __has_feature(thread_sanitizer);
 #else
 inline constexpr bool kIsSanitized = false;
 #endif
@@ -23,8 +28,9 @@ class RecycledMemory {
  public:
   /// `size` bytes, aligned for every ordinary type; throws std::bad_alloc.
   [[nodiscard]] static void* allocate(std::size_t size) {
+    if constexpr (kIsSanitized) return ::operator new(size);
     const std::size_t kind = kindOf(size);
-    if (kIsSanitized || kind >= kKinds) return ::operator new(size);
+    if (kind >= kKinds) return ::operator new(size);
     Blocks& blocks = cache_[kind];
     if (blocks.count == 0) return ::operator new((kind + 1) * kStep);
     return blocks.blocks[--blocks.count];
@@ -32,8 +38,9 @@ class RecycledMemory {
 
   /// Gives back what allocate() gave for the same size.
   static void release(void* memory, std::size_t size) noexcept {
+    if constexpr (kIsSanitized) return ::operator delete(memory);
     const std::size_t kind = kindOf(size);
-    if (kIsSanitized || kind >= kKinds) return ::operator delete(memory);
+    if (kind >= kKinds) return ::operator delete(memory);
     Blocks& blocks = cache_[kind];
     if (blocks.count == blocks.room) return releaseBeyondRoom(memory, kind);
     blocks.blocks[blocks.count++] = memory;

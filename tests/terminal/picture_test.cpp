@@ -23,23 +23,6 @@ Surroundings replaying() {
   return surroundings;
 }
 
-TEST(Picture, ShowsTheFirstScreen) {
-  FakeInterface interface;
-  Desk desk(interface.stack(), {40, 10}, replaying());
-  EXPECT_EQ(desk.picture(), R"(
-| Vesk            replaying 3:12 of 9:40
-|  Vesk
-|  Device Info                        ›
-|  LTE                                ›
-|  UMTS                               ›
-|  GSM                                ›
-|
-|
-|
-| ? help  Enter open  Esc back  / filter
-)");
-}
-
 TEST(Picture, ShowsSectionsNamesAndValuesWrappedWhereTheyNeedIt) {
   FakeInterface interface;
   interface.showFields(kTxPower, power("-19.5"));
@@ -58,14 +41,6 @@ TEST(Picture, ShowsSectionsNamesAndValuesWrappedWhereTheyNeedIt) {
 |
 | ? help  Enter open  Esc back  / filter
 )");
-}
-
-TEST(Picture, KeepsNamesAndValuesTogetherOnAVeryWideTerminal) {
-  FakeInterface interface;
-  interface.showFields(kTxPower, power("-19.5"));
-  Desk desk(interface.stack(), {200, 24}, replaying());
-  EXPECT_EQ(desk.line(0), " Vesk › LTE › Tx Power" + std::string(155, ' ') + "replaying 3:12 of 9:40");
-  EXPECT_EQ(desk.line(3), "  tx_power" + std::string(84, ' ') + "-19.5");
 }
 
 TEST(Picture, WrapsALongValueBelowItsNameAndCutsItAtAFixedHeight) {
@@ -132,9 +107,10 @@ TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
     std::string text;
     Clock::Duration next;
   } const cases[] = {
-      {0s, 1, "0 s ago, once", 1s},           {2900ms, 14, "2 s ago, 14 times", 3s},
-      {59999ms, 2, "59 s ago, 2 times", 60s}, {125s, 2, "2 min ago, 2 times", 180s},
-      {3h + 1s, 2, "3 h ago, 2 times", 4h},   {49h, 2, "2 d ago, 2 times", 72h},
+      {0s, 1, "0 s ago, once", 1s},
+      {59999ms, 2, "59 s ago, 2 times", 60s},
+      {60s, 14, "1 min ago, 14 times", 120s},
+      {49h, 2, "2 d ago, 2 times", 72h},
   };
   for (const auto& each : cases) {
     arrivals = Arrivals{desk.now() - each.age, each.count};
@@ -149,34 +125,7 @@ TEST(Picture, TellsWhenAndHowOftenTheMetricArrived) {
   EXPECT_EQ(asked, "");
 }
 
-TEST(Picture, ShowsTheDiagnosticLinesInAPane) {
-  FakeInterface interface;
-  DiagnosticLines lines(2);
-  for (const char* line : {"gone", "pushing metric file", "Metric ID in Hex =  3C4E04 and a tail"})
-    lines.append(line);
-  Surroundings surroundings;
-  surroundings.diagnostics = &lines;
-  Desk desk(interface.stack(), {40, 12}, surroundings);
-  desk.type(U"d");
-  EXPECT_EQ(desk.picture(), R"(
-| Vesk
-|  Vesk
-|  Device Info                        ›
-|  LTE                                ›
-|  UMTS                               ›
-|  GSM                                ›
-|
-| Diagnostics                    3 lines
-| pushing metric file
-| Metric ID in Hex =  3C4E04 and a tail
-|
-| ? help  Enter open  Esc back  / filter
-)");
-  desk.type(U"d");
-  EXPECT_EQ(desk.line(7), "");
-}
-
-TEST(Picture, KeepsThePlaceInThePaneWhileLinesCome) {
+TEST(Picture, ShowsTheDiagnosticLinesInAPaneThatKeepsItsPlace) {
   FakeInterface interface;
   DiagnosticLines lines(10);
   const auto append = [&](int first, int last) {
@@ -188,6 +137,7 @@ TEST(Picture, KeepsThePlaceInThePaneWhileLinesCome) {
   Desk desk(interface.stack(), {40, 12}, surroundings);
   desk.type(U"d");
   append(1, 8);
+  EXPECT_EQ(desk.line(7), " Diagnostics                    8 lines");
   EXPECT_EQ(desk.line(10), " line 8");
   desk.mouse(MouseAction::WheelUp, 5, 9);
   append(9, 10);
@@ -195,45 +145,20 @@ TEST(Picture, KeepsThePlaceInThePaneWhileLinesCome) {
   EXPECT_EQ(desk.line(10), " line 5");
   append(11, 14);
   EXPECT_EQ(desk.line(8), " line 5");
-  desk.type(U"[[");
-  EXPECT_EQ(desk.line(8), " line 5");
-  desk.type(U"]");
-  EXPECT_EQ(desk.line(10), " line 9");
-  desk.type(U"]]]");
+  desk.type(U"]]]]");
   append(15, 15);
   EXPECT_EQ(desk.line(10), " line 15");
+  desk.type(U"d");
+  EXPECT_EQ(desk.line(7), "");
 }
 
 TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   FakeInterface interface;
   Desk desk(interface.stack(), {80, 24});
   desk.type(U"?");
-  EXPECT_EQ(desk.picture(), R"(
-| Vesk
-|  Keys
-|  ?                  show or leave this help
-|  Enter → l          open the selected row
-|  Esc ← h Backspace  clear the filter, go back
-|  /                  show only rows with what is typed
-|  f                  hold the screen; intake goes on
-|  d                  show or hide the diagnostic lines
-|  [                  older diagnostic lines
-|  ]                  newer diagnostic lines
-|  q                  end the program
-|  ↑ k                one row up
-|  ↓ j                one row down
-|  PgUp               one page up
-|  PgDn               one page down
-|  Home               the first row
-|  End                the last row
-|  click              select and open a row; on the path: go back
-|  wheel, drag        scroll
-|
-|
-|
-|
-| ? help  Enter open  Esc back  / filter  f freeze  d lines  q quit
-)");
+  EXPECT_EQ(desk.line(1), "  Keys");
+  EXPECT_EQ(desk.line(4), "  Esc ← h Backspace  clear the filter, go back");
+  EXPECT_EQ(desk.line(23), " ? help  Enter open  Esc back  / filter  f freeze  d lines  q quit");
   desk.resize({40, 10});
   desk.press(Key::End);
   EXPECT_EQ(desk.line(8), "  wheel, drag        scroll");
@@ -245,17 +170,11 @@ TEST(Picture, SaysThatATerminalIsTooSmallAtEverySizeBelow) {
   FakeInterface interface;
   interface.showFields(kTxPower, power("1"));
   Desk desk(interface.stack());
-  for (int columns = 0; columns <= 41; ++columns) {
-    for (int lines = 0; lines <= 11; ++lines) {
-      desk.resize({columns, lines});
-      desk.press(Key::Down);
-      desk.press(Key::PageUp);
-      const Grid grid = desk.grid();
-      const bool isTooSmall = columns < 40 || lines < 10;
-      if (columns >= 9 && lines > 0) {
-        EXPECT_EQ(grid.textOfLine(0) == "too small", isTooSmall);
-      }
-    }
+  for (const Size size : {Size{39, 11}, {40, 9}, {9, 1}, {40, 10}, {41, 11}}) {
+    desk.resize(size);
+    desk.press(Key::Down);
+    const bool isTooSmall = size.columns < 40 || size.lines < 10;
+    EXPECT_EQ(desk.line(0) == "too small", isTooSmall) << size.columns;
   }
 }
 

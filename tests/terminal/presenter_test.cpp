@@ -53,10 +53,7 @@ TEST_F(PresenterTest, WalksInAndOutWithTheSelectionKept) {
   desk_->press(Key::Right);
   EXPECT_EQ(desk_->line(0), " Vesk › LTE › RRC State");
   EXPECT_EQ(selected(), "none");
-  desk_->type(U"l");
-  EXPECT_EQ(depth(), 3U);
-
-  desk_->type(U"h");
+  desk_->type(U"lh");
   EXPECT_EQ(selected(), "RRC State in 3");
   desk_->press(Key::Backspace);
   EXPECT_EQ(selected(), "LTE in 3");
@@ -75,17 +72,23 @@ TEST_F(PresenterTest, ScrollsByKeys) {
     std::string selected;
     std::string firstLine;
   } const steps[] = {
-      {Key::Up, "row 0 in 2", "  row 0"},         {Key::PageDown, "row 6 in 2", "  row 6"},
-      {Key::PageDown, "row 12 in 2", "  row 12"}, {Key::Up, "row 11 in 2", "  row 11"},
-      {Key::End, "row 29 in 8", "  row 23"},      {Key::Down, "row 29 in 8", "  row 23"},
-      {Key::PageUp, "row 23 in 8", "  row 17"},   {Key::Down, "row 24 in 8", "  row 18"},
-      {Key::Home, "row 0 in 2", "  row 0"},       {Key::PageUp, "row 0 in 2", "  row 0"},
+      {Key::Up, "row 0 in 2", "  row 0"},     {Key::PageDown, "row 6 in 2", "  row 6"},
+      {Key::Up, "row 5 in 2", "  row 5"},     {Key::End, "row 29 in 8", "  row 23"},
+      {Key::Down, "row 29 in 8", "  row 23"}, {Key::PageUp, "row 23 in 8", "  row 17"},
+      {Key::Down, "row 24 in 8", "  row 18"}, {Key::Home, "row 0 in 2", "  row 0"},
   };
   for (const auto& step : steps) {
     desk_->press(step.key);
     EXPECT_EQ(selected(), step.selected);
     EXPECT_EQ(desk_->line(2).substr(0, step.firstLine.size()), step.firstLine);
   }
+  desk_->press(Key::End);
+  desk_->resize({60, 15});
+  EXPECT_EQ(selected(), "row 29 in 13");
+  desk_->resize({20, 5});
+  desk_->picture();
+  desk_->resize({40, 10});
+  EXPECT_EQ(selected(), "row 29 in 8");
 }
 
 TEST_F(PresenterTest, WalksThroughARowTallerThanTheScreen) {
@@ -100,8 +103,6 @@ TEST_F(PresenterTest, WalksThroughARowTallerThanTheScreen) {
   EXPECT_EQ(desk_->lineOf(Role::Selected), 2);
   desk_->press(Key::Down);
   EXPECT_EQ(selected(), "next in 8");
-  desk_->press(Key::Home);
-  EXPECT_EQ(selected(), "tall in 2");
 }
 
 TEST_F(PresenterTest, AsksOnlyForRowsThatComeIntoView) {
@@ -139,19 +140,14 @@ TEST_F(PresenterTest, FiltersWhileOneTypes) {
                   {"PDP 1"_text, {FakeTableScreen::row("apn", "ims"), FakeTableScreen::row("interval", "5")}},
                   {"PDP 2"_text, {FakeTableScreen::row("qci", "5")}}});
   desk_->type(U"/InTQ");
+  EXPECT_EQ(quits_, 0);
   desk_->press(Key::Backspace);
-  EXPECT_EQ(desk_->picture(), R"(
-| Vesk › LTE › NAS
-|  NAS
-| PDP 0
-|  apn                         Internet
-| PDP 1
-|  interval                           5
-|
-|
-|
-| /InT▏ Enter keep  Esc clear
-)");
+  EXPECT_EQ(desk_->line(2), " PDP 0");
+  EXPECT_EQ(desk_->line(3), "  apn                         Internet");
+  EXPECT_EQ(desk_->line(4), " PDP 1");
+  EXPECT_EQ(desk_->line(5), "  interval                           5");
+  EXPECT_EQ(desk_->line(6), "");
+  EXPECT_EQ(desk_->line(9), " /InT▏ Enter keep  Esc clear");
   desk_->press(Key::Down);
   EXPECT_EQ(selected(), "interval in 5");
   desk_->press(Key::Enter);
@@ -163,21 +159,12 @@ TEST_F(PresenterTest, FiltersWhileOneTypes) {
   desk_->press(Key::Escape);
   EXPECT_EQ(selected(), "interval in 6");
   EXPECT_EQ(depth(), 3U);
-  desk_->type(U"/zz");
+  desk_->type(U"/qé");
   EXPECT_EQ(desk_->line(2), "  no row has this");
+  EXPECT_EQ(quits_, 0);
   desk_->press(Key::Escape);
   desk_->press(Key::Escape);
   EXPECT_EQ(depth(), 2U);
-}
-
-TEST_F(PresenterTest, TakesEveryLetterForTheFilterWhileItIsTyped) {
-  desk_->type(U"/qfdé");
-  EXPECT_EQ(quits_, 0);
-  EXPECT_EQ(desk_->line(9), " /qfdé▏ Enter keep  Esc clear");
-  for (int step = 0; step < 5; ++step)
-    desk_->press(Key::Backspace);
-  EXPECT_EQ(desk_->line(9), " ? help  Enter open  Esc back  / filter");
-  EXPECT_EQ(depth(), 1U);
 }
 
 TEST_F(PresenterTest, HoldsTheWholeScreenWhileFrozen) {
@@ -192,10 +179,6 @@ TEST_F(PresenterTest, HoldsTheWholeScreenWhileFrozen) {
   desk_->type(U"f");
   EXPECT_EQ(desk_->line(8), "• row 9                            new █");
   EXPECT_EQ(desk_->line(1), "  NAS");
-
-  desk_->type(U"f");
-  desk_->press(Key::Escape);
-  EXPECT_EQ(desk_->line(1), "  LTE");
 }
 
 TEST_F(PresenterTest, TheMouseSelectsOpensScrollsAndGoesBack) {
@@ -209,8 +192,6 @@ TEST_F(PresenterTest, TheMouseSelectsOpensScrollsAndGoesBack) {
   EXPECT_EQ(desk_->line(0), " Vesk › LTE › Tx Power");
   desk_->click(9, 0);
   EXPECT_EQ(desk_->line(0), " Vesk › LTE");
-  desk_->click(6, 0);
-  EXPECT_EQ(depth(), 2U);
   desk_->click(1, 0);
   EXPECT_EQ(depth(), 1U);
   EXPECT_TRUE(tracking_.empty());
@@ -234,30 +215,15 @@ TEST_F(PresenterTest, StopsTrackingWhenTheReleaseIsLost) {
   showFields(numbered(30));
   const std::function<void()> interruptions[] = {
       [&] { desk_->press(Key::Down); },
-      [&] {
-        desk_->resize({50, 12});
-      },
       [&] { desk_->mouse(MouseAction::Press, 1, 1); },
       [&] { desk_->presenter().forgetMouse(); },
   };
   for (const auto& interruption : interruptions) {
-    tracking_.clear();
     desk_->mouse(MouseAction::Press, 5, 7);
     desk_->mouse(MouseAction::Drag, 5, 4);
     interruption();
-    EXPECT_EQ(tracking_, (std::vector<bool>{true, false}));
+    EXPECT_EQ(std::exchange(tracking_, {}), (std::vector<bool>{true, false}));
   }
-}
-
-TEST_F(PresenterTest, StaysWithItsRowWhenTheTerminalIsResized) {
-  showFields(numbered(30));
-  desk_->press(Key::End);
-  desk_->resize({60, 15});
-  EXPECT_EQ(selected(), "row 29 in 13");
-  desk_->resize({20, 5});
-  desk_->picture();
-  desk_->resize({40, 10});
-  EXPECT_EQ(selected(), "row 29 in 8");
 }
 
 }  // namespace

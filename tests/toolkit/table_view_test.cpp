@@ -28,7 +28,6 @@ TEST(TableView, TakesCountsAndHeadersOncePerReloadAndCellsOnlyInView) {
   EXPECT_EQ(table.numberOfRows(2), 0U);
   EXPECT_EQ(table.headerTitle(0), "PDP 0"_text);
   EXPECT_EQ(table.headerTitle(1), std::nullopt);
-  EXPECT_EQ(table.headerTitle(2), std::nullopt);
   EXPECT_EQ(screen.sectionCounts, 1);
   EXPECT_EQ(screen.rowCounts, 2);
   EXPECT_EQ(screen.cellRequests, 0);
@@ -51,9 +50,6 @@ TEST(TableView, AsksForNoCellThatWasNotCountedAndCopesWithNullOnes) {
   screen.content.clear();
   EXPECT_EQ(screen.tableView().cellForRow({0, 1}), nullptr);
   EXPECT_EQ(screen.cellRequests, 1);
-  screen.tableView().keepInView({5, 0}, {5, 0});
-  screen.tableView().reloadData();
-  EXPECT_EQ(screen.tableView().numberOfSections(), 0U);
 }
 
 TEST(TableView, ReusesCellsOfTheSameIdentifierWithTheirTextsReset) {
@@ -76,22 +72,6 @@ TEST(TableView, ReusesCellsOfTheSameIdentifierWithTheirTextsReset) {
   const std::unique_ptr<TableViewCell> other = table.dequeueReusableCell("LaunchView");
   EXPECT_NE(other.get(), first);
   EXPECT_NE(other.get(), second);
-  const std::unique_ptr<TableViewCell> same = table.dequeueReusableCell("SecondClickView");
-  EXPECT_TRUE(same.get() == first || same.get() == second);
-}
-
-TEST(TableView, GivesNewCellsTheDeclaredLook) {
-  static constexpr CellDeclaration kCells[] = {
-      {"LaunchView", CellStyle::Basic, CellAccessory::Disclosure},
-  };
-  FakeTableScreen screen;
-  screen.tableView().declareCells(kCells);
-  const std::unique_ptr<TableViewCell> declared = screen.tableView().dequeueReusableCell("LaunchView");
-  EXPECT_EQ(declared->style(), CellStyle::Basic);
-  EXPECT_EQ(declared->accessory(), CellAccessory::Disclosure);
-  const std::unique_ptr<TableViewCell> undeclared = screen.tableView().dequeueReusableCell("Other");
-  EXPECT_EQ(undeclared->style(), CellStyle::RightDetail);
-  EXPECT_EQ(undeclared->reuseIdentifier(), "Other"_text);
 }
 
 }  // namespace

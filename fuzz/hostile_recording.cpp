@@ -1,9 +1,9 @@
-#include "app/hostile_recording.h"
+#include "hostile_recording.h"
 
 #include <cstdint>
 #include <memory>
 
-#include "messages/filled_message.h"
+#include "filled_message.h"
 #include "messages/lte/lte.h"
 #include "messages/nas/nas.h"
 #include "messages/registry/metric_classes.h"
@@ -30,24 +30,14 @@ Data dataOf(std::string_view bytes) {
   return Data::copy({reinterpret_cast<const std::uint8_t*>(bytes.data()), bytes.size()});
 }
 
-/// Writes the lines one after another, a tenth of a second apart.
-class Recording {
- public:
-  void add(std::int64_t metricId, std::span<const std::uint8_t> payload) {
-    appendRecordedEvent(lines, {static_cast<double>(++events_) / 10, metricId, payload});
-  }
-  template <class Message>
-  void add(const Message& message) {
-    add(kMetricId<Message>, encoded(message).bytes());
-  }
+using Events = std::vector<HostileEvent>;
 
-  std::string lines;
+template <class Message>
+void add(Events& events, const Message& message) {
+  events.push_back({kMetricId<Message>, encoded(message)});
+}
 
- private:
-  int events_ = 0;
-};
-
-void addFiles(Recording& recording) {
+void addFiles(Events& events) {
   KCellularSimCardFiles files;
   for (const std::size_t size : {kLongest, std::size_t{0}, std::size_t{1}, kLongest - 1}) {
     auto file = std::make_shared<ElementaryFile>();
@@ -55,16 +45,16 @@ void addFiles(Recording& recording) {
     file->setContent(dataOf(repeatedTo(size, "\x1B")));
     files.addEfList(file);
   }
-  recording.add(files);
+  add(events, files);
   KCellularSimCardFiles many;
   for (std::uint32_t number = 0; number < 500; ++number) {
     many.addEfList(std::make_shared<ElementaryFile>());
     many.efListAtIndex(number)->setEfId(0xFFFFFFFF - number);
   }
-  recording.add(many);
+  add(events, many);
 }
 
-void addTexts(Recording& recording) {
+void addTexts(Events& events) {
   KCellularActivatedBearerContexts bearers;
   for (const std::size_t size : {std::size_t{64}, kLongest / 8}) {
     for (const std::string_view text : kHostileTexts) {
@@ -74,41 +64,49 @@ void addTexts(Recording& recording) {
       bearers.addBearerContexts(bearer);
       KCellularLteRsrpRsrqSinr levels;
       levels.setCallId(Text::copy(repeatedTo(size, text)));
-      recording.add(levels);
+      add(events, levels);
     }
   }
   bearers.bearerContextsAtIndex(0)->setApn(Text::copy(repeatedTo(kLongest, kHostileTexts[0])));
-  recording.add(bearers);
+  add(events, bearers);
 }
 
-void addNumbers(Recording& recording) {
+void addNumbers(Events& events) {
   KCellularLteSelReselCellInfo bands;
   for (std::uint32_t number = 0; number < 20000; ++number)
     bands.addMultiBandInfo(0xFFFFFFFF - number);
-  recording.add(bands);
+  add(events, bands);
 }
 
 }  // namespace
 
-std::string hostileRecording() {
-  Recording recording;
-  addFiles(recording);
-  addTexts(recording);
-  addNumbers(recording);
+std::vector<HostileEvent> hostileEvents() {
+  Events events;
+  addFiles(events);
+  addTexts(events);
+  addNumbers(events);
   for (std::int64_t id = 0; id < 0x10000; ++id) {
     const std::int64_t metricId = 0x3C0000 | id;
     const MetricClass* metricClass = findMetricClass(metricId);
     if (metricClass == nullptr) continue;
     for (const Filling filling : {Filling::small, Filling::extreme}) {
       Bytes payload = filledMessage(metricClass->name, filling).payload;
-      recording.add(metricId, payload);
+      events.push_back({metricId, Data::copy(payload)});
       payload.pop_back();
-      recording.add(metricId, payload);
+      events.push_back({metricId, Data::copy(payload)});
     }
-    recording.add(metricId, {});
+    events.push_back({metricId, Data()});
   }
-  recording.add(-1, {});
-  return recording.lines;
+  events.push_back({-1, Data()});
+  return events;
+}
+
+std::string hostileRecording() {
+  std::string lines;
+  double at = 0;
+  for (const auto& [metricId, payload] : hostileEvents())
+    appendRecordedEvent(lines, {at += 0.1, metricId, payload.bytes()});
+  return lines;
 }
 
 }  // namespace vesk

@@ -1,4 +1,4 @@
-#include "messages/wire_model.h"
+#include "wire_model.h"
 
 #include <map>
 #include <set>

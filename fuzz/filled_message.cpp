@@ -1,4 +1,4 @@
-#include "messages/filled_message.h"
+#include "filled_message.h"
 
 #include <limits>
 

@@ -17,12 +17,12 @@
 #include <string_view>
 #include <thread>
 
-#include "app/hostile_recording.h"
 #include "app/vesk_program.h"
 #include "handset/handset.h"
 #include "handset/recording.h"
+#include "hostile_recording.h"
 #include "support/pseudo_terminal.h"
-#include "support/terminal_language.h"
+#include "terminal_language.h"
 
 namespace vesk {
 namespace {

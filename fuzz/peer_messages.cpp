@@ -1,18 +1,17 @@
-// What our writers write, protobuf reads as the same fields and writes as the same bytes.
+#include "peer_messages.h"
 
 #include <google/protobuf/dynamic_message.h>
+#include <string>
+#include <vector>
 
-#include "messages/every_message.h"
-#include "messages/filled_message.h"
 #include "messages/proto_schema.h"
-#include "support/decoded.h"
+#include "support/bytes.h"
 
 namespace vesk {
-namespace {
 
 namespace pb = google::protobuf;
 
-Dictionary dictionaryOf(const pb::Message& message);
+namespace {
 
 Value valueOf(const pb::Message& message, const FieldDescriptor* field) {
   const pb::Reflection& with = *message.GetReflection();
@@ -55,6 +54,13 @@ Array arrayOf(const pb::Message& message, const FieldDescriptor* field) {
   return array;
 }
 
+}  // namespace
+
+std::unique_ptr<pb::Message> makePeerMessage(std::string_view className) {
+  static pb::DynamicMessageFactory factory;
+  return std::unique_ptr<pb::Message>(factory.GetPrototype(&declaredMessage(className))->New());
+}
+
 Dictionary dictionaryOf(const pb::Message& message) {
   Dictionary dictionary;
   std::vector<const FieldDescriptor*> fields;
@@ -65,24 +71,4 @@ Dictionary dictionaryOf(const pb::Message& message) {
   return dictionary;
 }
 
-class PeerAgrees : public testing::TestWithParam<MessageClass> {};
-INSTANTIATE_TEST_SUITE_P(Schema, PeerAgrees, testing::ValuesIn(metrics::kEveryMessage), nameOfTest);
-
-TEST_P(PeerAgrees, OnTheFieldsAndOnTheBytes) {
-  pb::DynamicMessageFactory factory;
-  for (const Filling filling : {Filling::small, Filling::extreme}) {
-    const auto ours = GetParam().decode(filledMessage(GetParam().name, filling).payload);
-    ProtoWriter writer;
-    ours->writeTo(writer);
-    const std::unique_ptr<pb::Message> theirs(factory.GetPrototype(&declaredMessage(GetParam().name))->New());
-    ASSERT_TRUE(theirs->ParseFromArray(writer.written().data(), static_cast<int>(writer.written().size())));
-    EXPECT_TRUE(theirs->GetReflection()->GetUnknownFields(*theirs).empty());
-    EXPECT_EQ(dictionaryOf(*theirs), ours->dictionaryRepresentation()) << shown(*ours);
-
-    const std::string bytes = theirs->SerializeAsString();
-    EXPECT_EQ(hexOf(Bytes(bytes.begin(), bytes.end())), hexOf(writer.written()));
-  }
-}
-
-}  // namespace
 }  // namespace vesk

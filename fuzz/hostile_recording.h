@@ -1,8 +1,12 @@
 #pragma once
 
 #include <array>
+#include <cstdint>
 #include <string>
 #include <string_view>
+#include <vector>
+
+#include "values/data.h"
 
 namespace vesk {
 
@@ -27,9 +31,17 @@ inline constexpr std::array<std::string_view, 14> kHostileTexts{
     "%s%n$<5>$<1000/>\\x1B",
 };
 
+struct HostileEvent {
+  std::int64_t metricId;
+  Data payload;
+};
+
 /// Events whose payloads hold every kind of value as long and as far out as it can be, in every metric: files of 64
 /// KiB, hostile texts up to 64 KiB, lists of hundreds, numbers at their ends; and some that are damaged, or of no
 /// metric.
+[[nodiscard]] std::vector<HostileEvent> hostileEvents();
+
+/// The lines of them, a tenth of a second apart.
 [[nodiscard]] std::string hostileRecording();
 
 }  // namespace vesk
