@@ -29,7 +29,7 @@ std::string_view titleOf(const ViewController& screen) {
 /// Calls `visit` with each area and the labels of its categories.
 template <class Visit>
 void visitAreas(const InterfaceLayout& layout, Visit visit) {
-  NavigationController stack(layout.makeScreen("Launch"));
+  NavigationController stack(layout.makeFirstScreen());
   stack.loadViewIfNeeded();
   for (const Text& area : labelsOf(topTable(stack))) {
     openRow(stack, area.view());
@@ -40,7 +40,7 @@ void visitAreas(const InterfaceLayout& layout, Visit visit) {
 
 }  // namespace
 
-ScreenWalk::ScreenWalk(const InterfaceLayout& layout) : stack_(layout.makeScreen("Launch")) {
+ScreenWalk::ScreenWalk(const InterfaceLayout& layout) : stack_(layout.makeFirstScreen()) {
   stack_.loadViewIfNeeded();
 }
 
