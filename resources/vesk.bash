@@ -42,7 +42,7 @@ _vesk_files() {
 
 _vesk() {
   local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
-  local command='' word skip='' arguments=() options='--replay --headless --speed --seed --loop --seconds --rule --rules --log --version'
+  local command='' word skip='' arguments=() options='--replay --headless --speed --seed --loop --seconds --rule --rules --redact --log --version'
   COMPREPLY=()
 
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
@@ -69,16 +69,17 @@ _vesk() {
   esac
 
   case $command in
-    decode | stores) options='--log' ;;
-    show | summary) options='--json --log' ;;
-    timeline) options='--json --rule --rules --log' ;;
-    series) options='--csv --log' ;;
+    decode | stores) options='--redact --log' ;;
+    redact) options='--log' ;;
+    show | summary | readings) options='--json --redact --log' ;;
+    timeline) options='--json --rule --rules --redact --log' ;;
+    series) options='--csv --redact --log' ;;
     simulate) options='--seed --seconds --log' ;;
   esac
   if [[ $cur == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
   elif [[ -z $command ]]; then
-    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series simulate' -- "$cur")
+    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings redact simulate' -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
     _vesk_offer < <(_vesk_areas)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then

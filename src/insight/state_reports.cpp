@@ -33,11 +33,11 @@ std::optional<CarrierState> carrierStateOf(const Dictionary& record) {
 }
 
 Number bandwidthOf(const Dictionary& record) {
-  constexpr std::array kBandwidths{1.4F, 3.0F, 5.0F, 10.0F, 15.0F, 20.0F};
+  constexpr std::array kCarrierBandwidths{1.4F, 3.0F, 5.0F, 10.0F, 15.0F, 20.0F};
   const Value* value = record.find("dl_bandwidth"_text);
   const std::optional<float> bandwidth = value == nullptr ? std::nullopt : value->exactFloat();
-  const bool isPossible =
-      bandwidth && std::find(kBandwidths.begin(), kBandwidths.end(), *bandwidth) != kBandwidths.end();
+  const bool isPossible = bandwidth && std::find(kCarrierBandwidths.begin(), kCarrierBandwidths.end(), *bandwidth) !=
+                                           kCarrierBandwidths.end();
   return isPossible ? Number(*bandwidth) : std::nullopt;
 }
 

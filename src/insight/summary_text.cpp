@@ -26,7 +26,7 @@ std::string oneDecimal(double number) {
   return text.data();
 }
 
-std::string duration(std::int64_t milliseconds) {
+std::string spanText(std::int64_t milliseconds) {
   return durationText(static_cast<std::uint64_t>(milliseconds));
 }
 
@@ -105,11 +105,11 @@ class SummaryLines {
     add(line);
     if (!insight_.now()) return;
     const std::uint64_t stretches = insight_.clock().stretches();
-    line = duration(insight_.clock().counted()) + " counted in " + counted(stretches, "stretch", "stretches") + ", " +
+    line = spanText(insight_.clock().counted()) + " counted in " + counted(stretches, "stretch", "stretches") + ", " +
            counted(stretches - 1, "gap", "gaps");
     const std::uint64_t noService = summary_.count(EventKind::noService);
     if (noService > 0)
-      line += "; no service " + counted(noService, "time", "times") + ", " + duration(summary_.noService());
+      line += "; no service " + counted(noService, "time", "times") + ", " + spanText(summary_.noService());
     add(line);
   }
 
@@ -171,7 +171,7 @@ class SummaryLines {
   void addCarriers() {
     if (summary_.carriersConfigured() == 0) return;
     add("carrier aggregation " + percent(summary_.carriersConfigured(), summary_.time(Technology::lte)) +
-        " of LTE, activated " + duration(summary_.carriersActivated()));
+        " of LTE, activated " + spanText(summary_.carriersActivated()));
   }
 
   void addTxPower() {
@@ -210,7 +210,7 @@ class SummaryLines {
       const auto level = cell->level.stats();
       const auto quality = cell->quality.stats();
       const std::string name = textOf(cell->technology, cell->identity, true);
-      const std::string time = duration(cell->time);
+      const std::string time = spanText(cell->time);
       add(left(name, 42 - time.size()) + time + right(percent(cell->time, insight_.clock().counted()), 6) +
           right(std::to_string(cell->visits), 7) + right(level ? numberText(level->min) : "-", 6) +
           right(level ? whole(level->mean) : "-", 5) + right(level ? numberText(level->max) : "-", 5) +

@@ -81,9 +81,12 @@ constexpr std::array kSources{
     record<lte, &LTE::SelReselCellInfo>("LTE", "Sel Resel Parameters", K_LTE_SEL_RESEL_INFO),
     list<lte, &LTE::EutraNbrs, NbrEutra>("LTE", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_LTE_SEL_RESEL_INFO),
     latest<&Stores::myLTECDRXConfigDict>("LTE", "C-DRX"),
-    list<lte, &LTE::EutraNbrsMeas, EgwErrcNbrEutraMeas>("LTE", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_LTE_INTRARAT_MEAS),
-    list<lte, &LTE::UtraNbrsMeas, EgwErrcNbrUtraMeas>("LTE", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_LTE_INTERRAT_MEAS),
-    list<lte, &LTE::GeraNbrsMeas, EgwErrcNbrGeranMeas>("LTE", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_LTE_INTERRAT_MEAS),
+    list<lte, &LTE::EutraNbrsMeas, EgwErrcNbrEutraMeas>(
+        "LTE", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_LTE_INTRARAT_MEAS),
+    list<lte, &LTE::UtraNbrsMeas, EgwErrcNbrUtraMeas>(
+        "LTE", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_LTE_INTERRAT_MEAS),
+    list<lte, &LTE::GeraNbrsMeas, EgwErrcNbrGeranMeas>(
+        "LTE", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_LTE_INTERRAT_MEAS),
     list<lte, &LTE::CAStatusList, SecondaryComponentCarrier>("LTE", "CA Status", "Component Carrier ", K_LTE_CA_STATUS),
     list<common, &Common::activeBearer, BearerContext>("LTE", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 
@@ -95,12 +98,16 @@ constexpr std::array kSources{
     list<umts, &UMTS::rXInfo, RxInfo>("UMTS", "Serving Cell Meas", "RxInfo ", K_UMTS_SCELL_MEAS),
     list<umts, &UMTS::TxPower, TxPowerInfo>("UMTS", "Tx Power", "TxPowerInfo ", K_UMTS_TX_POWER),
     record<umts, &UMTS::SelReselCellInfo>("UMTS", "Sel Resel Parameters", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::eUtraNbrs, EutraFreqInfo>("UMTS", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
+    list<umts, &UMTS::eUtraNbrs, EutraFreqInfo>(
+        "UMTS", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
     list<umts, &UMTS::utraNbrs, UtraFreqInfo>("UMTS", "UTRA Neighbor Info", "UTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
     list<umts, &UMTS::geraNbrs, GsmFreqInfo>("UMTS", "GSM Neighbor Info", "GSM Neighbor ", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::eUtraNbrMeas, LteCellMeasResult>("UMTS", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_UMTS_NCELL_MEAS),
-    list<umts, &UMTS::utraNbrMeas, UtraCellMeasResult>("UMTS", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_UMTS_NCELL_MEAS),
-    list<umts, &UMTS::geraNbrMeas, GsmCellMeasResult>("UMTS", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_UMTS_NCELL_MEAS),
+    list<umts, &UMTS::eUtraNbrMeas, LteCellMeasResult>(
+        "UMTS", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_UMTS_NCELL_MEAS),
+    list<umts, &UMTS::utraNbrMeas, UtraCellMeasResult>(
+        "UMTS", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_UMTS_NCELL_MEAS),
+    list<umts, &UMTS::geraNbrMeas, GsmCellMeasResult>(
+        "UMTS", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_UMTS_NCELL_MEAS),
     list<common, &Common::activeBearer, BearerContext>("UMTS", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
 
     latest<&Stores::myGMMContextDict>("GSM", "NAS GMM"),

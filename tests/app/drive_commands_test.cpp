@@ -1,0 +1,81 @@
+// The commands that tell what a drive was, as a user runs them.
+
+#include "app/vesk_program.h"
+
+namespace vesk {
+namespace {
+
+/// The RRC state at 2018-01-20 21:52:40 UTC and 91 ms later: an attempt, for mobile originated data, then connected.
+const std::string kDrive = R"({"at": 0, "metric": "0x3C4E04", "payload": "08C0D8BCAC912C10022804"})"
+                           "\n"
+                           R"({"at": 0.091, "metric": "0x3C4E04", "payload": "089BD9BCAC912C10032804"})"
+                           "\n";
+const std::string kLines =
+    "21:52:40.000  technology  LTE\n"
+    "21:52:40.000  rrc  ATMPT CONNECTION, EST MO DATA\n"
+    "21:52:40.091  rrc  CONNECTED, EST MO DATA, after 91 ms in ATMPT CONNECTION\n";
+
+TEST(DriveCommands, TellWhatADriveWas) {
+  struct Case {
+    std::vector<std::string> arguments;
+    std::string output;
+    int status = 0;
+  };
+  for (const auto& [arguments, output, status] : std::vector<Case>{
+           {{"timeline"}, kLines},
+           {{"timeline", "-", "--rule", "event drop"}, kLines},
+           {{"timeline", "--rule", "event rrc", "--rule", "event service", "-"},
+            "21:52:40.000  technology  LTE\n"
+            "21:52:40.000  rrc  ATMPT CONNECTION, EST MO DATA\n"
+            "21:52:40.000  alert  event rrc\n"
+            "21:52:40.091  rrc  CONNECTED, EST MO DATA, after 91 ms in ATMPT CONNECTION\n"
+            "21:52:40.091  alert  event rrc\n",
+            3},
+           {{"series", "--csv"},
+            "timestamp,technology,channel,code,lte.rsrp,lte.rsrq,lte.sinr,lte.tx_power.pusch,lte.tx_power.pucch,"
+            "lte.scc.rsrp,lte.nbr.rsrp,umts.rscp,umts.ecno,umts.rssi,umts.tx_power,gsm.rxlev,gsm.rxqual,gsm.tx_"
+            "power\n"},
+           {{"summary"},
+            "2 of 2 events, 2018-01-20 21:52:40 to 2018-01-20 21:52:40 UTC\n"
+            "91 ms counted in 1 stretch, 0 gaps\n"
+            "technology  LTE 100 %\n"
+            "LTE connections: 1 attempted, 1 established, 0 failed, 0 dropped, 0 released\n"},
+       }) {
+    const Finished finished = vesk(arguments, kDrive);
+    EXPECT_EQ(finished.output, output) << arguments.front();
+    EXPECT_EQ(finished.error, "");
+    EXPECT_EQ(finished.status, status);
+  }
+}
+
+TEST(DriveCommands, GoOnBehindLinesThatAreNoEvent) {
+  const TemporaryFile recording("bad\n" + kDrive);
+  const Finished finished = vesk({"timeline", recording.path()});
+  EXPECT_EQ(finished.output, kLines);
+  EXPECT_EQ(finished.error, recording.path() + ":1: no JSON object\n");
+  EXPECT_EQ(finished.status, 1);
+}
+
+TEST(DriveCommands, RefuseRulesThatAreNone) {
+  const TemporaryFile rules("# Weak\n\n  lte.rsrp < -110 for 10 s  # for long\n lte.rsrp for 10 s\nevent alert\n");
+  const Finished file = vesk({"timeline", "--rules", rules.path()}, kDrive);
+  EXPECT_EQ(file.output, "");
+  EXPECT_EQ(file.error, "vesk: " + rules.path() + ":4:11: expected <, <=, >, >=, == or !=, got for\n" +
+                            "vesk: " + rules.path() +
+                            ":5:7: expected a kind of event, such as handover or no-service, got alert\n");
+  EXPECT_EQ(file.status, 2);
+  const Finished option = vesk({"--headless", "--seconds", "1", "--rule", "lte.rsrp < x"});
+  EXPECT_EQ(option.error, "vesk: --rule \"lte.rsrp < x\", column 12: expected a number, got x\n");
+  EXPECT_EQ(option.status, 2);
+}
+
+TEST(DriveCommands, HaveHeadlessRunsJudgeRules) {
+  const TemporaryFile recording(kDrive);
+  const Finished finished =
+      vesk({"--headless", "--replay", recording.path(), "--speed", "max", "--rule", "event technology"});
+  EXPECT_NE(finished.output.find("\nAlert: event technology\n"), std::string::npos);
+  EXPECT_EQ(finished.status, 3);
+}
+
+}  // namespace
+}  // namespace vesk
