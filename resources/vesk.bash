@@ -48,7 +48,7 @@ _vesk() {
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
     if [[ -n $skip ]]; then
       skip=''
-    elif [[ $word == --@(replay|speed|seed|seconds|log|rule|rules) ]]; then
+    elif [[ $word == --@(replay|speed|seed|seconds|log|rule|rules|output|port|bind|host) || $word == -o ]]; then
       skip=1
     elif [[ $word != -?* && -z $command ]]; then
       command=$word
@@ -58,14 +58,14 @@ _vesk() {
   done
 
   case $previous in
-    --replay | --rules) _vesk_files && return ;;
+    --replay | --rules | --output | -o) _vesk_files && return ;;
     --speed) _vesk_offer < <(printf '%s\n' 1 2 5 10 max) && return ;;
     --log)
       _vesk_files
       _vesk_offer < <(printf '%s\n' syslog stderr none)
       return
       ;;
-    --seed | --seconds | --rule) return ;;
+    --seed | --seconds | --rule | --port | --bind | --host) return ;;
   esac
 
   case $command in
@@ -74,17 +74,19 @@ _vesk() {
     show | summary | readings) options='--json --redact --log' ;;
     timeline) options='--json --rule --rules --redact --log' ;;
     series) options='--csv --redact --log' ;;
+    report) options='--output --redact --log' ;;
+    serve) options='--port --bind --host --replay --speed --loop --seed --rule --rules --redact --seconds --log' ;;
     simulate) options='--seed --seconds --log' ;;
   esac
   if [[ $cur == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
   elif [[ -z $command ]]; then
-    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings redact simulate' -- "$cur")
+    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings report serve redact simulate' -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
     _vesk_offer < <(_vesk_areas)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then
     _vesk_offer < <(_vesk_categories "${arguments[0]}")
-  elif [[ $command != simulate ]]; then
+  elif [[ $command != simulate && $command != serve ]]; then
     _vesk_files
   fi
 }

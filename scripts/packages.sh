@@ -32,6 +32,7 @@ load      diffutils           cmp
 page      chromium            chromium
 page      chromium-driver     chromedriver
 page      python3             python3
+visitors  python3             python3
 metrics   prometheus          prometheus
 metrics   curl                curl
 metrics   jq                  jq
