@@ -37,7 +37,7 @@ struct ServerOptions {
   /// 0 for any that is free.
   std::uint16_t port = 8080;
   /// Of this host, beside its addresses and "localhost".
-  std::vector<std::string> names;
+  std::vector<std::string> names{};
 };
 
 /// A web server for a page that is only read. It works on the main thread and never waits for anybody: whoever stops
