@@ -65,7 +65,7 @@ TEST(DriveRecord, KeepsTheLastEventsOfEachKindInTheirOrder) {
   std::string kinds;
   for (const DriveRecord::Event* each : drive.record.events())
     kinds += std::string(nameOf(each->event.kind)) + " ";
-  std::string expected = "technology rrc cell ";
+  std::string expected = "rrc technology cell ";
   for (int count = 0; count < 10; ++count)
     expected += "reselection ";
   EXPECT_EQ(kinds, expected);

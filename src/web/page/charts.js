@@ -87,7 +87,7 @@ class Chart {
       drawGapEdgePoints: true,
       axisLabelFontSize: 12,
       highlightCircleSize: 3,
-      dateWindow: this.charts.window,
+      dateWindow: this.charts.range(),
       axes: {
         x: {ticker: (from, to, pixels) => this.charts.ticks(from, to, pixels), axisLabelWidth: 76},
         y: {axisLabelWidth: 42, pixelsPerLabel: 26, axisLabelFormatter: (value) => rounded(value, Number.isInteger(value) ? 0 : 1)},
@@ -125,10 +125,11 @@ class Chart {
     const {drive} = this.charts;
     const [from, to] = graph.xAxisRange();
     const x = (position) => area.x + area.w * (position - from) / (to - from);
-    const line = (position, name, width, top) => {
-      if (position < from || position > to) return;
+    // One in each column of pixels is seen.
+    const columns = (positions) => new Set(positions.filter((each) => each >= from && each <= to).map((each) => Math.round(x(each))));
+    const lines = (positions, name, width, top) => {
       context.fillStyle = color(name);
-      context.fillRect(Math.round(x(position)) - (width >> 1), top, width, area.y + area.h - top);
+      for (const at of columns(positions)) context.fillRect(at - (width >> 1), top, width, area.y + area.h - top);
     };
     context.save();
     context.beginPath();
@@ -137,16 +138,15 @@ class Chart {
     this.drawGrades(context, area, graph);
     context.setLineDash([3, 3]);
     context.strokeStyle = color('gap');
-    for (const gap of drive.gaps().filter((each) => each >= from && each <= to)) {
-      const at = Math.round(x(gap)) + 0.5;
-      context.beginPath();
-      context.moveTo(at, area.y);
-      context.lineTo(at, area.y + area.h);
-      context.stroke();
+    context.beginPath();
+    for (const at of columns(drive.gaps())) {
+      context.moveTo(at + 0.5, area.y);
+      context.lineTo(at + 0.5, area.y + area.h);
     }
-    for (const position of drive.marks.change) line(position, 'change', 1, area.y + area.h - 16);
-    for (const position of drive.marks.reestablished) line(position, 'reestablished', 2, area.y);
-    for (const position of drive.marks.drop) line(position, 'drop', 3, area.y);
+    context.stroke();
+    lines(drive.marks.change, 'change', 1, area.y + area.h - 16);
+    lines(drive.marks.reestablished, 'reestablished', 2, area.y);
+    lines(drive.marks.drop, 'drop', 3, area.y);
     for (let at = 0; at < drive.serving.length; at += 2) {
       const [begin, cell, end] = [drive.serving[at], drive.serving[at + 1], drive.serving[at + 2] ?? drive.end];
       if (cell < 0 || end < from || begin > to) continue;
@@ -228,7 +228,6 @@ class Charts {
     fill(this.section, this.controls, this.moment, ...this.charts.map((chart) => chart.frame),
       ...(this.charts.length ? [] : [element('p', {class: 'quiet', text: 'No level or power was measured.'})]));
     for (const chart of this.charts) chart.draw();
-    this.show(this.window);
   }
 
   show(window) {
