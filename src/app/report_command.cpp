@@ -21,11 +21,16 @@ class PageOutput {
   explicit PageOutput(const std::optional<std::string>& path) : name_(path.value_or("standard output")) {
     constexpr mode_t kMode = 0666;
     if (!path) return;
-    file_ = FileDescriptor(open(path->c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, kMode));
-    if (file_.get() < 0) fail();
+    file_ = FileDescriptor(open(path->c_str(), O_WRONLY | O_CREAT | O_CLOEXEC, kMode));
+    if (!file_.isOpen()) fail();
     descriptor_ = file_.get();
   }
 
+  /// What a file held stays until there is something to take its place.
+  void begin() const {
+    // A device or a pipe cannot be cut, and needs not be.
+    [[maybe_unused]] const int result = file_.isOpen() ? ftruncate(descriptor_, 0) : 0;
+  }
   void write(std::string_view piece) {
     while (!piece.empty() && !hasFailed_) {
       const ssize_t written = ::write(descriptor_, piece.data(), piece.size());
@@ -67,6 +72,7 @@ Outcome runReport(const ReportOptions& options) {
     record.take(insight, report, events);
   });
   const Outcome outcome = watchDrive(options.input, insight, unused, [&] {
+    page.begin();
     web::writeReport({titleOf(options.input), record, insight, veskInterface(), readingOfRow},
                      [&](std::string_view piece) { page.write(piece); });
   });

@@ -23,6 +23,8 @@ TEST(RequestHead, RefusesWhatIsNotARequestOfThisHost) {
       {"GET / HTTP/1.1\r\nHost: evil.example\r\n\r\n", 403},
       {"GET / HTTP/1.1\r\nHost: 127.0.0.1.evil.example\r\n\r\n", 403},
       {"GET / HTTP/1.1\r\n\r\n", 403},
+      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: cross-site\r\nSec-Fetch-Mode: cors\r\n\r\n", 403},
+      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: cross-site\r\nSec-Fetch-Mode: navigate\r\n\r\n", 0},
       {"GET / HTTP/1.1\r\nHost: localhost\r\nHost: evil.example\r\n\r\n", 400},
       {"POST / HTTP/1.1\r\nHost: localhost\r\n\r\n", 405},
       {"GET / HTTP/1.1\r\nHost: localhost\r\nContent-Length: 5\r\n\r\n", 413},

@@ -90,6 +90,9 @@ bool isOurs(std::string_view host, const std::vector<std::string>& names) {
 struct Fields {
   std::optional<std::string_view> host;
   bool hasBody = false;
+  /// Another site's page asks, and not because its reader came here by a link.
+  bool isForeign = false;
+  bool isNavigation = false;
   bool closes = false;
   bool keeps = false;
   bool isSound = true;
@@ -101,6 +104,8 @@ struct Fields {
     }
     if (equalIgnoringCase(name, "Transfer-Encoding")) hasBody = true;
     if (equalIgnoringCase(name, "Content-Length") && value != "0") hasBody = true;
+    if (equalIgnoringCase(name, "Sec-Fetch-Site")) isForeign = value == "cross-site";
+    if (equalIgnoringCase(name, "Sec-Fetch-Mode")) isNavigation = value == "navigate";
     if (equalIgnoringCase(name, "Connection")) {
       closes = equalIgnoringCase(value, "close");
       keeps = equalIgnoringCase(value, "keep-alive");
@@ -129,6 +134,7 @@ int readRequest(std::string_view head, const std::vector<std::string>& names, Re
   const Fields fields = readFields(head);
   if (!fields.isSound || !readTarget(target, request)) return 400;
   if (!fields.host || !isOurs(*fields.host, names)) return 403;
+  if (fields.isForeign && !fields.isNavigation) return 403;
   if (method != "GET" && method != "HEAD") return 405;
   if (fields.hasBody) return 413;
   request.isHead = method == "HEAD";
