@@ -3,7 +3,7 @@
 #include <cstdlib>
 #include <string>
 
-#include "app/outcome.h"
+#include "app/output/outcome.h"
 
 namespace vesk::bench {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "app/vesk_interface.h"
+#include "app/program/vesk_interface.h"
 #include "intake/metric_validator.h"
 #include "screens/first_level_view_controller.h"
 #include "screens/second_level_view_controller.h"

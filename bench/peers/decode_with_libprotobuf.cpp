@@ -5,7 +5,7 @@
 #include <string>
 #include <variant>
 
-#include "app/data_output.h"
+#include "app/output/data_output.h"
 #include "bench/kinds.h"
 #include "bench/stop.h"
 #include "recording/recording_reader.h"

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "app/outcome.h"
+#include "app/output/outcome.h"
 
 namespace vesk {
 

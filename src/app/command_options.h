@@ -4,9 +4,9 @@
 #include <chrono>
 #include <optional>
 
-#include "app/event_source.h"
-#include "app/recording_input.h"
-#include "app/rule_input.h"
+#include "app/commands/rule_input.h"
+#include "app/source/event_source.h"
+#include "app/source/recording_input.h"
 
 /// Options that several commands have. What they are written to must outlive the command.
 namespace vesk {

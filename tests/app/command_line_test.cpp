@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
 
-#include "app/progress.h"
-#include "app/suggestion.h"
+#include "app/commands/suggestion.h"
+#include "app/output/progress.h"
 #include "app/vesk_program.h"
 
 namespace vesk {

@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-#include "app/app_delegate.h"
-#include "app/vesk_interface.h"
+#include "app/program/app_delegate.h"
+#include "app/program/vesk_interface.h"
 #include "corvik/service.h"
 #include "intake/metric_validator.h"
 #include "link/corvik_wrapper.h"

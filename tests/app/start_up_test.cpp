@@ -2,10 +2,10 @@
 #include <fstream>
 #include <gtest/gtest.h>
 
-#include "app/app_id_validator.h"
-#include "app/bundle.h"
 #include "app/connected_program.h"
-#include "app/root_navigation_controller.h"
+#include "app/program/app_id_validator.h"
+#include "app/program/bundle.h"
+#include "app/program/root_navigation_controller.h"
 #include "screens/vesk_view_controller.h"
 #include "system/output_lines.h"
 #include "system/system_log.h"

@@ -1,0 +1,158 @@
+#include "app/commands/show_command.h"
+
+#include <algorithm>
+#include <string_view>
+#include <vector>
+
+#include "app/commands/suggestion.h"
+#include "app/output/data_output.h"
+#include "app/source/road.h"
+#include "screens/vesk_view_items.h"
+#include "toolkit/interface_layout.h"
+#include "toolkit/walk.h"
+#include "values/json_form.h"
+#include "values/visible_text.h"
+
+namespace vesk {
+
+namespace {
+
+/// Opens the screen behind the label. No row has an unknown label: a cell that stands alone leads on from there.
+void openLabel(const NavigationController& root, std::string_view label) {
+  if (openRow(root, label)) return;
+  TableViewController& screen = topTable(root);
+  TableViewCell cell(""_text, CellStyle::Basic, CellAccessory::None);
+  cell.setMainText(Text::copy(label));
+  screen.performTransition(screen.interfaceLayout()->firstTransition(screen.nameInLayout())->identifier, &cell);
+}
+
+void appendJsonOrNull(std::string& out, const std::optional<Text>& text) {
+  if (text) {
+    appendJson(out, text->view());
+  } else {
+    out += "null";
+  }
+}
+
+std::string asJson(const ShowOptions& options, const std::vector<ShownSection>& sections) {
+  std::string out = "{\"area\":";
+  appendJson(out, std::string_view(options.area));
+  out += ",\"category\":";
+  appendJson(out, std::string_view(options.category));
+  out += ",\"sections\":[";
+  std::string_view sectionSeparator;
+  for (const ShownSection& section : sections) {
+    out += sectionSeparator;
+    sectionSeparator = ",";
+    out += "{\"header\":";
+    appendJsonOrNull(out, section.header);
+    out += ",\"rows\":[";
+    std::string_view rowSeparator;
+    for (const auto& [key, value] : section.rows) {
+      out += rowSeparator;
+      rowSeparator = ",";
+      out += "{\"key\":";
+      appendJsonOrNull(out, key);
+      out += ",\"value\":";
+      appendJsonOrNull(out, value);
+      out += '}';
+    }
+    out += "]}";
+  }
+  out += "]}";
+  return out;
+}
+
+/// Field names come from the schema: one column a byte.
+std::size_t widestKey(const std::vector<ShownSection>& sections) {
+  std::size_t widest = 0;
+  for (const ShownSection& section : sections) {
+    for (const ShownRow& row : section.rows)
+      widest = std::max(widest, row.key ? row.key->view().size() : 0);
+  }
+  return widest;
+}
+
+/// Appends the value's lines, the first one where it stands and the others under it.
+void appendValue(std::string& out, std::string_view value, std::size_t column) {
+  for (;;) {
+    const std::size_t lineFeed = value.find('\n');
+    appendVisible(out, value.substr(0, lineFeed));
+    out += '\n';
+    if (lineFeed == std::string_view::npos) return;
+    value.remove_prefix(lineFeed + 1);
+    out.append(column, ' ');
+  }
+}
+
+std::string asText(const ShowOptions& options, const std::vector<ShownSection>& sections) {
+  constexpr std::string_view kIndentation = "  ";
+  constexpr std::size_t kGap = 2;
+  const std::size_t keyWidth = widestKey(sections);
+  std::string out;
+  appendVisible(out, options.area);
+  out += " › ";
+  appendVisible(out, options.category);
+  out += '\n';
+  for (const auto& [header, rows] : sections) {
+    if (header) out += "\n" + std::string(header->view()) + "\n";
+    for (const auto& [key, value] : rows) {
+      if (!key && !value) continue;
+      const std::string_view name = key ? key->view() : std::string_view{};
+      out += kIndentation;
+      out += name;
+      const std::size_t column = kIndentation.size() + keyWidth + kGap;
+      out.append(keyWidth - name.size() + kGap, ' ');
+      appendValue(out, value ? value->view() : std::string_view{}, column);
+    }
+  }
+  out.pop_back();
+  return out;
+}
+
+std::string joined(const std::vector<Text>& labels) {
+  std::string out;
+  for (const Text& label : labels) {
+    if (!out.empty()) out += ", ";
+    out += label.view();
+  }
+  return out;
+}
+
+std::string suggestionAmong(const std::vector<Text>& labels, std::string_view typed) {
+  std::vector<std::string> candidates;
+  candidates.reserve(labels.size());
+  for (const Text& label : labels)
+    candidates.emplace_back(label.view());
+  return suggestionFor(typed, candidates, "\"");
+}
+
+/// Tells which labels there are when these are not among them.
+void tellUnknownLabels(const ShowOptions& options) {
+  const VeskViewItems& menu = VeskViewItems::shared();
+  const auto& areas = menu.launchViewItemNames;
+  const auto& categories = menu.categoriesOf(options.area);
+  if (categories.empty()) {
+    tellUser("vesk: no area \"" + options.area + "\"" + suggestionAmong(areas, options.area) +
+             "; there are: " + joined(areas));
+  } else if (std::find(categories.begin(), categories.end(), options.category) == categories.end()) {
+    tellUser("vesk: no category \"" + options.category + "\" in " + options.area +
+             suggestionAmong(categories, options.category) + "; there are: " + joined(categories));
+  }
+}
+
+}  // namespace
+
+Outcome runShow(const ShowOptions& options) {
+  DataOutput output;
+  tellUnknownLabels(options);
+  const Outcome outcome = playRecording(options.input, [&](NavigationController& root) {
+    openLabel(root, options.area);
+    openLabel(root, options.category);
+    const std::vector<ShownSection> sections = sectionsOf(topTable(root).tableView());
+    output.writeLine(options.asJson ? asJson(options, sections) : asText(options, sections));
+  });
+  return output.finish(outcome);
+}
+
+}  // namespace vesk
