@@ -11,7 +11,6 @@ namespace vesk::web {
 
 namespace {
 
-using insight::Kpi;
 using insight::KpiDescription;
 using insight::writeField;
 

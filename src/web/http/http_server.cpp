@@ -154,11 +154,10 @@ void HttpServer::serve() {
     }
     const auto found = visitors_.find(id);
     if (found == visitors_.end()) continue;
-    if ((event.events & (EPOLLERR | EPOLLHUP)) != 0) {
-      drop(id);
-    } else if ((event.events & EPOLLIN) != 0) {
+    const bool isGone = (event.events & (EPOLLERR | EPOLLHUP)) != 0;
+    if (!isGone && (event.events & EPOLLIN) != 0) {
       receive(id, found->second);
-    } else if (!flush(id, found->second)) {
+    } else if (isGone || !flush(id, found->second)) {
       drop(id);
     } else {
       answerNext(id, found->second);
