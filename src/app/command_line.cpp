@@ -112,10 +112,9 @@ class CommandLine {
     CLI::App* serve = program_.add_subcommand("serve", "Show the live page to browsers, and metrics to Prometheus");
     serve->add_option("--port", serve_.server.port, "Where; 0 for any that is free")
         ->type_name("N")
+        ->check(CLI::Range(0, 65535).description(""))
         ->default_str("8080");
-    serve
-        ->add_option("--bind", serve_.server.address,
-                     "The address to listen on; on any but 127.0.0.1 others can read all that the handset tells")
+    serve->add_option("--bind", serve_.server.address, "Listen here; anywhere but 127.0.0.1 others can read it all")
         ->type_name("ADDRESS")
         ->default_str("127.0.0.1");
     serve->add_option("--host", serve_.server.names, "A name of this machine that browsers may ask for")

@@ -205,9 +205,15 @@ class Charts {
           swatch.style.color = `var(--${name})`;
           return element('li', {}, swatch, text);
         }), element('li', {text: 'foot of each chart: serving cell'})));
-    matchMedia('(prefers-color-scheme: dark)').addEventListener('change', () => {
-      for (const chart of this.charts) chart.graph.updateOptions(chart.looks());
-    });
+    this.scheme = matchMedia('(prefers-color-scheme: dark)');
+    this.repaint = () => { for (const chart of this.charts) chart.graph.updateOptions(chart.looks()); };
+    this.scheme.addEventListener('change', this.repaint);
+  }
+
+  destroy() {
+    this.scheme.removeEventListener('change', this.repaint);
+    for (const chart of this.charts) chart.graph.destroy();
+    this.charts = [];
   }
 
   /** The series that have values; anew whenever another one has. */

@@ -91,6 +91,7 @@ class LivePage {
 
   /** The whole drive: at the beginning, and whenever the connection was lost in between. */
   begin({drive, state}) {
+    this.charts?.destroy();
     this.drive = new Drive(drive);
     this.charts = new Charts(byId('charts'), this.drive, LivePage.trail);
     this.overview = new Overview(byId('now'), this.drive);
