@@ -83,7 +83,7 @@ void LiveServer::start(std::unique_ptr<HttpServer> server) {
     sendNews();
     sendScreens();
   });
-  idleTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { server_->dropIdle(); });
+  idleTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { server_->dropSlow(); });
 }
 
 void LiveServer::take(const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {

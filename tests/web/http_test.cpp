@@ -146,9 +146,23 @@ TEST_F(ServerTest, DropsWhoIsWaitedForTooLong) {
   const FileDescriptor slow = visitor("GET / HT");
   const FileDescriptor watcher = visitor("GET /stream HTTP/1.1\r\n" + std::string(kHost));
   clock_.advance(HttpServer::kPatience + std::chrono::seconds(1));
-  server_->dropIdle();
+  server_->dropSlow();
   EXPECT_EQ(server_->visitorCount(), 1U);
   EXPECT_EQ(streams_.size(), 1U) << "who has nothing to be sent is not waited for";
+}
+
+TEST_F(ServerTest, DropsTheSlowestWhenTooMuchWaitsInAll) {
+  std::vector<FileDescriptor> visitors;
+  for (int count = 0; count < 30; ++count) {
+    visitors.push_back(visitor("GET /stream HTTP/1.1\r\n" + std::string(kHost)));
+    server_->send(streams_.back(), std::make_shared<const std::string>(std::size_t{3} << 20U, 'x'));
+  }
+  const auto shared = std::make_shared<const std::string>(std::size_t{500} << 10U, 'x');
+  for (const StreamId each : std::vector(streams_))
+    server_->send(each, shared);
+  EXPECT_EQ(streams_.size(), 30U);
+  server_->dropSlow();
+  EXPECT_EQ(streams_.size(), 21U) << "of 3 MiB each";
 }
 
 TEST_F(ServerTest, RefusesMoreVisitorsThanItHasRoomFor) {

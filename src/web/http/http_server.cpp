@@ -1,5 +1,6 @@
 #include "web/http/http_server.h"
 
+#include <algorithm>
 #include <arpa/inet.h>
 #include <array>
 #include <cerrno>
@@ -9,6 +10,7 @@
 #include <sys/epoll.h>
 #include <sys/socket.h>
 #include <system_error>
+#include <unordered_set>
 #include <utility>
 
 namespace vesk::web {
@@ -271,6 +273,24 @@ void HttpServer::send(StreamId stream, const SharedText& piece) {
   queue(visitor, piece);
   const bool isTooMuch = visitor.waiting > kMostWaiting + beginning;
   if (isTooMuch || !flush(stream, visitor)) drop(stream);
+}
+
+void HttpServer::dropSlow() {
+  dropIdle();
+  while (const auto id = heaviest())
+    drop(*id);
+}
+
+std::optional<StreamId> HttpServer::heaviest() const {
+  std::unordered_set<const std::string*> pieces;
+  std::size_t waiting = 0;
+  std::pair<std::size_t, StreamId> most{};
+  for (const auto& [id, visitor] : visitors_) {
+    for (const SharedText& piece : visitor.pieces)
+      if (pieces.insert(piece.get()).second) waiting += piece->size();
+    most = std::max(most, {visitor.waiting, id});
+  }
+  return waiting > kMostWaitingInAll ? std::optional(most.second) : std::nullopt;
 }
 
 void HttpServer::dropIdle() {

@@ -4,6 +4,7 @@
 #include <deque>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -49,6 +50,8 @@ class HttpServer {
   static constexpr std::size_t kMostVisitors = 256;
   /// What may wait for a visitor beyond the beginning of his stream: bytes.
   static constexpr std::size_t kMostWaiting = std::size_t{4} << 20U;
+  /// What may wait for all of them, where a piece that several are sent counts once: bytes.
+  static constexpr std::size_t kMostWaitingInAll = std::size_t{64} << 20U;
   /// How long a request may take to come, and a reader to take anything.
   static constexpr std::chrono::seconds kPatience{20};
 
@@ -62,8 +65,9 @@ class HttpServer {
   /// Readable when serve() has something to do.
   [[nodiscard]] int descriptor() const { return events_.get(); }
   void serve();
-  /// Drops those who have been waited for too long; to be called every second or so.
-  void dropIdle();
+  /// Drops those who have been waited for too long, and while too much waits, him for whom most does; to be called
+  /// every second or so.
+  void dropSlow();
 
   /// Sends more of a stream; nothing when its visitor has gone.
   void send(StreamId stream, const SharedText& piece);
@@ -100,6 +104,9 @@ class HttpServer {
   /// Sends what there is room for; false when the visitor is to be dropped.
   [[nodiscard]] bool flush(StreamId id, Visitor& visitor);
   static void queue(Visitor& visitor, SharedText piece);
+  void dropIdle();
+  /// For whom most waits, while all that waits is too much; absent otherwise.
+  [[nodiscard]] std::optional<StreamId> heaviest() const;
   void drop(StreamId id);
 
   FileDescriptor listener_;
