@@ -42,13 +42,16 @@ _vesk_files() {
 
 _vesk() {
   local cur=${COMP_WORDS[COMP_CWORD]} previous=${COMP_WORDS[COMP_CWORD - 1]}
-  local command='' word skip='' arguments=() options='--diag --sim --replay --record --real-pauses --headless --speed --seed --loop --seconds --rule --rules --redact --log --version'
+  local command='' word skip='' arguments=()
+  local commands='decode stores show summary timeline series readings report serve redact simulate import'
+  local sources='--diag --sim --replay --record --real-pauses --speed --seed --loop'
+  local options="$sources --headless --seconds --rule --rules --redact --log --version"
   COMPREPLY=()
 
   for word in "${COMP_WORDS[@]:1:COMP_CWORD-1}"; do
     if [[ -n $skip ]]; then
       skip=''
-    elif [[ $word == --@(diag|sim|replay|record|speed|seed|seconds|log|rule|rules) ]]; then
+    elif [[ $word == --@(diag|sim|replay|record|speed|seed|seconds|log|rule|rules|output|port|bind|host) || $word == -o ]]; then
       skip=1
     elif [[ $word != -?* && -z $command ]]; then
       command=$word
@@ -58,7 +61,7 @@ _vesk() {
   done
 
   case $previous in
-    --replay | --record | --rules) _vesk_files && return ;;
+    --replay | --record | --rules | --output | -o) _vesk_files && return ;;
     --diag) mapfile -t COMPREPLY < <(compgen -G "${cur:-/dev/}*") && return ;;
     --speed) _vesk_offer < <(printf '%s\n' 1 2 5 10 max) && return ;;
     --log)
@@ -66,7 +69,7 @@ _vesk() {
       _vesk_offer < <(printf '%s\n' syslog stderr none)
       return
       ;;
-    --seed | --seconds | --sim | --rule) return ;;
+    --seed | --seconds | --sim | --rule | --port | --bind | --host) return ;;
   esac
 
   case $command in
@@ -75,18 +78,20 @@ _vesk() {
     show | summary | readings) options='--json --redact --log' ;;
     timeline) options='--json --rule --rules --redact --log' ;;
     series) options='--csv --redact --log' ;;
+    report) options='--output --redact --log' ;;
+    serve) options="--port --bind --host $sources --rule --rules --redact --seconds --log" ;;
     simulate) options='--seed --seconds --log' ;;
     import) options='--sim --count --layouts --redact --log' ;;
   esac
   if [[ $cur == -* ]]; then
     mapfile -t COMPREPLY < <(compgen -W "$options --help" -- "$cur")
   elif [[ -z $command ]]; then
-    mapfile -t COMPREPLY < <(compgen -W 'decode stores show summary timeline series readings redact simulate import' -- "$cur")
+    mapfile -t COMPREPLY < <(compgen -W "$commands" -- "$cur")
   elif [[ $command == show && ${#arguments[@]} == 0 ]]; then
     _vesk_offer < <(_vesk_areas)
   elif [[ $command == show && ${#arguments[@]} == 1 ]]; then
     _vesk_offer < <(_vesk_categories "${arguments[0]}")
-  elif [[ $command != simulate ]]; then
+  elif [[ $command != simulate && $command != serve ]]; then
     _vesk_files
   fi
 }

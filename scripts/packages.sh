@@ -13,6 +13,7 @@ build     libcli11-dev        /usr/include/CLI/CLI.hpp
 build     libtomlplusplus-dev /usr/include/toml++/toml.h
 build     libncurses-dev      /usr/include/ncursesw/curses.h
 build     zlib1g-dev          /usr/include/zlib.h
+build     libjs-dygraphs      /usr/share/javascript/dygraphs/dygraph.min.js
 build     protobuf-compiler   protoc
 build     libprotobuf-dev     /usr/include/google/protobuf/message.h
 build     libprotoc-dev       /usr/include/google/protobuf/compiler/plugin.h
@@ -32,6 +33,13 @@ captures  diffutils           cmp
 readme    protobuf-compiler   protoc
 load      time                /usr/bin/time
 load      diffutils           cmp
+page      chromium            chromium
+page      chromium-driver     chromedriver
+page      python3             python3
+visitors  python3             python3
+metrics   prometheus          prometheus
+metrics   curl                curl
+metrics   jq                  jq
 shell     shellcheck          shellcheck
 '
 

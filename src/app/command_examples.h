@@ -70,6 +70,23 @@ inline constexpr const char* kReadingsExamples =
     "  vesk readings drive.jsonl\n"
     "  vesk readings --json drive.jsonl | jq '.heard[] | select(.role == \"serving\")'";
 
+inline constexpr const char* kReportExamples =
+    "One file with charts, cells, timeline and screens. It opens in any browser and\n"
+    "asks for nothing else; --redact keeps identities out of it.\n"
+    "\n"
+    "Examples:\n"
+    "  vesk report drive.jsonl -o drive.html\n"
+    "  vesk report --redact drive.jsonl -o shareable.html";
+
+inline constexpr const char* kServeExamples =
+    "The page is at http://127.0.0.1:8080, JSON at /api/summary, /api/cells,\n"
+    "/api/timeline, /api/series and /api/screens, metrics for Prometheus at /metrics.\n"
+    "\n"
+    "Examples:\n"
+    "  vesk serve                                 a simulated drive\n"
+    "  vesk serve --replay drive.jsonl --loop     a recording, over and over\n"
+    "  curl -s 127.0.0.1:8080/api/cells | jq '.[] | select(.role == \"serving\")'";
+
 inline constexpr const char* kRedactExamples =
     "Masked are IMSI, TMSI, addresses, access points' names, call identifiers and the\n"
     "contents of SIM files that name a subscriber. Cells, areas and times stay.\n"

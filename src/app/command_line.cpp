@@ -3,8 +3,6 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <cerrno>
-#include <charconv>
-#include <cmath>
 #include <cstring>
 #include <functional>
 #include <optional>
@@ -13,12 +11,15 @@
 #include <vector>
 
 #include "app/command_examples.h"
+#include "app/command_options.h"
 #include "app/commands/decode_command.h"
 #include "app/commands/drive_commands.h"
 #include "app/commands/import_command.h"
 #include "app/commands/readings_command.h"
 #include "app/commands/redact_command.h"
+#include "app/commands/report_command.h"
 #include "app/commands/run_command.h"
+#include "app/commands/serve_command.h"
 #include "app/commands/show_command.h"
 #include "app/commands/simulate_command.h"
 #include "app/commands/stores_command.h"
@@ -55,32 +56,6 @@ bool openLog(const std::string& to) {
   return true;
 }
 
-/// A positive number, or "max" for absent.
-bool parseSpeed(const std::string& text, std::optional<double>& speed) {
-  if (text == "max") {
-    speed.reset();
-    return true;
-  }
-  double number = 0;
-  const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
-  const bool isWhole = result.ec == std::errc{} && result.ptr == text.data() + text.size();
-  if (!isWhole || !std::isfinite(number) || number <= 0) return false;
-  speed = number;
-  return true;
-}
-
-/// Seconds from `least` to a billion.
-CLI::Validator secondsFrom(double least) {
-  const auto reasonAgainst = [least](const std::string& text) -> std::string {
-    double seconds = 0;
-    const auto result = std::from_chars(text.data(), text.data() + text.size(), seconds);
-    const bool isWhole = result.ec == std::errc{} && result.ptr == text.data() + text.size();
-    if (isWhole && seconds >= least && seconds <= 1e9) return "";
-    return "expected a number of seconds, got " + text;
-  };
-  return {reasonAgainst, ""};
-}
-
 class CommandLine {
  public:
   CommandLine() {
@@ -98,6 +73,8 @@ class CommandLine {
     addTimeline();
     addSeries();
     addReadings();
+    addReport();
+    addServe();
     addRedact();
     addSimulate();
     addImport();
@@ -124,56 +101,36 @@ class CommandLine {
 
  private:
   void addRunOptions() {
-    CLI::Option* replay =
-        program_.add_option("--replay", run_.source.replay, "Feed it a recording or a capture; - is stdin")
-            ->type_name("FILE");
-    CLI::Option* port = program_.add_option("--diag", run_.source.port, "Feed it a modem's diagnostic port")
-                            ->type_name("PORT")
-                            ->excludes(replay);
-    program_.add_option("--sim", run_.source.sim, "Take one SIM's packets only, from 1: of a port or a capture")
-        ->type_name("N")
-        ->check(CLI::PositiveNumber.description(""));
-    CLI::Option* record =
-        program_.add_option("--record", run_.source.record, "Keep what comes: of a port the capture, else a recording")
-            ->type_name("FILE");
     program_.add_flag("--headless", run_.isHeadless, "No screens: diagnostic lines on standard output");
-    program_
-        .add_option_function<std::string>(
-            "--speed",
-            [this](const std::string& text) {
-              if (parseSpeed(text, run_.source.playback.speed)) return;
-              throw CLI::ValidationError("--speed", "expected a positive number or max, got " + text);
-            },
-            "Replay so many seconds in one: a number, or max")
-        ->type_name("N")
-        ->default_str("1")
-        ->needs(replay);
-    program_.add_option("--seed", run_.source.seed, "Which drive of the simulated handset")
-        ->type_name("N")
-        ->check(CLI::NonNegativeNumber.description(""))
-        ->excludes(replay)
-        ->excludes(port);
-    program_.add_flag("--real-pauses", run_.source.playback.keepsPauses, "Do not shorten pauses of more than a minute")
-        ->needs(replay);
-    program_.add_flag("--loop", run_.source.playback.loops, "Replay from the start again at the end")->needs(replay);
+    addSourceOptions(program_, run_.source);
     addRedactOption(program_, run_.isRedacted);
-    // What is kept is what came, identities included.
-    program_.get_option("--redact")->excludes(record);
     addRuleOptions(program_, run_.rules);
-    program_
-        .add_option_function<double>(
-            "--seconds",
-            [this](double seconds) {
-              run_.duration =
-                  std::chrono::duration_cast<std::chrono::nanoseconds>(std::chrono::duration<double>(seconds));
-            },
-            "End after that many seconds")
-        ->type_name("N")
-        ->check(secondsFrom(0.001));
+    addDurationOption(program_, run_.duration);
     addLogOption(program_, kProgramLog);
     program_.callback([this] {
       if (program_.get_subcommands().empty()) command_ = [this] { return runProgram(run_); };
     });
+  }
+
+  void addServe() {
+    CLI::App* serve = program_.add_subcommand("serve", "Show the live page to browsers, and metrics to Prometheus");
+    serve->add_option("--port", serve_.server.port, "Where; 0 for any that is free")
+        ->type_name("N")
+        ->check(CLI::Range(0, 65535).description(""))
+        ->default_str("8080");
+    serve->add_option("--bind", serve_.server.address, "Listen here; anywhere but 127.0.0.1 others can read it all")
+        ->type_name("ADDRESS")
+        ->default_str("127.0.0.1");
+    serve->add_option("--host", serve_.server.names, "A name of this machine that browsers may ask for")
+        ->type_name("NAME")
+        ->allow_extra_args(false);
+    addSourceOptions(*serve, serve_.source);
+    addRedactOption(*serve, serve_.isRedacted);
+    addRuleOptions(*serve, serve_.rules);
+    addDurationOption(*serve, serve_.duration);
+    addLogOption(*serve, kDataLog);
+    serve->footer(kServeExamples);
+    serve->final_callback([this] { command_ = [this] { return runServe(serve_); }; });
   }
 
   void addDecode() {
@@ -242,6 +199,16 @@ class CommandLine {
     readings->final_callback([this] { command_ = [this] { return runReadings(input_, asJson_); }; });
   }
 
+  void addReport() {
+    CLI::App* report = program_.add_subcommand("report", "Write what a drive was as one HTML page");
+    addRecording(*report, report_.input);
+    report->add_option("-o,--output", report_.output, "The file to write; standard output without it")
+        ->type_name("OUT");
+    addLogOption(*report, kDataLog);
+    report->footer(kReportExamples);
+    report->final_callback([this] { command_ = [this] { return runReport(report_); }; });
+  }
+
   void addRedact() {
     CLI::App* redact = program_.add_subcommand("redact", "Print a recording without the subscriber's identities");
     addFile(*redact, input_, "The recording; - or nothing for standard input");
@@ -270,9 +237,7 @@ class CommandLine {
     import_.input.path = "-";
     addFile(*command, import_.input, "The capture; - or nothing for standard input");
     addRedactOption(*command, import_.input.isRedacted);
-    command->add_option("--sim", import_.sim, "Take the packets of one SIM only, from 1")
-        ->type_name("N")
-        ->check(CLI::PositiveNumber.description(""));
+    addSimOption(*command, import_.sim);
     command->add_flag("--count", import_.countsOnly, "Print a table of what the capture holds instead");
     command->add_flag("--layouts", import_.layoutsOnly, "Print a table of what can be read");
     addLogOption(*command, kDataLog);
@@ -333,34 +298,6 @@ class CommandLine {
     return "no subcommand " + word + suggestionFor(word, names);
   }
 
-  /// Standard input where no file is named.
-  static void addRecording(CLI::App& command, RecordingInput& input) {
-    input.path = "-";
-    addFile(command, input, "The recording; - or nothing for standard input");
-    addRedactOption(command, input.isRedacted);
-  }
-
-  static void addRecordingIfAny(CLI::App& command, RecordingInput& input) {
-    addFile(command, input, "The recording; - is standard input, nothing: no events yet");
-    addRedactOption(command, input.isRedacted);
-  }
-
-  static void addFile(CLI::App& command, RecordingInput& input, const std::string& description) {
-    command.add_option("FILE", input.path, description)->type_name("");
-  }
-
-  static void addRedactOption(CLI::App& command, bool& isRedacted) {
-    command.add_flag("--redact", isRedacted, "Without the subscriber's identities and addresses");
-  }
-
-  /// Each --rule takes one.
-  static void addRuleOptions(CLI::App& command, RuleInput& rules) {
-    command.add_option("--rule", rules.rules, "Tell when it fires: \"lte.rsrp < -110 for 10 s\", \"event drop\"")
-        ->type_name("RULE")
-        ->allow_extra_args(false);
-    command.add_option("--rules", rules.file, "A file of such rules, one a line")->type_name("FILE");
-  }
-
   void addLogOption(CLI::App& command, const std::string& usual) {
     command.add_option("--log", logTo_, "Where the system log goes: syslog, stderr, none or a file")
         ->type_name("TO")
@@ -374,6 +311,8 @@ class CommandLine {
   ImportOptions import_;
   RecordingInput input_;
   TimelineOptions timeline_;
+  ReportOptions report_;
+  ServeOptions serve_;
   bool asJson_ = false;
   bool asCsv_ = false;
   std::optional<std::string> logTo_;

@@ -57,6 +57,9 @@ std::optional<std::int64_t> parseHexNumber(std::string_view text) {
 
 }  // namespace
 
+/// Seconds, thirty years: no replay waits longer, and every clock can hold it.
+constexpr double kLatest = 1e9;
+
 /// Takes what the reader finds in a line, piece by piece. The functions that it calls go by its names; false ends
 /// the reading, and the parser's reason is set.
 class RecordedEventParser::Fields : public rapidjson::BaseReaderHandler<rapidjson::UTF8<>, Fields> {
@@ -89,6 +92,7 @@ class RecordedEventParser::Fields : public rapidjson::BaseReaderHandler<rapidjso
     if (key_ == Name::at) {
       at = number<double>({text, length});
       if (!at) return Default();
+      if (*at > kLatest) return parser_.fail("\"at\": expected at most a billion seconds");
       return *at >= 0 || parser_.fail("\"at\": expected seconds that are not negative");
     }
     if (key_ == Name::metric) {

@@ -62,6 +62,8 @@ class InterfaceLayout {
 
   /// The root stack with the first screen on it; nothing is loaded yet.
   [[nodiscard]] std::shared_ptr<NavigationController> makeRootStack() const;
+  /// The screen that stands first on the root stack, for another stack to walk from.
+  [[nodiscard]] std::shared_ptr<ViewController> makeFirstScreen() const { return makeScreen(tables_.firstScreen); }
   /// A new screen; null for a name that is not declared.
   [[nodiscard]] std::shared_ptr<ViewController> makeScreen(std::string_view name) const;
 

@@ -77,5 +77,27 @@ TEST(DriveCommands, HaveHeadlessRunsJudgeRules) {
   EXPECT_EQ(finished.status, 3);
 }
 
+TEST(DriveCommands, WriteAReportThatIsOneFile) {
+  const TemporaryFile page("");
+  Finished finished = vesk({"report", "-o", page.path()}, kDrive);
+  EXPECT_EQ(finished.output + finished.error, "");
+  EXPECT_EQ(finished.status, 0);
+  const std::string report = vesk({"report"}, kDrive).output;
+  EXPECT_EQ(vesk({"report", page.path() + "/none", "-o", page.path()}).status, 1);
+  for (const char* part :
+       {R"("title":"standard input")", R"("rrc","CONNECTED, EST MO DATA, after 91 ms in ATMPT CONNECTION"])",
+        R"({"area":"LTE","category":"RRC State")", "</html>"})
+    EXPECT_NE(report.find(part), std::string::npos) << part;
+  finished = vesk({"report", "-o", page.path() + "/none"}, kDrive);
+  EXPECT_EQ(finished.error, "vesk: " + page.path() + "/none: Not a directory\n");
+  EXPECT_EQ(finished.status, 1);
+}
+
+TEST(DriveCommands, RefuseToServeWhereTheyCannot) {
+  const Finished finished = vesk({"serve", "--bind", "everywhere", "--seconds", "1"});
+  EXPECT_EQ(finished.error, "vesk: everywhere is no address\n");
+  EXPECT_EQ(finished.status, 1);
+}
+
 }  // namespace
 }  // namespace vesk

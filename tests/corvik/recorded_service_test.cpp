@@ -248,7 +248,7 @@ TEST_F(RecordedServiceTest, PlaysAPipeAsItIsWrittenAndIsInterruptedWhileItWaitsF
 }
 
 TEST_F(RecordedServiceTest, IsInterruptedWhileItWaitsForAnEventsTime) {
-  connect(vesk::fileWith(line(1e300, 1)), {.speed = 1.0, .keepsPauses = true});
+  connect(vesk::fileWith(line(1e9, 1)), {.speed = 1.0, .keepsPauses = true});
   EXPECT_GT(clock_.waitForSleeper(), 1h);
   manager_.reset();
   EXPECT_TRUE(ids_.empty());

@@ -63,6 +63,7 @@ TEST(RecordingReader, ReadsOrRefusesALine) {
       {R"({"at": "1", "metric": 2, "payload": ""})", "r:1: \"at\": expected seconds, a number"},
       {R"({"at": 1e999, "metric": 2, "payload": ""})", "r:1: \"at\": expected seconds, a number"},
       {R"({"at": -0.5, "metric": 2, "payload": ""})", "r:1: \"at\": expected seconds that are not negative"},
+      {R"({"at": 1e10, "metric": 2, "payload": ""})", "r:1: \"at\": expected at most a billion seconds"},
       {R"({"at": 1, "metric": 2.5, "payload": ""})", metric},
       {R"({"at": 1, "metric": 9223372036854775808, "payload": ""})", metric},
       {R"({"at": 1, "metric": "0x8000000000000000", "payload": ""})", metric},
@@ -234,11 +235,11 @@ TEST(RecordedEvent, IsWrittenAsItIsRead) {
   std::string lines;
   appendRecordedEvent(lines, {12.5, 0x3C4E04, payload});
   EXPECT_EQ(lines, "{\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"0895\"}\n");
-  appendRecordedEvent(lines, {1e300, -7, {}});
+  appendRecordedEvent(lines, {1e9, -7, {}});
   appendRecordedEvent(lines, {0, 0, {}});
   appendRecordedEvent(lines, {0.1, std::numeric_limits<std::int64_t>::max(), {}});
   EXPECT_EQ(readAll(lines),
-            (std::vector<std::string>{"12.5 3952132 0895", "1.0e+300 -7 ", "0.0 0 ", "0.1 9223372036854775807 "}));
+            (std::vector<std::string>{"12.5 3952132 0895", "1000000000.0 -7 ", "0.0 0 ", "0.1 9223372036854775807 "}));
 }
 
 }  // namespace

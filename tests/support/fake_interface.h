@@ -46,6 +46,7 @@ class FakeInterface {
     stack_->loadViewIfNeeded();
   }
 
+  [[nodiscard]] const InterfaceLayout& layout() const { return layout_; }
   [[nodiscard]] NavigationController& stack() { return *stack_; }
   [[nodiscard]] FakeTableScreen& top() { return dynamic_cast<FakeTableScreen&>(*stack_->stack().back()); }
 

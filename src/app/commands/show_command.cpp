@@ -9,7 +9,7 @@
 #include "app/source/road.h"
 #include "screens/vesk_view_items.h"
 #include "toolkit/interface_layout.h"
-#include "toolkit/table_view_controller.h"
+#include "toolkit/walk.h"
 #include "values/json_form.h"
 #include "values/visible_text.h"
 
@@ -17,46 +17,13 @@ namespace vesk {
 
 namespace {
 
-struct ShownRow {
-  std::optional<Text> key;
-  std::optional<Text> value;
-};
-
-struct ShownSection {
-  std::optional<Text> header;
-  std::vector<ShownRow> rows;
-};
-
-TableViewController& topTable(const NavigationController& root) {
-  return dynamic_cast<TableViewController&>(*root.topViewController());
-}
-
-/// Goes on from the top screen by the row with that label, as its user would. No row has an unknown label: a cell that
-/// stands alone leads on from there.
-void openRow(const NavigationController& root, std::string_view label) {
+/// Opens the screen behind the label. No row has an unknown label: a cell that stands alone leads on from there.
+void openLabel(const NavigationController& root, std::string_view label) {
+  if (openRow(root, label)) return;
   TableViewController& screen = topTable(root);
-  for (std::size_t row = 0; row < screen.tableView().numberOfRows(0); ++row) {
-    const TableViewCell* cell = screen.tableView().cellForRow({0, row});
-    if (cell != nullptr && cell->mainText() == std::optional(Text::copy(label))) {
-      screen.selectRow({0, row});
-      return;
-    }
-  }
   TableViewCell cell(""_text, CellStyle::Basic, CellAccessory::None);
   cell.setMainText(Text::copy(label));
   screen.performTransition(screen.interfaceLayout()->firstTransition(screen.nameInLayout())->identifier, &cell);
-}
-
-std::vector<ShownSection> sectionsOf(TableView& table) {
-  std::vector<ShownSection> sections;
-  for (std::size_t section = 0; section < table.numberOfSections(); ++section) {
-    ShownSection& shown = sections.emplace_back(ShownSection{table.headerTitle(section), {}});
-    for (std::size_t row = 0; row < table.numberOfRows(section); ++row) {
-      const TableViewCell* cell = table.cellForRow({section, row});
-      shown.rows.push_back(cell == nullptr ? ShownRow{} : ShownRow{cell->mainText(), cell->detailText()});
-    }
-  }
-  return sections;
 }
 
 void appendJsonOrNull(std::string& out, const std::optional<Text>& text) {
@@ -184,8 +151,8 @@ Outcome runShow(const ShowOptions& options) {
   DataOutput output;
   const bool areLabelsKnown = checkLabels(options);
   Outcome outcome = playRecording(options.input, [&](NavigationController& root) {
-    openRow(root, options.area);
-    openRow(root, options.category);
+    openLabel(root, options.area);
+    openLabel(root, options.category);
     const std::vector<ShownSection> sections = sectionsOf(topTable(root).tableView());
     output.writeLine(options.asJson ? asJson(options, sections) : asText(options, sections));
   });

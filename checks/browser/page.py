@@ -1,0 +1,211 @@
+"""page.py VESK PICTURES: the report and the live page as their readers use them. Ends with what went wrong."""
+
+import pathlib
+import re
+import subprocess
+import sys
+import tempfile
+import time
+
+from browser import Browser
+
+HOSTILE = "<img src=x onerror=\"document.title='taken'\"><script>document.title='taken'</script>"
+AXIS = "return [...document.querySelectorAll('.plot')].map((plot) => [...plot.querySelectorAll('.dygraph-axis-label-x')].map((each) => each.textContent).join(' '))"
+INKED = """return [...document.querySelectorAll('.plot')].map((plot) => [...plot.querySelectorAll('canvas')].some((canvas) => {
+    const bytes = canvas.getContext('2d').getImageData(0, 0, canvas.width, canvas.height).data;
+    return new Set(new Uint32Array(bytes.buffer)).size > 3; }))"""
+VISITS = "return [...document.querySelectorAll('#cells tbody tr')].map((row) => Number(row.children[5].textContent))"
+CLICK = "const found = [...document.querySelectorAll(arguments[0])].find((each) => each.textContent.startsWith(arguments[1])); found.click(); return found.textContent"
+FOCUSED = "const each = document.activeElement; return each.className + ' ' + each.textContent"
+
+
+def demand(condition, what):
+    if not condition:
+        raise AssertionError(what)
+
+
+def hostile_event(at):
+    """A bearer whose access point's name is a piece of a page."""
+    name = HOSTILE.encode()
+    bearer = bytes([0x10, 5, 0x1A, len(name)]) + name
+    payload = bytes([0x08]) + varint(1516485161565 + at) + bytes([0x10, 1, 0x1A]) + varint(len(bearer)) + bearer
+    return f'{{"at": {at}, "metric": "0x3CD50D", "payload": "{payload.hex()}"}}\n'
+
+
+def varint(number):
+    out = bytearray()
+    while number > 127:
+        out.append(number & 127 | 128)
+        number >>= 7
+    return bytes(out + bytes([number]))
+
+
+def check_clean(browser, allowed):
+    demand(not (errors := browser.errors()), f"the console was told: {errors}")
+    strays = [url for url in browser.requests() if not url.startswith((allowed, "chrome://"))]
+    demand(not strays, f"it asked for {strays}")
+
+
+def check_zoom(browser):
+    whole = browser.run(AXIS)
+    demand(len(whole) >= 3 and len(set(whole)) == 1, f"the charts do not show the same: {whole}")
+    browser.drag(".plot", 0.4, 0.6)
+    zoomed = browser.wait(lambda: (now := browser.run(AXIS)) != whole and now, "a zoom by mouse")
+    demand(len(set(zoomed)) == 1, f"the zoom is not linked: {zoomed}")
+    browser.run(CLICK, "#charts button", "whole drive")
+    browser.wait(lambda: browser.run(AXIS) == whole, "the whole drive again")
+
+
+def check_cells(browser):
+    for order in (sorted, lambda numbers: sorted(numbers, reverse=True)):
+        browser.run(CLICK, "#cells th button", "visits")
+        numbers = browser.run(VISITS)
+        demand(len(set(numbers)) > 1, "cells that differ in their visits")
+        demand(numbers in (sorted(numbers), sorted(numbers, reverse=True)), f"not sorted: {numbers}")
+        first, check_cells.first = getattr(check_cells, "first", None), numbers
+        demand(first != numbers, "a second click does not turn the order round")
+    del check_cells.first
+
+
+def check_timeline(browser):
+    count = lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length")
+    kinds = lambda: browser.run("return [...new Set([...document.querySelectorAll('#timeline tbody td:nth-child(2)')].map((each) => each.textContent))]")
+    browser.run(CLICK, "#timeline button", "none")
+    demand(count() == 0, "no kind is chosen, and there are rows")
+    browser.run(CLICK, "#timeline button", "rrc ")
+    demand(kinds() == ["rrc"], f"only rrc was chosen: {kinds()}")
+    whole = browser.run(AXIS)
+    chosen = browser.run("const last = [...document.querySelectorAll('#timeline tbody button')].pop(); last.click(); return last.textContent")
+    browser.wait(lambda: browser.run(AXIS) != whole, "the moment in the charts")
+    moment = browser.run("return document.querySelector('#moment').textContent")
+    demand(moment.startswith(chosen[:19]), f"a click on {chosen} shows {moment}")
+    browser.run(CLICK, "#timeline button", "all")
+
+
+def check_keyboard(browser):
+    """From the top of the page on, with nothing but the keys."""
+    browser.run("document.activeElement.blur(); scrollTo(0, 0); document.querySelector('#charts button').click()")
+    whole = browser.run(AXIS)
+    tab_to(browser, "chart ")
+    browser.press("+")
+    zoomed = browser.wait(lambda: (now := browser.run(AXIS)) != whole and now, "a zoom by key")
+    browser.press("Left")
+    browser.wait(lambda: browser.run(AXIS) != zoomed, "a move by key")
+    browser.press("0")
+    browser.wait(lambda: browser.run(AXIS) == whole, "the whole drive by key")
+    tab_to(browser, " channel")
+    browser.press("Enter")
+    sort = "return document.querySelector('#cells th[aria-sort]').textContent"
+    demand(browser.run(sort) == "channel", "a key sorts the table")
+
+
+def tab_to(browser, what):
+    for _ in range(60):
+        browser.press("Tab")
+        if browser.run(FOCUSED).startswith(what):
+            return
+    raise AssertionError(f"no key leads to '{what}'")
+
+
+def check_hostile(browser):
+    seen = browser.run("return [document.querySelectorAll('img').length, document.title.includes('taken'), document.body.textContent.includes(arguments[0])]", HOSTILE)
+    demand(seen == [0, False, True], f"images, title taken, shown as text: {seen}")
+
+
+def check_width(browser):
+    browser.look(360, 800, "light")
+    browser.wait(lambda: browser.run("return document.documentElement.scrollWidth") <= 360, "a page of 360 pixels")
+
+
+def take_pictures(browser, pictures, name):
+    for width, height in ((360, 1600), (1280, 1600)):
+        for scheme in ("light", "dark"):
+            browser.look(width, height, scheme)
+            browser.run("scrollTo(0, 0)")
+            time.sleep(0.3)
+            browser.picture(pictures / f"{name}-{width}-{scheme}.png")
+
+
+def check_report(browser, vesk, scratch, pictures):
+    recording = scratch / "<img src=x onerror=alert(1)>.jsonl"
+    with open(recording, "w") as file:
+        subprocess.run([vesk, "simulate", "--seconds", "1800"], stdout=file, check=True)
+        file.write(hostile_event(1801))
+    page = scratch / "drive.html"
+    subprocess.run([vesk, "report", recording, "-o", page], check=True)
+    browser.look(1280, 1000, "light")
+    browser.open(page.as_uri())
+    browser.wait(lambda: (inked := browser.run(INKED)) and all(inked), "charts with lines")
+    check_zoom(browser)
+    check_cells(browser)
+    check_timeline(browser)
+    check_keyboard(browser)
+    browser.run("for (const fold of document.querySelectorAll('#screens details')) fold.open = true")
+    browser.wait(lambda: browser.run("return document.querySelectorAll('#screens .number, #screens td').length > 50"), "the screens")
+    check_hostile(browser)
+    check_width(browser)
+    take_pictures(browser, pictures, "report")
+    check_clean(browser, page.as_uri())
+
+
+def serve(vesk, *arguments):
+    """The program and where its page is."""
+    process = subprocess.Popen([vesk, "serve", "--port", "0", *arguments], stderr=subprocess.PIPE, text=True)
+    return process, re.search(r"http://\S+(?=;)", process.stderr.readline()).group()
+
+
+def check_live(browser, vesk, scratch, pictures):
+    process, place = serve(vesk)
+    try:
+        browser.look(1280, 1000, "light")
+        browser.open(place)
+        tiles = "return [...document.querySelectorAll('.kpi b')].map((each) => each.textContent).join(' ')"
+        first = browser.wait(lambda: browser.run(tiles), "values")
+        browser.wait(lambda: browser.run(tiles) != first, "a value to change")
+        browser.wait(lambda: (inked := browser.run(INKED)) and all(inked), "charts with lines")
+        browser.run(CLICK, "#screens button", "Serving Cell Meas")
+        row = "return [...document.querySelectorAll('#screens .columns td')].map((each) => each.textContent).join(' ')"
+        shown = browser.wait(lambda: "rsrp" in (now := browser.run(row)) and now, "a screen")
+        browser.wait(lambda: browser.run(row) != shown, "the screen to go on")
+        browser.wait(lambda: browser.run("return document.querySelectorAll('#cells tbody tr').length"), "the cells")
+        check_width(browser)
+        take_pictures(browser, pictures, "live")
+        check_clean(browser, place)
+    finally:
+        process.terminate()
+        process.wait()
+    browser.wait(lambda: "lost" in browser.run("return document.querySelector('#state').textContent"), "the loss of the connection to be told")
+
+
+def check_hostile_live(browser, vesk, scratch):
+    recording = scratch / "hostile.jsonl"
+    recording.write_text(hostile_event(0))
+    process, place = serve(vesk, "--replay", str(recording))
+    try:
+        browser.open(place)
+        browser.requests(), browser.errors()
+        browser.wait(lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length"), "the event")
+        browser.run(CLICK, "#screens button", "Active Bearers")
+        browser.wait(lambda: browser.run("return document.querySelectorAll('#screens .columns td').length"), "the screen")
+        check_hostile(browser)
+        check_clean(browser, place)
+    finally:
+        process.terminate()
+        process.wait()
+
+
+def main(vesk, pictures):
+    pictures = pathlib.Path(pictures)
+    pictures.mkdir(parents=True, exist_ok=True)
+    with tempfile.TemporaryDirectory() as scratch, Browser() as browser:
+        scratch = pathlib.Path(scratch)
+        check_report(browser, vesk, scratch, pictures)
+        check_live(browser, vesk, scratch, pictures)
+        check_hostile_live(browser, vesk, scratch)
+
+
+if __name__ == "__main__":
+    try:
+        main(*sys.argv[1:])
+    except AssertionError as failure:
+        sys.exit(f"page: {failure}")

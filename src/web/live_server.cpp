@@ -1,0 +1,222 @@
+#include "web/live_server.h"
+
+#include <algorithm>
+#include <array>
+
+#include "insight/summary_form.h"
+#include "web/drive_json.h"
+#include "web/page_parts.h"
+#include "web/prometheus_text.h"
+
+namespace vesk::web {
+
+namespace {
+
+constexpr std::chrono::milliseconds kNewsInterval{500};
+/// What a chart can show of half a second; and of a burst of events, what a person can read of it.
+constexpr RecordLimits kNews{32, 50};
+constexpr RecordLimits kLiveDrive{4096, 200};
+
+constexpr std::string_view kJson = "application/json; charset=utf-8";
+constexpr std::string_view kStream = "text/event-stream; charset=utf-8";
+constexpr std::string_view kScript = "text/javascript; charset=utf-8";
+
+SharedText shared(std::string text) {
+  return std::make_shared<const std::string>(std::move(text));
+}
+
+/// What `write` writes, as an answer.
+template <class Write>
+Response jsonResponse(Write write) {
+  std::string out;
+  JsonWriter json(out);
+  write(json);
+  json.finish();
+  return {.type = kJson, .body = shared(std::move(out))};
+}
+
+std::string servedPage() {
+  std::string page(kPageHtml.content);
+  constexpr std::array<std::pair<std::string_view, std::string_view>, 4> kMarks{{
+      {"{{policy}}", ""},
+      {"{{style}}", "<link rel=\"stylesheet\" href=\"/page.css\">\n<link rel=\"icon\" href=\"/icon.svg\">"},
+      {"{{drive}}", ""},
+      {"{{script}}", "<script src=\"/charts.js\"></script>\n<script src=\"/page.js\"></script>"},
+  }};
+  for (const auto& [mark, content] : kMarks)
+    page.replace(page.find(mark), mark.size(), content);
+  return page;
+}
+
+}  // namespace
+
+struct LiveServer::Route {
+  std::string_view path;
+  Response (LiveServer::*answer)(const Request& request);
+};
+
+std::unique_ptr<LiveServer> LiveServer::open(const ServerOptions& options, LiveSources sources, std::string& reason) {
+  std::unique_ptr<LiveServer> live(new LiveServer(std::move(sources)));
+  auto server = HttpServer::open(
+      options, RunLoop::main().clock(), [&page = *live](const Request& request) { return page.answer(request); },
+      reason);
+  if (server == nullptr) return nullptr;
+  live->start(std::move(server));
+  return live;
+}
+
+LiveServer::LiveServer(LiveSources sources) : sources_(std::move(sources)), whole_(kLiveDrive), news_(kNews) {}
+
+LiveServer::~LiveServer() {
+  if (server_ != nullptr) RunLoop::main().removeInput(server_->descriptor());
+}
+
+void LiveServer::start(std::unique_ptr<HttpServer> server) {
+  server_ = std::move(server);
+  server_->setStreamEndHandler([this](StreamId stream) {
+    watchers_.erase(stream);
+    walks_.erase(stream);
+  });
+  RunLoop& loop = RunLoop::main();
+  loop.addInput(server_->descriptor(), [this] { server_->serve(); });
+  newsTimer_.emplace(loop, kNewsInterval, RunLoopMode::defaultMode, [this] {
+    sendNews();
+    sendScreens();
+  });
+  idleTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { server_->dropSlow(); });
+}
+
+void LiveServer::take(const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
+  whole_.take(sources_.insight, report, events);
+  news_.take(sources_.insight, report, events);
+}
+
+std::string LiveServer::driveMessage(std::string_view event, const DriveRecord& record) const {
+  std::string message = "event: " + std::string(event) + "\ndata: {\"state\":";
+  appendJson(message, std::string_view(sources_.state()));
+  message += ",\"drive\":";
+  appendDriveJson(message, record, sources_.insight);
+  return message + "}\n\n";
+}
+
+std::string LiveServer::screenMessage(const ScreenWalk& walk) const {
+  std::string message = "event: screen\ndata: ";
+  JsonWriter json(message);
+  walk.writeJson(json, sources_.readings);
+  json.finish();
+  return message + "\n\n";
+}
+
+/// Those who have come since the last news have seen them: they were sent the whole drive.
+void LiveServer::sendNews() {
+  std::string state = sources_.state();
+  const bool isNothingNew = news_.isEmpty() && state == lastState_;
+  if (!watchers_.empty() && !isNothingNew) {
+    const SharedText message = shared(driveMessage("news", news_));
+    const std::vector<StreamId> watchers(watchers_.begin(), watchers_.end());
+    for (const StreamId watcher : watchers)
+      server_->send(watcher, message);
+  }
+  lastState_ = std::move(state);
+  news_.clear();
+  beginning_.reset();
+}
+
+void LiveServer::sendScreens() {
+  std::vector<std::pair<StreamId, SharedText>> messages;
+  for (auto& [stream, walk] : walks_)
+    if (std::exchange(walk.isChanged, false)) messages.emplace_back(stream, shared(screenMessage(*walk.screens)));
+  for (const auto& [stream, message] : messages)
+    server_->send(stream, message);
+}
+
+Response LiveServer::answer(const Request& request) {
+  static constexpr std::array<Route, 14> kRoutes{{
+      {"/", &LiveServer::page},
+      {"/page.css", &LiveServer::page},
+      {"/icon.svg", &LiveServer::page},
+      {"/charts.js", &LiveServer::page},
+      {"/page.js", &LiveServer::page},
+      {"/live", &LiveServer::beginDrive},
+      {"/live/screen", &LiveServer::beginScreen},
+      {"/api/menu", &LiveServer::menu},
+      {"/api/screens", &LiveServer::screens},
+      {"/api/cells", &LiveServer::cells},
+      {"/api/timeline", &LiveServer::timeline},
+      {"/api/series", &LiveServer::series},
+      {"/api/summary", &LiveServer::summary},
+      {"/metrics", &LiveServer::metrics},
+  }};
+  const auto* route =
+      std::find_if(kRoutes.begin(), kRoutes.end(), [&](const Route& each) { return each.path == request.path; });
+  return route == kRoutes.end() ? plainResponse(404, "There is no such page.") : (this->*route->answer)(request);
+}
+
+Response LiveServer::page(const Request& request) {
+  if (request.path == "/page.css")
+    return {.type = "text/css; charset=utf-8", .body = shared(std::string(kPageStyle.content))};
+  if (request.path == "/icon.svg") return {.type = "image/svg+xml", .body = shared(std::string(kPageIcon.content))};
+  if (request.path == "/charts.js") return {.type = kScript, .body = shared(std::string(kChartScript.content))};
+  if (request.path == "/page.js") return {.type = kScript, .body = shared(std::string(kPageScript.content))};
+  return {.type = "text/html; charset=utf-8", .body = shared(servedPage())};
+}
+
+/// News that were not sent yet are sent to a new watcher nevertheless: so the others' are sent first.
+Response LiveServer::beginDrive(const Request& /*request*/) {
+  if (beginning_ == nullptr) {
+    if (!news_.isEmpty()) sendNews();
+    beginning_ = shared(driveMessage("drive", whole_));
+  }
+  return {.type = kStream, .body = beginning_, .begin = [this](StreamId stream) { watchers_.insert(stream); }};
+}
+
+Response LiveServer::beginScreen(const Request& request) {
+  auto walk = std::make_shared<Walk>(Walk{std::make_unique<ScreenWalk>(sources_.layout)});
+  if (!walk->screens->open(request.parameter("area"), request.parameter("category")))
+    return plainResponse(404, "There is no such screen; /api/menu tells which there are.");
+  return {.type = kStream, .body = shared(screenMessage(*walk->screens)), .begin = [this, walk](StreamId stream) {
+            Walk& kept = walks_[stream] = std::move(*walk);
+            kept.screens->setObserver([&kept] { kept.isChanged = true; });
+          }};
+}
+
+Response LiveServer::menu(const Request& /*request*/) {
+  return jsonResponse([&](JsonWriter& json) { writeMenuJson(json, sources_.layout); });
+}
+
+Response LiveServer::screens(const Request& request) {
+  if (request.query.empty())
+    return jsonResponse([&](JsonWriter& json) { writeScreensJson(json, sources_.layout, sources_.readings); });
+  ScreenWalk walk(sources_.layout);
+  if (!walk.open(request.parameter("area"), request.parameter("category")))
+    return plainResponse(404, "There is no such screen; /api/menu tells which there are.");
+  return jsonResponse([&](JsonWriter& json) { walk.writeJson(json, sources_.readings); });
+}
+
+Response LiveServer::cells(const Request& /*request*/) {
+  return jsonResponse([&](JsonWriter& json) { insight::writeJson(json, sources_.insight.cellsHeard()); });
+}
+
+Response LiveServer::timeline(const Request& /*request*/) {
+  return jsonResponse([&](JsonWriter& json) {
+    writeJsonArray(json, sources_.insight.happenings(),
+                   [&](const insight::Insight::Happening& each) { writeJson(json, each.event); });
+  });
+}
+
+Response LiveServer::series(const Request& /*request*/) {
+  std::string json;
+  appendDriveJson(json, whole_, sources_.insight);
+  return {.type = kJson, .body = shared(std::move(json))};
+}
+
+Response LiveServer::summary(const Request& /*request*/) {
+  return {.type = kJson, .body = shared(insight::summaryJson(sources_.insight))};
+}
+
+Response LiveServer::metrics(const Request& /*request*/) {
+  return {.type = "text/plain; version=0.0.4; charset=utf-8",
+          .body = shared(prometheusText(sources_.insight, server_ == nullptr ? 0 : server_->visitorCount()))};
+}
+
+}  // namespace vesk::web

@@ -1,0 +1,84 @@
+'use strict';
+
+// A drive as the program writes it. Positions are milliseconds of counted time, without the gaps between the stretches.
+
+class Drive {
+  /** Of everything that grows while the page is live, as many are kept. */
+  static mostPoints = 20000;
+  static mostEvents = 5000;
+
+  constructor(data) {
+    Object.assign(this, data);
+    this.kpiNamed = new Map(this.kpis.map((kpi) => [kpi.name, kpi]));
+  }
+
+  get end() {
+    return this.now.position;
+  }
+
+  /** Adds what came since. */
+  add(news) {
+    const append = (all, more, most) => {
+      for (const each of more) all.push(each);
+      if (all.length > most) all.splice(0, all.length - most);
+    };
+    this.now = news.now;
+    this.cells = news.cells;
+    append(this.stretches, news.stretches, Drive.mostPoints);
+    append(this.serving, news.serving, Drive.mostPoints);
+    append(this.events, news.events, Drive.mostEvents);
+    for (const [mark, positions] of Object.entries(news.marks)) append(this.marks[mark], positions, Drive.mostPoints);
+    for (const [name, points] of Object.entries(news.series)) {
+      append(this.series[name] = this.series[name] || [], points, Drive.mostPoints);
+    }
+  }
+
+  /** The place in `stretches` of the one that a position lies in. */
+  stretchAt(position) {
+    let low = 0;
+    let high = this.stretches.length / 2;
+    while (high - low > 1) {
+      const middle = (low + high) >> 1;
+      if (this.stretches[2 * middle] <= position) low = middle;
+      else high = middle;
+    }
+    return low;
+  }
+
+  timeAt(position) {
+    if (this.stretches.length === 0) return position;
+    const stretch = this.stretchAt(position);
+    return this.stretches[2 * stretch + 1] + position - this.stretches[2 * stretch];
+  }
+
+  /** The positions of the gaps. */
+  gaps() {
+    return this.stretches.filter((_, at) => at % 2 === 0).slice(1);
+  }
+
+  /** Whether the technology changed after one position, up to the other: values are not known across it. */
+  changesTechnology(after, upTo) {
+    const changes = this.marks.technology;
+    let low = -1;
+    let high = changes.length;
+    while (high - low > 1) {
+      const middle = (low + high) >> 1;
+      if (changes[middle] <= after) low = middle;
+      else high = middle;
+    }
+    return high < changes.length && changes[high] <= upTo;
+  }
+
+  /** The name of the cell that serves there; null for none. */
+  cellAt(position) {
+    let cell = -1;
+    for (let at = 0; at < this.serving.length && this.serving[at] <= position; at += 2) cell = this.serving[at + 1];
+    return cell < 0 ? null : this.cells[cell];
+  }
+
+  gradeOf(name, value) {
+    const steps = this.kpiNamed.get(name)?.steps;
+    if (!steps) return null;
+    return ['excellent', 'good', 'fair', 'poor'][steps.concat(-Infinity).findIndex((step) => value >= step)];
+  }
+}

@@ -1,0 +1,132 @@
+'use strict';
+
+// The live page: the same parts, told by the program what is new.
+
+/** What holds now: the KPIs, the connection, the cells heard. */
+class Overview {
+  constructor(section, drive) {
+    this.section = section;
+    this.drive = drive;
+    section.hidden = false;
+  }
+
+  show() {
+    const {now} = this.drive;
+    const tiles = Object.entries(now.kpis).map(([name, {value, age_ms: age}]) => {
+      const kpi = this.drive.kpiNamed.get(name);
+      return element('div', {class: 'kpi'}, element('small', {text: name}),
+        element('b', {class: this.drive.gradeOf(name, value) || undefined, text: `${rounded(value, Number.isInteger(value) ? 0 : 1)} ${kpi.unit}`}),
+        element('small', {text: `${duration(Math.max(age, 0))} ago`}));
+    });
+    const words = (name) => name && name.replaceAll('_', ' ');
+    const columns = [{title: 'technology'}, {title: 'channel', isNumber: true}, {title: 'code', isNumber: true}, {title: 'role'},
+      {title: 'level', isNumber: true}, {title: 'quality', isNumber: true}, {title: 'difference', isNumber: true},
+      {title: 'age', isNumber: true}];
+    const rows = now.heard.slice(0, 24).map((cell) => [cell.technology, cell.channel, cell.code, cell.role,
+      this.graded(`${{LTE: 'lte.rsrp', UMTS: 'umts.rscp', GSM: 'gsm.rxlev'}[cell.technology]}`, cell.level),
+      this.graded(`${{LTE: 'lte.rsrq', UMTS: 'umts.ecno'}[cell.technology]}`, cell.quality),
+      rounded(cell.difference, 0), duration(Math.max(cell.age_ms, 0))]);
+    const scrolled = this.section.querySelector('.table')?.scrollLeft || 0;
+    fill(this.section, element('div', {class: 'kpis'}, ...tiles),
+      facts([['time (UTC)', now.time === null ? null : dateAndTime(now.time).slice(0, 19)], ['technology', now.technology],
+        ['cell', now.cell], ['RRC', words(now.rrc)], ['area', now.area], ['EMM', words(now.emm)], ['MM', words(now.mm)],
+        ['GMM', words(now.gmm)], ['events', grouped(now.events)]]),
+      table(columns, rows, 'Cells heard'));
+    this.section.querySelector('.table').scrollLeft = scrolled;
+  }
+
+  graded(name, value) {
+    if (value === null) return null;
+    return element('span', {class: this.drive.gradeOf(name, value) || undefined, text: rounded(value, Number.isInteger(value) ? 0 : 1)});
+  }
+}
+
+/** The screens, each of which the program keeps showing for as long as it is open. */
+class ScreenWalk {
+  constructor(section, menu) {
+    this.shown = element('div', {class: 'columns', 'aria-live': 'off'});
+    this.buttons = [];
+    const folds = menu.map(({area, categories}, at) => element('details', {open: at === 1 ? '' : null},
+      element('summary', {text: area}), element('div', {class: 'areas'}, ...categories.map((category) => {
+        const made = button(category, () => this.open(area, category, made));
+        this.buttons.push(made);
+        return made;
+      }))));
+    this.title = element('h3');
+    fill(section, ...folds, this.title, this.shown);
+  }
+
+  open(area, category, chosen) {
+    this.source?.close();
+    for (const each of this.buttons) each.removeAttribute('aria-current');
+    chosen.setAttribute('aria-current', 'true');
+    this.title.textContent = `${area} › ${category}`;
+    this.source = new EventSource(`/live/screen?${new URLSearchParams({area, category})}`);
+    this.source.addEventListener('screen', (event) => this.shown.replaceChildren(...screenTables(JSON.parse(event.data))));
+  }
+}
+
+class LivePage {
+  static summaryInterval = 5000;
+  /** How much of the drive the charts follow. */
+  static trail = 300000;
+
+  start() {
+    document.title = 'Vesk, live';
+    const source = new EventSource('/live');
+    source.addEventListener('drive', (event) => this.begin(JSON.parse(event.data)));
+    source.addEventListener('news', (event) => this.take(JSON.parse(event.data)));
+    source.addEventListener('error', () => this.tell('connection lost; trying again'));
+    document.addEventListener('visibilitychange', () => this.show());
+    // While the mouse draws the frame of a zoom the charts hold still.
+    document.addEventListener('pointerdown', () => { this.isHeld = true; });
+    for (const end of ['pointerup', 'pointercancel']) document.addEventListener(end, () => { this.isHeld = false; });
+    setInterval(() => this.askForSummary(), LivePage.summaryInterval);
+    fetch('/api/menu').then((answer) => answer.json()).then((menu) => new ScreenWalk(byId('screens'), menu));
+  }
+
+  tell(state) {
+    byId('state').textContent = state;
+  }
+
+  /** The whole drive: at the beginning, and whenever the connection was lost in between. */
+  begin({drive, state}) {
+    this.charts?.destroy();
+    this.drive = new Drive(drive);
+    this.charts = new Charts(byId('charts'), this.drive, LivePage.trail);
+    this.overview = new Overview(byId('now'), this.drive);
+    this.cells = new CellTable(byId('cells'), this.drive);
+    this.timeline = new TimelineList(byId('timeline'), this.drive, (position) => this.charts.showMoment(position));
+    this.summary = null;
+    this.tell(state);
+    this.show();
+    this.askForSummary();
+  }
+
+  take({drive, state}) {
+    this.drive.add(drive);
+    for (const [, , kind] of drive.events) {
+      if (this.summary) this.summary.kinds[kind] = (this.summary.kinds[kind] || 0) + 1;
+    }
+    this.tell(state);
+    this.show(drive.events.length > 0);
+  }
+
+  show(hasEvents = true) {
+    if (document.hidden || !this.drive) return;
+    this.overview.show();
+    if (!this.isHeld) this.charts.draw();
+    if (hasEvents && this.summary) this.timeline.show(this.summary.kinds, true);
+  }
+
+  async askForSummary() {
+    if (document.hidden || !this.drive) return;
+    const answer = await fetch('/api/summary').catch(() => null);
+    if (!answer?.ok) return;
+    const isFirst = !this.summary;
+    this.summary = await answer.json();
+    showSummary(this.summary);
+    this.cells.show(this.summary.cells);
+    if (isFirst) this.timeline.show(this.summary.kinds, true);
+  }
+}
