@@ -200,7 +200,7 @@ Response LiveServer::cells(const Request& /*request*/) {
 Response LiveServer::timeline(const Request& /*request*/) {
   return jsonResponse([&](JsonWriter& json) {
     writeJsonArray(json, sources_.insight.happenings(),
-                   [&](const insight::Insight::Happening& each) { writeJson(json, each.event); });
+                   [&](const insight::Happening& each) { writeJson(json, each.event); });
   });
 }
 

@@ -35,8 +35,11 @@ class ManualClock : public Clock {
       poll(polled.data(), polled.size(), -1);
       advanced_.clear();
       std::copy(polled.begin(), polled.end() - 1, descriptors.begin());
-      if (std::any_of(descriptors.begin(), descriptors.end(), [](const pollfd& each) { return each.revents != 0; }))
+      if (std::any_of(descriptors.begin(), descriptors.end(), [](const pollfd& each) { return each.revents != 0; })) {
+        const std::lock_guard lock(mutex_);
+        sleepingUntil_.reset();
         return;
+      }
     }
     poll(descriptors.data(), descriptors.size(), 0);
   }
