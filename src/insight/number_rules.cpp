@@ -102,7 +102,7 @@ std::optional<Reading> readSeconds(std::int64_t code) {
 }
 
 std::optional<Reading> readSixMinutes(std::int64_t code) {
-  constexpr std::uint64_t kStep = 6 * 60 * kSecondInMilliseconds;
+  constexpr std::uint64_t kStep = std::uint64_t{6} * 60 * kSecondInMilliseconds;
   return Reading{.text = code == 0 ? "off" : durationText(static_cast<std::uint64_t>(code) * kStep)};
 }
 

@@ -296,8 +296,7 @@ void writeJson(JsonWriter& json, const TimelineEvent& event) {
 }
 
 std::string timeOfDay(std::int64_t time) {
-  constexpr std::int64_t kDay = 86'400'000;
-  const std::int64_t inDay = time % kDay;
+  const std::int64_t inDay = time % 86'400'000;
   std::array<char, 40> text;
   std::snprintf(text.data(), text.size(), "%02d:%02d:%02d.%03d", static_cast<int>(inDay / 3'600'000),
                 static_cast<int>(inDay / 60'000 % 60), static_cast<int>(inDay / 1000 % 60),

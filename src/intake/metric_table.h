@@ -35,10 +35,12 @@ struct HandledMetric {
 [[nodiscard]] const HandledMetric* findHandledMetric(std::int64_t metricId);
 
 /// How many kinds of metric are handled.
-inline constexpr std::size_t kHandledMetricCount = 0
-#define HANDLED_METRIC(...) +1
+inline constexpr std::size_t kHandledMetricCount =
+    std::initializer_list<int>{
+#define HANDLED_METRIC(...) 0,
 #include "messages/registry/metrics.def"
-    ;
+    }
+        .size();
 
 /// The metric whose latest record a member of Stores is.
 template <LatestRecord Stores::*record>

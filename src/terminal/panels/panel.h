@@ -37,6 +37,7 @@ class Panel {
 
   /// Null for a panel that has none.
   [[nodiscard]] virtual const std::string* filter() const { return nullptr; }
+  // NOLINTNEXTLINE(performance-unnecessary-value-param): a panel that has one moves it
   virtual void setFilter(std::string /*filter*/) {}
 };
 

@@ -114,8 +114,12 @@ void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Ins
     const std::string age = timeBound(ageOf(*arrivals, driveTime()), now);
     const std::string instead = technologyInstead(area, category);
     const int room = rowTextEnd(regions().listColumns, line.hasDisclosure) - kRowGutter - textWidth(category) - kGap;
-    const std::string both = headline.empty() ? age : headline + "  " + age;
-    for (const std::string& note : {both + (instead.empty() ? "" : ", now " + instead), both, age}) {
+    std::string both = headline;
+    if (!both.empty()) both += "  ";
+    both += age;
+    std::string withTechnology = both;
+    if (!instead.empty()) withTechnology.append(", now ").append(instead);
+    for (const std::string& note : {withTechnology, both, age}) {
       if (textWidth(note) > room) continue;
       line.note = note;
       break;
