@@ -70,6 +70,17 @@ TEST(AtATerminal, TheUserWalksToAValueAndBackAndLeavesTheTerminalAsItWas) {
   }
 }
 
+TEST(AtATerminal, AnUnknownTerminalIsShownTheScreensOfAUsualOne) {
+  setenv("TERM", "nobody-knows-it", 1);
+  PseudoTerminal terminal({100, 24});
+  ChildProcess process(VESK_PROGRAM, {"--log", "none"}, terminal.openForProgram());
+  const std::string launch = terminal.readUpTo("quit");
+  EXPECT_TRUE(launch.starts_with("vesk: the terminal \"nobody-knows-it\" is not known")) << launch;
+  EXPECT_EQ(launch.find('\n'), launch.find(kAlternateScreen) - 1) << launch;
+  terminal.type("q");
+  EXPECT_EQ(process.waitForExit(), 0);
+}
+
 TEST(AtATerminal, WithoutScreensTheLinesArePrintedFromTheFirstOn) {
   setenv("TERM", "dumb", 1);
   const TemporaryFile recording(levels());

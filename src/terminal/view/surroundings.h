@@ -71,6 +71,8 @@ struct Surroundings {
   /// While true, the user holds a list with the mouse: timers of the default mode wait.
   std::function<void(bool)> setTracking{};
   std::function<void()> quit{};
+  /// Says a line to the user before the terminal is taken over.
+  std::function<void(const std::string& line)> warn{};
   /// The program was stopped (true) and goes on (false).
   std::function<void(bool)> setInBackground{};
 };
