@@ -17,6 +17,9 @@ namespace {
 // decimal); the others pass over them. Terminfo has no names for them.
 constexpr std::string_view kMouseOn = "\x1b[?1002h\x1b[?1006h";
 constexpr std::string_view kMouseOff = "\x1b[?1006l\x1b[?1002l";
+// The same holds for the marks around pasted text.
+constexpr std::string_view kPasteMarksOn = "\x1b[?2004h";
+constexpr std::string_view kPasteMarksOff = "\x1b[?2004l";
 
 std::string_view environment(const char* name) {
   const char* value = std::getenv(name);
@@ -101,8 +104,8 @@ std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, con
   }
   found.plain = textCapability("sgr0");
   found.enterScreen = textCapability("smcup") + textCapability("civis") + textCapability("rmam");
-  found.enterScreen += kMouseOn;
-  found.leaveScreen = kMouseOff;
+  found.enterScreen.append(kMouseOn).append(kPasteMarksOn);
+  found.leaveScreen.append(kPasteMarksOff).append(kMouseOff);
   found.leaveScreen += found.plain + textCapability("smam") + textCapability("cnorm");
   const std::string leaveOtherScreen = textCapability("rmcup");
   found.leaveScreen += leaveOtherScreen.empty() ? found.clear : leaveOtherScreen;

@@ -2,7 +2,6 @@
 
 #include <cstdint>
 #include <optional>
-#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -64,7 +63,7 @@ struct Picture {
 
   /// What shows in the place of title and list; null for a table screen.
   Panel* panel = nullptr;
-  std::span<const Action> hints = tableHints();
+  std::vector<Action> hints{};
 
   /// In the place of the hints; empty for none.
   std::string notice{};

@@ -110,8 +110,10 @@ void Presenter::handle(const InputEvent& event) {
   if (const auto* key = std::get_if<KeyEvent>(&event)) {
     forgetMouse();
     handleKey(*key);
-  } else {
-    handleMouse(std::get<MouseEvent>(event));
+  } else if (const auto* mouse = std::get_if<MouseEvent>(&event)) {
+    handleMouse(*mouse);
+  } else if (isTypingFilter_ && filter() != nullptr) {
+    setFilter(pasteInto(*filter(), std::get<PasteEvent>(event).text));
   }
 }
 
@@ -210,6 +212,7 @@ void Presenter::perform(Action action) {
     case Action::PageDown:
     case Action::First:
     case Action::Last:
+    case Action::NextSection:
       return performOnTable(action);
     case Action::Overview:
     case Action::Trend:
@@ -232,6 +235,7 @@ void Presenter::performOnTable(Action action) {
   if (action == Action::PageDown) shown->page(+1);
   if (action == Action::First) shown->selectFirst();
   if (action == Action::Last) shown->selectLast();
+  if (action == Action::NextSection) shown->selectNextSection();
 }
 
 void Presenter::jump(std::chrono::seconds distance) {
@@ -260,9 +264,9 @@ void Presenter::performInHelp(Action action) {
     case Action::PageDown:
       return scrollHelp(+page);
     case Action::First:
-      return scrollHelp(-helpLineCount());
+      return scrollHelp(-helpLineCount(size_.columns));
     case Action::Last:
-      return scrollHelp(+helpLineCount());
+      return scrollHelp(+helpLineCount(size_.columns));
     case Action::Open:
     case Action::Filter:
     case Action::Freeze:
@@ -280,12 +284,13 @@ void Presenter::performInHelp(Action action) {
     case Action::Diagnostics:
     case Action::OlderLines:
     case Action::NewerLines:
+    case Action::NextSection:
       return;
   }
 }
 
 void Presenter::scrollHelp(int lines) {
-  const int last = std::max(helpLineCount() - regions().list.count(), 0);
+  const int last = std::max(helpLineCount(size_.columns) - regions().list.count(), 0);
   helpStart_ = std::clamp(*helpStart_ + lines, 0, last);
 }
 

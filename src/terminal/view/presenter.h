@@ -82,13 +82,17 @@ class Presenter {
   void addScreen(const std::shared_ptr<ViewController>& controller);
   void noteArrivals(Screen& screen, const TableBrowser& shown);
   [[nodiscard]] TableBrowser* browser() { return screens_.empty() ? nullptr : screens_.back().browser.get(); }
-  [[nodiscard]] Regions regions() const { return Regions::of(size_, isPaneOpen_); }
+  [[nodiscard]] Regions regions() const { return Regions::of(size_, showsPane()); }
+  /// The help lies over the pane.
+  [[nodiscard]] bool showsPane() const { return isPaneOpen_ && !helpStart_; }
   [[nodiscard]] Panel* panel() const { return panels_ ? panels_->top() : nullptr; }
   /// Of what shows; null where nothing can be filtered.
   [[nodiscard]] const std::string* filter();
   void setFilter(std::string filter);
   [[nodiscard]] std::optional<insight::Kpi> selectedKpi();
   [[nodiscard]] std::vector<std::string> titles() const;
+  /// The keys that do something where the user is.
+  [[nodiscard]] std::vector<Action> hints(const Picture& picture);
   void fillTable(Picture& picture, Clock::Instant now);
   void addHeadlines(Picture& picture, std::string_view area, Clock::Instant now);
   [[nodiscard]] std::string dateBehind(std::string_view status, std::string_view date) const;

@@ -1,6 +1,7 @@
 // How the presenter puts together what shows.
 
 #include <algorithm>
+#include <iterator>
 #include <utility>
 
 #include "terminal/device/column_width.h"
@@ -54,12 +55,33 @@ Picture Presenter::picture(Clock::Instant now) {
   picture.isTypingFilter = isTypingFilter_ && filter() != nullptr;
   if (panel() != nullptr) {
     picture.panel = panel();
-    picture.hints = panel()->hints();
   } else {
     fillTable(picture, now);
   }
+  picture.hints = hints(picture);
   fillPane(picture);
   return picture;
+}
+
+std::vector<Action> Presenter::hints(const Picture& picture) {
+  if (helpStart_) return {Action::Back, Action::Quit};
+  if (panel() != nullptr) return {panel()->hints().begin(), panel()->hints().end()};
+  const auto opens = [](const ListLine& line) { return line.isSelected && line.hasDisclosure; };
+  const std::pair<Action, bool> needs[] = {
+      {Action::Open, std::any_of(picture.lines.begin(), picture.lines.end(), opens)},
+      {Action::Back, screens_.size() > 1 || !picture.filter.empty()},
+      {Action::Filter, browser() != nullptr},
+      {Action::Diagnostics, surroundings_.diagnostics != nullptr},
+      {Action::Overview, panels_.has_value()},
+  };
+  const auto isWithout = [&](Action action) {
+    const auto* found =
+        std::find_if(std::begin(needs), std::end(needs), [&](const auto& need) { return need.first == action; });
+    return found != std::end(needs) && !found->second;
+  };
+  std::vector<Action> hints;
+  std::remove_copy_if(tableHints().begin(), tableHints().end(), std::back_inserter(hints), isWithout);
+  return hints;
 }
 
 void Presenter::fillTable(Picture& picture, Clock::Instant now) {
@@ -124,8 +146,8 @@ void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Ins
 }
 
 void Presenter::fillPane(Picture& picture) {
-  picture.hasPane = isPaneOpen_;
-  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
+  picture.hasPane = showsPane();
+  if (!showsPane() || surroundings_.diagnostics == nullptr) return;
   scrollPane(0);
   const auto& lines = surroundings_.diagnostics->lines();
   picture.paneTotal = surroundings_.diagnostics->total();

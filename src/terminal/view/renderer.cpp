@@ -5,6 +5,7 @@
 
 #include "terminal/device/column_width.h"
 #include "terminal/input/key_bindings.h"
+#include "terminal/view/wrapping.h"
 #include "values/text_form.h"
 
 namespace vesk {
@@ -20,13 +21,35 @@ std::vector<HelpLine> makeHelp() {
   std::vector<HelpLine> help;
   for (const KeyBinding& binding : keyBindings())
     help.push_back({namesOf(binding), binding.help});
-  help.push_back({"click", "select and open a row; on the path: go back"});
+  for (const TypingBinding& binding : typingBindings())
+    help.push_back({std::string(binding.name), binding.help});
+  help.push_back({"click", "select and open a row; on the path: go back; on the scroll bar: go there"});
   help.push_back({"wheel, drag", "scroll"});
   return help;
 }
 
 const std::vector<HelpLine>& help() {
   static const std::vector<HelpLine> lines = makeHelp();
+  return lines;
+}
+
+/// Where the meanings start.
+int helpIndent() {
+  int keysWidth = 0;
+  for (const HelpLine& each : help())
+    keysWidth = std::max(keysWidth, textWidth(each.keys));
+  return kRowGutter + keysWidth + 2;
+}
+
+/// The help with its meanings wrapped; the keys stand at the first line of theirs.
+std::vector<HelpLine> helpLines(int columns) {
+  std::vector<HelpLine> lines;
+  for (const HelpLine& each : help()) {
+    const std::size_t first = lines.size();
+    for (const std::string_view line : wrapText(each.meaning, columns - helpIndent()))
+      lines.push_back({{}, line});
+    lines[first].keys = each.keys;
+  }
   return lines;
 }
 
@@ -169,14 +192,12 @@ class Renderer {
   }
 
   void drawHelp() {
-    int keysWidth = 0;
-    for (const HelpLine& each : help())
-      keysWidth = std::max(keysWidth, textWidth(each.keys));
     int line = regions_.list.start;
-    for (auto index = static_cast<std::size_t>(*picture_.helpStart); index < help().size() && line < regions_.list.end;
+    const std::vector<HelpLine> lines = helpLines(width());
+    for (auto index = static_cast<std::size_t>(*picture_.helpStart); index < lines.size() && line < regions_.list.end;
          ++index, ++line) {
-      grid_.write(kRowGutter, line, help()[index].keys, Role::Key, width());
-      writeCut(kRowGutter + keysWidth + 2, line, help()[index].meaning, Role::Plain, width());
+      grid_.write(kRowGutter, line, lines[index].keys, Role::Key, width());
+      grid_.write(helpIndent(), line, lines[index].meaning, Role::Plain, width());
     }
   }
 
@@ -206,7 +227,7 @@ class Renderer {
     }
     if (picture_.isTypingFilter || !picture_.filter.empty()) {
       column = grid_.write(column, line, "/", Role::Prompt, width());
-      column = writeCut(column, line, picture_.filter, Role::Prompt, width() / 2);
+      column = grid_.write(column, line, endOf(picture_.filter, width() / 2 - column), Role::Prompt, width() / 2);
       if (picture_.isTypingFilter) {
         column = grid_.write(column, line, "▏", Role::Prompt, width()) + 1;
         column = drawHint(column, "Enter", "keep");
@@ -219,6 +240,14 @@ class Renderer {
       const KeyBinding& binding = bindingOf(action);
       column = drawHint(column, nameOf(*binding.keys.begin()), binding.hint);
     }
+  }
+
+  /// As much of the end of `text` as fits, where one types, with an ellipsis before it.
+  static std::string endOf(std::string_view text, int columns) {
+    if (textWidth(text) <= columns) return std::string(text);
+    while (textWidth(text) >= columns)
+      takeGlyph(text);
+    return "…" + std::string(text);
   }
 
   /// The column after the hint, or the width when it did not fit and nothing after it shall.
@@ -258,8 +287,8 @@ Grid render(const Picture& picture) {
   return Renderer(picture).run();
 }
 
-int helpLineCount() {
-  return static_cast<int>(help().size());
+int helpLineCount(int columns) {
+  return static_cast<int>(helpLines(columns).size());
 }
 
 }  // namespace vesk

@@ -23,7 +23,10 @@ void TableBrowser::setViewport(Size size) {
 }
 
 void TableBrowser::follow() {
-  if (!isFrozen_ && content_.follow()) rebuild();
+  if (isFrozen_ || !content_.follow()) return;
+  rebuild();
+  // Other rows may pass the filter now.
+  if (!filter_.empty() && !isSelectionInView()) showSelection();
 }
 
 void TableBrowser::setFrozen(bool isFrozen) {
@@ -48,8 +51,9 @@ void TableBrowser::rebuild() {
     const std::size_t start = entries_.size();
     if (content_.header(section)) entries_.push_back({{section, 0}, false});
     const std::size_t firstRow = entries_.size();
+    const bool isWanted = filter_.empty() || contains(content_.header(section), filter_);
     for (std::size_t row = 0; row < content_.rowCount(section); ++row) {
-      if (passesFilter({section, row})) entries_.push_back({{section, row}, true});
+      if (isWanted || passesFilter({section, row})) entries_.push_back({{section, row}, true});
     }
     if (!filter_.empty() && entries_.size() == firstRow) entries_.resize(start);
   }
@@ -69,7 +73,6 @@ void TableBrowser::rebuild() {
 }
 
 bool TableBrowser::passesFilter(IndexPath at) {
-  if (filter_.empty()) return true;
   const RowContent& row = content_.row(at);
   return contains(row.main, filter_) || contains(row.detail, filter_);
 }
@@ -136,6 +139,13 @@ void TableBrowser::showSelection() {
   clampTop();
 }
 
+/// Whether some of the selected row is.
+bool TableBrowser::isSelectionInView() {
+  const std::size_t selected = selectedEntry();
+  return selected == entries_.size() ||
+         (top_ < moved({selected, height(selected)}, 0) && Position{selected, 0} < moved(top_, size_.lines));
+}
+
 /// After scrolling: when nothing of the selected row shows, the row nearest to it of those that show.
 void TableBrowser::keepSelectionInView() {
   const std::size_t selected = selectedEntry();
@@ -178,6 +188,15 @@ void TableBrowser::selectLast() {
   if (const std::optional<std::size_t> last = nextRow(entries_.size(), -1)) select(*last);
   top_ = {entries_.size(), 0};
   clampTop();
+}
+
+void TableBrowser::selectNextSection() {
+  const std::size_t section = selection_ ? selection_->section : 0;
+  const auto next = std::find_if(entries_.begin(), entries_.end(),
+                                 [&](const Entry& each) { return each.isRow && each.at.section > section; });
+  if (next == entries_.end()) return selectFirst();
+  select(static_cast<std::size_t>(next - entries_.begin()));
+  showSelection();
 }
 
 void TableBrowser::scroll(int lines) {

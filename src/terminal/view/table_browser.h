@@ -50,7 +50,7 @@ class TableBrowser {
   [[nodiscard]] std::uint64_t reloadCount() const { return content_.reloadCount(); }
   void setFrozen(bool isFrozen);
   [[nodiscard]] bool isFrozen() const { return isFrozen_; }
-  /// Shows only rows whose name or value has `filter` in it, in either case; all when empty.
+  /// Shows only rows whose name, value or section header has `filter` in it, in either case; all when empty.
   void setFilter(std::string filter);
   [[nodiscard]] const std::string& filter() const { return filter_; }
 
@@ -58,6 +58,8 @@ class TableBrowser {
   void moveSelection(int step);
   void selectFirst();
   void selectLast();
+  /// The first row after the next header; after the last header, the first row.
+  void selectNextSection();
   /// By lines; the selection stays within what shows.
   void scroll(int lines);
   /// By almost a viewport; at an end, to the last or first row.
@@ -100,6 +102,7 @@ class TableBrowser {
   void select(std::size_t entry);
   void clampTop();
   void showSelection();
+  [[nodiscard]] bool isSelectionInView();
   void keepSelectionInView();
 
   TableViewController& screen_;
