@@ -158,7 +158,19 @@ TEST(Picture, ShowsTheDiagnosticLinesInAPaneThatKeepsItsPlace) {
   desk.type(U"]]]]");
   append(15, 15);
   EXPECT_EQ(desk.line(10), " line 15");
+  lines.append("a long line of many words that goes on and on to its end");
+  EXPECT_EQ(desk.line(8), " line 15");
+  EXPECT_EQ(desk.line(9), " a long line of many words that goes on");
+  EXPECT_EQ(desk.line(10), " and on to its end");
+  desk.mouse(MouseAction::WheelUp, 5, 9);
+  desk.mouse(MouseAction::WheelDown, 5, 9);
+  desk.mouse(MouseAction::WheelUp, 5, 9);
+  EXPECT_EQ(desk.line(10), " line 14");
   desk.type(U"d");
+  EXPECT_EQ(desk.line(5).substr(0, 12), " Diagnostics");
+  desk.type(U"?");
+  EXPECT_EQ(desk.line(5).find("Diagnostics"), std::string::npos);
+  desk.type(U"?d");
   EXPECT_EQ(desk.line(7), "");
 }
 
@@ -172,7 +184,7 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   EXPECT_EQ(desk.line(31), " Esc back  q quit");
   desk.resize({40, 10});
   desk.type(U"GG");
-  EXPECT_EQ(desk.line(7), "                     bar: go there");
+  EXPECT_EQ(desk.line(7), "                     there");
   EXPECT_EQ(desk.line(8), "  wheel, drag        scroll");
   desk.press(Key::Escape);
   EXPECT_EQ(desk.line(2), "  Device Info                        ›");

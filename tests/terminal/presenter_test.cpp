@@ -182,7 +182,7 @@ TEST_F(PresenterTest, FiltersWhileOneTypes) {
   desk_->press(Key::Tab);
   EXPECT_EQ(selected(), "qci in 8");
   desk_->press(Key::Tab);
-  EXPECT_EQ(selected(), "apn in 3");
+  EXPECT_EQ(desk_->line(3).substr(0, 8), "• apn ");
   EXPECT_EQ(depth(), 3U);
   desk_->type(U"/qé");
   EXPECT_EQ(desk_->line(2), "  no row has this");
@@ -339,6 +339,17 @@ TEST_F(PresenterTest, TracksWhileTheListIsDragged) {
   EXPECT_EQ(selected(), "row 3 in 3");
   desk_->mouse(MouseAction::Release, 5, 5);
   EXPECT_EQ(tracking_, (std::vector<bool>{true, false}));
+  EXPECT_EQ(depth(), 3U);
+}
+
+TEST_F(PresenterTest, TheScrollBarIsClickedAndDragged) {
+  showFields(numbered(30));
+  const std::pair<int, std::string> steps[] = {{8, "row 23"}, {5, "row 11"}, {2, "row 0"}, {20, "row 23"}};
+  for (const auto& [line, first] : steps) {
+    desk_->mouse(line > 8 ? MouseAction::Drag : MouseAction::Press, 39, line);
+    EXPECT_EQ(desk_->line(2).substr(2, first.size() + 1), first + " ") << line;
+  }
+  EXPECT_EQ(tracking_, std::vector<bool>{true});
   EXPECT_EQ(depth(), 3U);
 }
 

@@ -34,7 +34,7 @@ const KeyBinding kBindings[] = {
      {letter(U'1'), letter(U'2'), letter(U'3'), letter(U'4')},
      "to 4 areas",
      "open an area of the first screen"},
-    {Action::Diagnostics, {letter(U'd')}, "lines", "show or hide the diagnostic lines"},
+    {Action::Diagnostics, {letter(U'd')}, "lines", "the diagnostic lines: some, half a screen, none"},
     {Action::OlderLines, {letter(U'[')}, "", "older diagnostic lines"},
     {Action::NewerLines, {letter(U']')}, "", "newer diagnostic lines"},
     {Action::Quit, {letter(U'q')}, "quit", "end the program"},

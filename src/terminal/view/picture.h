@@ -1,12 +1,12 @@
 #pragma once
 
-#include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
 
 #include "terminal/panels/panel.h"
+#include "terminal/view/diagnostics_pane.h"
 #include "terminal/view/path_bar.h"
 #include "terminal/view/table_browser.h"
 
@@ -35,7 +35,7 @@ struct Regions {
   int hints = 0;
   int listColumns = 0;  ///< of the list's lines, without the scroll bar
 
-  [[nodiscard]] static Regions of(Size size, bool hasPane);
+  [[nodiscard]] static Regions of(Size size, PaneHeight paneHeight);
 };
 
 /// The columns of the bar before the path and after the status.
@@ -74,11 +74,8 @@ struct Picture {
   /// The first line of the help that shows; absent when the list does.
   std::optional<int> helpStart{};
 
-  bool hasPane = false;
-  std::vector<std::string_view> paneLines{};
-  /// The number of the last line of the pane, and of the last line there is.
-  std::uint64_t paneEnd = 0;
-  std::uint64_t paneTotal = 0;
+  PaneHeight paneHeight = PaneHeight::None;
+  DiagnosticsPane::Shown pane{};
 };
 
 }  // namespace vesk

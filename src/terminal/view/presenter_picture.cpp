@@ -59,7 +59,8 @@ Picture Presenter::picture(Clock::Instant now) {
     fillTable(picture, now);
   }
   picture.hints = hints(picture);
-  fillPane(picture);
+  picture.paneHeight = paneHeight();
+  if (picture.paneHeight != PaneHeight::None) picture.pane = pane_.shown(paneRoom());
   return picture;
 }
 
@@ -143,19 +144,6 @@ void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Ins
       break;
     }
   }
-}
-
-void Presenter::fillPane(Picture& picture) {
-  picture.hasPane = showsPane();
-  if (!showsPane() || surroundings_.diagnostics == nullptr) return;
-  scrollPane(0);
-  const auto& lines = surroundings_.diagnostics->lines();
-  picture.paneTotal = surroundings_.diagnostics->total();
-  picture.paneEnd = paneEnd_.value_or(picture.paneTotal);
-  const auto newer = static_cast<std::ptrdiff_t>(picture.paneTotal - picture.paneEnd);
-  const auto room = static_cast<std::ptrdiff_t>(std::max(regions().pane.count() - 1, 0));
-  const auto end = lines.end() - newer;
-  picture.paneLines.assign(end - std::min(room, end - lines.begin()), end);
 }
 
 }  // namespace vesk

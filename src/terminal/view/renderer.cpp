@@ -57,7 +57,7 @@ std::vector<HelpLine> helpLines(int columns) {
 class Renderer {
  public:
   explicit Renderer(const Picture& picture)
-      : picture_(picture), regions_(Regions::of(picture.size, picture.hasPane)), grid_(picture.size) {}
+      : picture_(picture), regions_(Regions::of(picture.size, picture.paneHeight)), grid_(picture.size) {}
 
   Grid run() {
     if (width() < kSmallestSize.columns || picture_.size.lines < kSmallestSize.lines) {
@@ -181,10 +181,8 @@ class Renderer {
     const ScrollExtent& extent = picture_.extent;
     if (extent.total <= extent.shown) return;
     const int height = regions_.list.count();
-    const int thumb = std::max(height * extent.shown / extent.total, 1);
-    const int travel = height - thumb;
-    const int hidden = extent.total - extent.shown;
-    const int start = std::clamp((travel * extent.before + hidden / 2) / hidden, 0, travel);
+    const int thumb = extent.thumb(height);
+    const int start = extent.thumbStart(height);
     for (int line = 0; line < height; ++line) {
       const bool isThumb = start <= line && line < start + thumb;
       grid_.write(regions_.listColumns, regions_.list.start + line, isThumb ? "█" : "│", Role::Faint, width());
@@ -206,15 +204,15 @@ class Renderer {
     int line = regions_.pane.start;
     grid_.fill(0, line, Role::PaneHeader, width());
     std::string count;
-    if (picture_.paneEnd < picture_.paneTotal) {
-      appendDecimal(count, picture_.paneEnd);
+    if (picture_.pane.end < picture_.pane.total) {
+      appendDecimal(count, picture_.pane.end);
       count += " of ";
     }
-    appendDecimal(count, picture_.paneTotal);
-    count += picture_.paneTotal == 1 ? " line" : " lines";
+    appendDecimal(count, picture_.pane.total);
+    count += picture_.pane.total == 1 ? " line" : " lines";
     grid_.write(kBarMargin, line, "Diagnostics", Role::PaneHeader, width());
     grid_.write(width() - kBarMargin - textWidth(count), line, count, Role::PaneHeader, width());
-    for (const std::string_view each : picture_.paneLines)
+    for (const std::string_view each : picture_.pane.lines)
       writeCut(kBarMargin, ++line, each, Role::Plain, width());
   }
 
@@ -265,12 +263,14 @@ class Renderer {
 
 }  // namespace
 
-Regions Regions::of(Size size, bool hasPane) {
+Regions Regions::of(Size size, PaneHeight height) {
   constexpr int kSmallestPane = 3;
-  constexpr int kTallestPane = 12;
+  constexpr int kTallestThird = 12;
   Regions regions;
   regions.hints = size.lines - 1;
-  const int paneHeight = hasPane ? std::clamp(size.lines / 3, kSmallestPane, kTallestPane) : 0;
+  const int third = std::clamp(size.lines / 3, kSmallestPane, kTallestThird);
+  const int paneHeight =
+      height == PaneHeight::Half ? std::max(size.lines / 2, third) : (height == PaneHeight::Third ? third : 0);
   regions.pane = {regions.hints - paneHeight, regions.hints};
   regions.list = {regions.title + 1, regions.pane.start};
   regions.listColumns = std::min(size.columns - 1, kWidestList);

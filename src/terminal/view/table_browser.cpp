@@ -205,6 +205,19 @@ void TableBrowser::scroll(int lines) {
   keepSelectionInView();
 }
 
+void TableBrowser::scrollTo(int line, int height) {
+  const ScrollExtent extent = scrollExtent();
+  const int hidden = extent.total - extent.shown;
+  if (hidden <= 0) return;
+  const int thumb = extent.thumb(height);
+  const int travel = height - thumb;
+  const int start = std::clamp(line - thumb / 2, 0, travel);
+  // At the ends all of the list counts, since heights may be estimates.
+  constexpr int kWhole = 1 << 30;
+  const int between = travel > 0 ? start * hidden / travel - extent.before : 0;
+  scroll(start == 0 ? -kWhole : (start == travel ? kWhole : between));
+}
+
 void TableBrowser::page(int direction) {
   const Position before = top_;
   scroll(direction * std::max(size_.lines - 1, 1));

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <optional>
 #include <string>
@@ -31,6 +32,14 @@ struct ScrollExtent {
   int before = 0;
   int shown = 0;
   int total = 0;
+
+  /// The lines of the thumb on a bar of `height` lines, and the first of them. There must be more than shows.
+  [[nodiscard]] int thumb(int height) const { return std::max(height * shown / total, 1); }
+  [[nodiscard]] int thumbStart(int height) const {
+    const int travel = height - thumb(height);
+    const int hidden = total - shown;
+    return std::clamp((travel * before + hidden / 2) / hidden, 0, travel);
+  }
 };
 
 /// A way through one screen's table: what of it shows in a viewport, which row is selected, which rows pass a
@@ -62,6 +71,8 @@ class TableBrowser {
   void selectNextSection();
   /// By lines; the selection stays within what shows.
   void scroll(int lines);
+  /// So that the thumb of a scroll bar of `height` lines is around the bar's `line`, which may lie beyond its ends.
+  void scrollTo(int line, int height);
   /// By almost a viewport; at an end, to the last or first row.
   void page(int direction);
 
