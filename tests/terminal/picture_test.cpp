@@ -126,6 +126,9 @@ TEST(Picture, TellsHowOldTheRowsAreInTheDrivesTimeAndHowOftenTheMetricCame) {
   moment = {moment.time + 24h, 0};
   EXPECT_EQ(desk.line(1), "  Tx Power  3 d ago, 2 times");
   EXPECT_EQ(desk.presenter().nextChange(), std::nullopt);
+  arrivals->isWithoutList = true;
+  fields.tableView().reloadData();
+  EXPECT_EQ(desk.line(1), "  Tx Power  1 d ago, 15 times, without…");
   arrivals = std::nullopt;
   fields.tableView().reloadData();
   EXPECT_EQ(desk.line(1), "  Tx Power");

@@ -45,9 +45,6 @@ inline constexpr int kBarMargin = 1;
 /// column before.
 [[nodiscard]] int statusColumn(int columns, int statusWidth);
 
-/// Lines wider than this tear a name from its value.
-inline constexpr int kWidestList = 100;
-
 /// All that one drawing of the terminal needs, and nothing that looks further. Views are good as long as the
 /// presenter is told nothing.
 struct Picture {

@@ -136,7 +136,8 @@ void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Ins
     const std::string headline = surroundings_.headline(area, category);
     const std::string age = timeBound(ageOf(*arrivals, driveTime()), now);
     const std::string instead = technologyInstead(area, category);
-    const int room = rowTextEnd(regions().listColumns, line.hasDisclosure) - kRowGutter - textWidth(category) - kGap;
+    const int room = rowTextEnd(std::min(regions().listColumns, kWidestPair), line.hasDisclosure) - kRowGutter -
+                     textWidth(category) - kGap;
     const std::string both = headline.empty() ? age : headline + "  " + age;
     for (const std::string& note : {both + (instead.empty() ? "" : ", now " + instead), both, age}) {
       if (textWidth(note) > room) continue;

@@ -143,7 +143,8 @@ class Renderer {
       aside = Role::Selected;
       grid_.fill(0, line, Role::Selected, regions_.listColumns);
     }
-    const int end = rowTextEnd(regions_.listColumns, row.hasDisclosure);
+    const int columns = row.hasDisclosure ? std::min(regions_.listColumns, kWidestPair) : regions_.listColumns;
+    const int end = rowTextEnd(columns, row.hasDisclosure);
     if (row.isFirstOfRow && row.isChanged) grid_.write(0, line, "•", value, end);
     if (row.isFirstOfRow && row.hasDisclosure) grid_.write(end + 1, line, "›", name, end + 2);
     if (row.text.valueIndent) {
@@ -273,7 +274,7 @@ Regions Regions::of(Size size, PaneHeight height) {
       height == PaneHeight::Half ? std::max(size.lines / 2, third) : (height == PaneHeight::Third ? third : 0);
   regions.pane = {regions.hints - paneHeight, regions.hints};
   regions.list = {regions.title + 1, regions.pane.start};
-  regions.listColumns = std::min(size.columns - 1, kWidestList);
+  regions.listColumns = size.columns - 1;
   return regions;
 }
 

@@ -36,6 +36,8 @@ struct Arrivals {
   /// In the drive's time; absent before the first.
   std::optional<std::chrono::milliseconds> last{};
   std::uint64_t count = 0;
+  /// It came, but never with the list that the screen shows.
+  bool isWithoutList = false;
 };
 
 /// What the terminal shows besides the screens, and whom it tells. Every member is optional; all are called

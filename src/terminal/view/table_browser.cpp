@@ -241,8 +241,13 @@ bool TableBrowser::selectLine(int line) {
 }
 
 std::vector<ListLine> TableBrowser::lines(bool withReadings) {
-  const std::optional<int> valueEnd =
-      withReadings && content_.hasReadings() ? valueEndBesideReadings(size_.columns) : std::nullopt;
+  withReadings = withReadings && content_.hasReadings();
+  std::optional<int> valueEnd;
+  if (withReadings) {
+    valueEnd = valueEndBesideReadings(size_.columns);
+  } else if (size_.columns > kWidestPair) {
+    valueEnd = rowTextEnd(kWidestPair, false);
+  }
   std::vector<ListLine> lines;
   std::size_t entry = top_.entry;
   for (int skipped = top_.line; entry < entries_.size(); ++entry, skipped = 0) {
@@ -257,7 +262,7 @@ std::vector<ListLine> TableBrowser::lines(bool withReadings) {
     const std::vector<RowLine> rowLines = layOutRow(row, size_.columns, valueEnd);
     const std::size_t end = std::min(rowLines.size(), static_cast<std::size_t>(skipped) + room);
     for (auto index = static_cast<std::size_t>(skipped); index < end; ++index) {
-      lines.push_back({.text = rowLines[index],
+      lines.push_back({.text = withReadings ? rowLines[index] : rowLines[index].withoutReading(),
                        .isFirstOfRow = index == 0,
                        .isSelected = selection_ == at,
                        .isChanged = row.isChanged,
