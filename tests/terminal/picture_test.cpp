@@ -191,6 +191,9 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   EXPECT_EQ(desk.line(8), "  wheel, drag        scroll");
   desk.press(Key::Escape);
   EXPECT_EQ(desk.line(2), "  Device Info                        ›");
+  Surroundings dated;
+  dated.sourceState = [] { return SourceState{.text = "live", .date = "2026-01-02 03:04:05 UTC"}; };
+  EXPECT_EQ(Desk(interface.stack(), {40, 10}, dated).line(0), " Vesk                              live");
 }
 
 TEST(Picture, SaysThatATerminalIsTooSmallAtEverySizeBelow) {

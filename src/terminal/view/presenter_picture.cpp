@@ -105,7 +105,8 @@ std::string Presenter::dateBehind(std::string_view status, std::string_view date
   constexpr int kGap = 2;
   const std::string behind = std::string(kGap, ' ') + std::string(date);
   const int width = textWidth(status) + textWidth(behind);
-  return pathBar(width).text == pathBar(0).text && width + kBarMargin + kGap < size_.columns ? behind : std::string();
+  const bool fits = statusColumn(size_.columns, width) + width <= size_.columns - kBarMargin;
+  return fits && pathBar(width).text == pathBar(0).text ? behind : std::string();
 }
 
 std::chrono::milliseconds Presenter::driveTime() const {
