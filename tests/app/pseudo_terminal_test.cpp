@@ -54,7 +54,7 @@ TEST(AtATerminal, TheUserWalksToAValueAndBackAndLeavesTheTerminalAsItWas) {
     ASSERT_TRUE(terminal.readUpTo("Valid").ends_with("Valid")) << "the recorded event is not in the stores";
     ASSERT_FALSE(areAlike(terminal.modes(), before));
 
-    terminal.type(std::string("d") + kDown + "\r");
+    terminal.type(std::string("dd") + kDown + "\r");
     ASSERT_TRUE(terminal.readUpTo("Bearers").ends_with("Bearers"));
     terminal.type(std::string(kDown) + kDown + kDown + "\r");
     const std::string values = terminal.readUpTo("11.5");
