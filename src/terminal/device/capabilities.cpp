@@ -65,16 +65,16 @@ std::string bytesOf(const Look& look) {
 /// understand the first.
 constexpr std::array kStandIns{"xterm-256color", "xterm", "ansi"};
 
-bool isKnown(const char* name, int descriptor) {
+bool hasDescription(const char* name, int descriptor) {
   int status = 0;
   return setupterm(name, descriptor, &status) == OK;
 }
 
 /// Loads the description of `name`, or of what stands in for it, and returns whose it is; null for none.
 const char* loadDescription(const std::string& name, int descriptor) {
-  if (isKnown(name.c_str(), descriptor)) return name.c_str();
-  const auto* found =
-      std::find_if(kStandIns.begin(), kStandIns.end(), [&](const char* each) { return isKnown(each, descriptor); });
+  if (hasDescription(name.c_str(), descriptor)) return name.c_str();
+  const auto* found = std::find_if(kStandIns.begin(), kStandIns.end(),
+                                   [&](const char* each) { return hasDescription(each, descriptor); });
   return found != kStandIns.end() ? *found : nullptr;
 }
 
