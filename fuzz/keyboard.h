@@ -38,9 +38,8 @@ inline void requireMeaningful(const InputEvent& event) {
     const bool isSurrogate = 0xD800 <= key->character && key->character <= 0xDFFF;
     require(key->character <= 0x10FFFF && !isSurrogate, "a key types a character");
     require((key->key == Key::Character) == (key->character != 0), "only character keys type");
-  } else {
-    const auto& mouse = std::get<MouseEvent>(event);
-    require(mouse.column >= 0 && mouse.line >= 0, "the mouse is in the terminal");
+  } else if (const auto* mouse = std::get_if<MouseEvent>(&event)) {
+    require(mouse->column >= 0 && mouse->line >= 0, "the mouse is in the terminal");
   }
 }
 
@@ -49,7 +48,7 @@ inline Events eventsOf(std::string_view bytes) {
   Keyboard keyboard;
   const std::uint64_t before = allocatedBytes();
   keyboard.send(bytes);
-  require(allocatedBytes() - before <= 1024 + 4 * sizeof(InputEvent) * keyboard.events().size(),
+  require(allocatedBytes() - before <= 8192 + 4 * bytes.size() + 4 * sizeof(InputEvent) * keyboard.events().size(),
           "what a sequence has collected is bounded");
   if (!keyboard.isWaiting()) {
     Keyboard same = keyboard;

@@ -21,6 +21,11 @@ RecordList waitingForUpdate() {
   return list;
 }
 
+bool isWaitingForUpdate(const RecordList& list) {
+  static const RecordList waiting = waitingForUpdate();
+  return list.size() == 1 && list[0] == waiting[0];
+}
+
 Record LTE::initialSelReselCellInfo() {
   return emptyRecord({
       "timestamp"_text,

@@ -16,6 +16,9 @@ using RecordList = SharedVector<Record>;
 /// What a list holds until its metric first arrives: one record that says so.
 [[nodiscard]] RecordList waitingForUpdate();
 
+/// Whether that is all the list holds.
+[[nodiscard]] bool isWaitingForUpdate(const RecordList& list);
+
 struct LTE {
   /// Its keys are fixed; each is the empty text until the metric brings a value.
   Record SelReselCellInfo = initialSelReselCellInfo();

@@ -165,4 +165,10 @@ RecordList shownRecords(const CategorySource& source, const Stores& stores) {
   return records;
 }
 
+bool isListFilled(const CategorySource& source, const Stores& stores) {
+  if (source.list == nullptr) return true;
+  const RecordList list = source.list(stores);
+  return list.size() > 0 && !isWaitingForUpdate(list);
+}
+
 }  // namespace vesk

@@ -53,4 +53,8 @@ struct CategorySource {
 /// not come.
 [[nodiscard]] RecordList shownRecords(const CategorySource& source, const Stores& stores);
 
+/// False while no metric has filled the source's list, which then has nothing or only what stands in for an element.
+/// True for a source that is no list.
+[[nodiscard]] bool isListFilled(const CategorySource& source, const Stores& stores);
+
 }  // namespace vesk

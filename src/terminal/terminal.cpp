@@ -20,6 +20,7 @@ std::unique_ptr<Terminal> Terminal::open(NavigationController& stack, const Cloc
   std::optional<Capabilities> capabilities =
       readCapabilities(terminal->get(), setUpCharacterLocale(), appearance, reason);
   if (!capabilities) return nullptr;
+  if (!capabilities->warning.empty() && surroundings.warn) surroundings.warn(capabilities->warning);
   return std::make_unique<Terminal>(stack, clock, std::move(surroundings), std::move(*terminal),
                                     std::move(*capabilities));
 }

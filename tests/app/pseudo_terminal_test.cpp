@@ -54,7 +54,7 @@ TEST(AtATerminal, TheUserWalksToAValueAndBackAndLeavesTheTerminalAsItWas) {
     ASSERT_TRUE(terminal.readUpTo("Valid").ends_with("Valid")) << "the recorded event is not in the stores";
     ASSERT_FALSE(areAlike(terminal.modes(), before));
 
-    terminal.type(std::string("d") + kDown + "\r");
+    terminal.type(std::string("dd") + kDown + "\r");
     ASSERT_TRUE(terminal.readUpTo("Bearers").ends_with("Bearers"));
     terminal.type(std::string(kDown) + kDown + kDown + "\r");
     const std::string values = terminal.readUpTo("11.5");
@@ -68,6 +68,17 @@ TEST(AtATerminal, TheUserWalksToAValueAndBackAndLeavesTheTerminalAsItWas) {
     EXPECT_NE(left.find(kCursorShown), std::string::npos) << left;
     EXPECT_TRUE(areAlike(terminal.modes(), before));
   }
+}
+
+TEST(AtATerminal, AnUnknownTerminalIsShownTheScreensOfAUsualOne) {
+  setenv("TERM", "nobody-knows-it", 1);
+  PseudoTerminal terminal({100, 24});
+  ChildProcess process(VESK_PROGRAM, {"--log", "none"}, terminal.openForProgram());
+  const std::string launch = terminal.readUpTo("quit");
+  EXPECT_TRUE(launch.starts_with("vesk: the terminal \"nobody-knows-it\" is not known")) << launch;
+  EXPECT_EQ(launch.find('\n'), launch.find(kAlternateScreen) - 1) << launch;
+  terminal.type("q");
+  EXPECT_EQ(process.waitForExit(), 0);
 }
 
 TEST(AtATerminal, WithoutScreensTheLinesArePrintedFromTheFirstOn) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdlib>
 #include <string>
 
 #include "recording/recorded_event.h"
@@ -7,6 +8,9 @@
 #include "support/metric_events.h"
 
 namespace vesk {
+
+/// Its signs are those of a UTF-8 locale in every test.
+inline const bool kRunsInUtf8 = setenv("LC_ALL", "C.UTF-8", 1) == 0;
 
 /// Runs the program itself, as its user does.
 inline Finished vesk(std::vector<std::string> arguments, std::string_view input = "") {

@@ -82,7 +82,7 @@ struct LteNeighbor {
   std::int32_t rsrp;
 };
 
-inline DriveEvent lteNeighbors(std::int64_t at, std::vector<LteNeighbor> neighbors) {
+inline DriveEvent lteNeighbors(std::int64_t at, const std::vector<LteNeighbor>& neighbors) {
   return event<KCellularLteNbrEutraCellMeas>(at, K_LTE_INTRARAT_MEAS, [=](auto& message) {
     for (const LteNeighbor& each : neighbors) {
       auto cell = std::make_shared<EgwErrcNbrEutraMeas>();
@@ -102,7 +102,7 @@ struct CarrierElement {
   std::optional<std::int32_t> rsrp{};
 };
 
-inline DriveEvent carriers(std::int64_t at, std::vector<CarrierElement> elements) {
+inline DriveEvent carriers(std::int64_t at, const std::vector<CarrierElement>& elements) {
   return event<KCellularLteCarrierAggregationStatus>(at, K_LTE_CA_STATUS, [=](auto& message) {
     for (const CarrierElement& each : elements) {
       auto carrier = std::make_shared<SecondaryComponentCarrier>();
@@ -191,7 +191,7 @@ inline DriveEvent gmm(std::int64_t at, RegStatus status) {
 }
 
 /// By nsapi.
-inline DriveEvent bearers(std::int64_t at, std::vector<std::uint32_t> numbers) {
+inline DriveEvent bearers(std::int64_t at, const std::vector<std::uint32_t>& numbers) {
   return event<KCellularActivatedBearerContexts>(at, K_CELLULAR_ACTIVE_BEARER, [=](auto& message) {
     message.setBearerContextCount(static_cast<std::uint32_t>(numbers.size()));
     for (const std::uint32_t number : numbers) {

@@ -123,6 +123,16 @@ TEST_F(Screens, EveryCategoryShowsItsSourceInTheOrderOfTheMenu) {
             "Active Bearers: [PDP 0] activeBearer=23 3CD50D\n");
 }
 
+TEST_F(Screens, AListIsFilledOnceItHasAnElement) {
+  const CategorySource& power = sourceOf("LTE", "Tx Power");
+  EXPECT_FALSE(isListFilled(power, intake->stores));
+  intake->stores.myLTE.TxPower.clear();
+  EXPECT_FALSE(isListFilled(power, intake->stores));
+  intake->stores.myLTE.TxPower.append(Record{{"chan"_text, 3}});
+  EXPECT_TRUE(isListFilled(power, intake->stores));
+  EXPECT_TRUE(isListFilled(sourceOf("LTE", "NAS"), intake->stores));
+}
+
 TEST_F(Screens, ShowPlaceholdersBeforeAnyEvent) {
   for (const CategorySource& source : categorySources())
     EXPECT_NE(shown(*open(source.area, source.category)), "");

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <chrono>
+#include <cstdlib>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -13,7 +14,7 @@
 namespace vesk {
 
 /// Widths of characters are those of a UTF-8 locale in every test.
-inline const bool kHasUtf8Locale = setUpCharacterLocale();
+inline const bool kHasUtf8Locale = setenv("LC_ALL", "C.UTF-8", 1) == 0 && setUpCharacterLocale();
 
 /// The lines of a grid, each behind a bar so that its blanks at the start can be seen.
 inline std::string pictureOf(const Grid& grid) {

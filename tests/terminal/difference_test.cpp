@@ -1,7 +1,11 @@
 #include "terminal/device/difference.h"
 
+#include <algorithm>
+#include <cmath>
 #include <cstdlib>
 #include <gtest/gtest.h>
+#include <utility>
+#include <vector>
 
 #include "support/pictures.h"
 #include "terminal/device/palette.h"
@@ -68,6 +72,30 @@ TEST(Palette, TakesColoursAsTheTerminalHasThem) {
   EXPECT_EQ(backgroundOf("0;default;15"), Background::Light);
   EXPECT_EQ(backgroundOf("12;8"), Background::Dark);
   EXPECT_EQ(backgroundOf(""), Background::Unknown);
+}
+
+/// The relative luminance of a colour of the cube or of the greys.
+double luminanceOf(int color) {
+  const auto linear = [](int level) { return std::pow((level / 255.0 + 0.055) / 1.055, 2.4); };
+  if (color >= 232) return linear(8 + 10 * (color - 232));
+  const auto level = [](int step) { return step == 0 ? 0 : 55 + 40 * step; };
+  const int place = color - 16;
+  return 0.2126 * linear(level(place / 36)) + 0.7152 * linear(level(place / 6 % 6)) + 0.0722 * linear(level(place % 6));
+}
+
+TEST(Palette, TextIsReadableOnItsBackground) {
+  const std::pair<Background, std::vector<double>> cases[] = {
+      {Background::Dark, {0}}, {Background::Light, {1}}, {Background::Unknown, {0, 1}}};
+  for (const auto& [background, grounds] : cases) {
+    for (const Look& look : makePalette(ColorDepth::TwoHundredFiftySix, background)) {
+      if (!look.foreground) continue;
+      const double text = luminanceOf(*look.foreground) + 0.05;
+      for (double ground : look.background ? std::vector{luminanceOf(*look.background)} : grounds) {
+        ground += 0.05;
+        EXPECT_GE(std::max(text, ground) / std::min(text, ground), 4.0) << int{*look.foreground};
+      }
+    }
+  }
 }
 
 TEST(Palette, NoMeaningHangsOnColourAlone) {

@@ -10,9 +10,10 @@ void PrintTo(const InputEvent& event, std::ostream* out) {
     *out << "key " << static_cast<int>(key->key) << " U+" << static_cast<unsigned>(key->character)
          << (key->modifiers.shift ? " shift" : "") << (key->modifiers.alt ? " alt" : "")
          << (key->modifiers.control ? " control" : "");
+  } else if (const auto* mouse = std::get_if<MouseEvent>(&event)) {
+    *out << "mouse " << static_cast<int>(mouse->action) << " at " << mouse->column << "," << mouse->line;
   } else {
-    const auto& mouse = std::get<MouseEvent>(event);
-    *out << "mouse " << static_cast<int>(mouse.action) << " at " << mouse.column << "," << mouse.line;
+    *out << "paste " << std::get<PasteEvent>(event).text;
   }
 }
 
@@ -58,9 +59,10 @@ const Case kCases[] = {
      {mouse(MouseAction::Press, 2, 6), mouse(MouseAction::Drag, 3, 7), mouse(MouseAction::Release, 3, 7)}},
     {"\x1b[<64;1;1M\x1b[<65;1;1M", {mouse(MouseAction::WheelUp, 0, 0), mouse(MouseAction::WheelDown, 0, 0)}},
     {"\x1b[<16;300;200M", {mouse(MouseAction::Press, 299, 199, kControl)}},
+    {"\x1b[200~q\r\x1b[Aé\x1b[201~", {PasteEvent{"q\r\x1b[Aé"}}},
     // Understood as nothing, and swallowed whole.
     {"\x1b[<2;3;7M\x1b[<35;3;7M\x1b[<0;0;1M\x1b[<0;3M\x1b[<0;3;7Q", {}},
-    {"\x1b[15~\x1b[200~\x1b[?1;2c\x1b[1;2$y\x1b[99999999999A", {}},
+    {"\x1b[15~\x1b[201~\x1b[?1;2c\x1b[1;2$y\x1b[99999999999A", {}},
     {"\x1b[M !!\x1b[[A\x1bOP", {}},
     {"\x1b]11;rgb:0000/0000/0000\x1b\\\x1b]0;title\a\x1bPdcs\x1b\\", {}},
     {"\x80\xC3\xFF\xE6\xBC", {}},

@@ -39,7 +39,7 @@ TEST(Picture, ShowsSectionsNamesAndValuesWrappedWhereTheyNeedIt) {
 |    {id: 5,
 |     qci: 9}
 |
-| ? help  Enter open  Esc back  / filter
+| ? help  Esc back  / filter  Space hold
 )");
 }
 
@@ -126,6 +126,9 @@ TEST(Picture, TellsHowOldTheRowsAreInTheDrivesTimeAndHowOftenTheMetricCame) {
   moment = {moment.time + 24h, 0};
   EXPECT_EQ(desk.line(1), "  Tx Power  3 d ago, 2 times");
   EXPECT_EQ(desk.presenter().nextChange(), std::nullopt);
+  arrivals->isWithoutList = true;
+  fields.tableView().reloadData();
+  EXPECT_EQ(desk.line(1), "  Tx Power  1 d ago, 15 times, without…");
   arrivals = std::nullopt;
   fields.tableView().reloadData();
   EXPECT_EQ(desk.line(1), "  Tx Power");
@@ -158,7 +161,19 @@ TEST(Picture, ShowsTheDiagnosticLinesInAPaneThatKeepsItsPlace) {
   desk.type(U"]]]]");
   append(15, 15);
   EXPECT_EQ(desk.line(10), " line 15");
+  lines.append("a long line of many words that goes on and on to its end");
+  EXPECT_EQ(desk.line(8), " line 15");
+  EXPECT_EQ(desk.line(9), " a long line of many words that goes on");
+  EXPECT_EQ(desk.line(10), " and on to its end");
+  desk.mouse(MouseAction::WheelUp, 5, 9);
+  desk.mouse(MouseAction::WheelDown, 5, 9);
+  desk.mouse(MouseAction::WheelUp, 5, 9);
+  EXPECT_EQ(desk.line(10), " line 14");
   desk.type(U"d");
+  EXPECT_EQ(desk.line(5).substr(0, 12), " Diagnostics");
+  desk.type(U"?");
+  EXPECT_EQ(desk.line(5).find("Diagnostics"), std::string::npos);
+  desk.type(U"?d");
   EXPECT_EQ(desk.line(7), "");
 }
 
@@ -169,12 +184,16 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   EXPECT_EQ(desk.line(1), "  Keys");
   EXPECT_EQ(desk.line(4), "  Esc ← h Backspace  clear the filter, go back");
   EXPECT_EQ(desk.line(6), "  Space f            hold all that shows, and the replay; intake goes on");
-  EXPECT_EQ(desk.line(31), " ? help  Enter open  Esc back  / filter  Space hold  d lines  o overview  q quit");
+  EXPECT_EQ(desk.line(31), " Esc back  q quit");
   desk.resize({40, 10});
-  desk.press(Key::End);
+  desk.type(U"GG");
+  EXPECT_EQ(desk.line(7), "                     there");
   EXPECT_EQ(desk.line(8), "  wheel, drag        scroll");
   desk.press(Key::Escape);
   EXPECT_EQ(desk.line(2), "  Device Info                        ›");
+  Surroundings dated;
+  dated.sourceState = [] { return SourceState{.text = "live", .date = "2026-01-02 03:04:05 UTC"}; };
+  EXPECT_EQ(Desk(interface.stack(), {40, 10}, dated).line(0), " Vesk                              live");
 }
 
 TEST(Picture, SaysThatATerminalIsTooSmallAtEverySizeBelow) {

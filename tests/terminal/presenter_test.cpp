@@ -126,13 +126,13 @@ TEST_F(PresenterTest, AsksOnlyForRowsThatComeIntoView) {
 }
 
 TEST_F(PresenterTest, AsksAgainForRowsThatComeIntoViewAgainAndForThoseBesideThem) {
-  FakeTableScreen& fields = showFields(numbered(30, "old"));
-  EXPECT_NE(desk_->picture().find("old"), std::string::npos);
+  FakeTableScreen& fields = showFields(numbered(30, "then"));
+  EXPECT_NE(desk_->picture().find("then"), std::string::npos);
   fields.content = numbered(30, "new");
   desk_->press(Key::End);
   desk_->picture();
   desk_->press(Key::Home);
-  EXPECT_EQ(desk_->picture().find("old"), std::string::npos);
+  EXPECT_EQ(desk_->picture().find("then"), std::string::npos);
   fields.content = numbered(30, "now");
   desk_->press(Key::PageDown);
   EXPECT_EQ(desk_->picture().find("new"), std::string::npos);
@@ -172,13 +172,17 @@ TEST_F(PresenterTest, FiltersWhileOneTypes) {
   desk_->press(Key::Down);
   EXPECT_EQ(selected(), "interval in 5");
   desk_->press(Key::Enter);
-  EXPECT_EQ(desk_->line(9), " /InT  ? help  Enter open  Esc back");
+  EXPECT_EQ(desk_->line(9), " /InT  ? help  Esc back  / filter");
   fields.content[0].rows[0] = FakeTableScreen::row("apn", "other");
   fields.tableView().reloadData();
   EXPECT_EQ(desk_->line(2), " PDP 1");
 
   desk_->press(Key::Escape);
   EXPECT_EQ(selected(), "interval in 6");
+  desk_->press(Key::Tab);
+  EXPECT_EQ(selected(), "qci in 8");
+  desk_->press(Key::Tab);
+  EXPECT_EQ(desk_->line(3).substr(0, 8), "• apn ");
   EXPECT_EQ(depth(), 3U);
   desk_->type(U"/qé");
   EXPECT_EQ(desk_->line(2), "  no row has this");
@@ -186,6 +190,26 @@ TEST_F(PresenterTest, FiltersWhileOneTypes) {
   desk_->press(Key::Escape);
   desk_->press(Key::Escape);
   EXPECT_EQ(depth(), 2U);
+}
+
+TEST_F(PresenterTest, TheFilterKnowsHeadersTakesPastedTextAndLosesWordsByControl) {
+  showFields({{"PDP 0"_text, {FakeTableScreen::row("apn", "a")}}, {"PDP 1"_text, {FakeTableScreen::row("qci", "5")}}});
+  const auto control = [&](char32_t letter) {
+    desk_->presenter().handle(KeyEvent{.character = letter, .modifiers = {.control = true}});
+  };
+  desk_->presenter().handle(PasteEvent{"q"});
+  EXPECT_EQ(quits_, 0);
+  desk_->type(U"/");
+  desk_->presenter().handle(PasteEvent{"pdp\t 1\nq"});
+  EXPECT_EQ(desk_->line(2), " PDP 1");
+  EXPECT_EQ(desk_->line(3), "  qci                                5");
+  EXPECT_EQ(desk_->line(9).substr(0, 10), " /pdp 1▏");
+  control(U'w');
+  EXPECT_EQ(desk_->line(9).substr(0, 9), " /pdp ▏");
+  control(U'u');
+  EXPECT_EQ(desk_->line(9).substr(0, 5), " /▏");
+  desk_->type(U"0123456789012345678");
+  EXPECT_EQ(desk_->line(9).substr(0, 30), " /…23456789012345678▏ Ente");
 }
 
 TEST_F(PresenterTest, HoldsTheWholeScreen) {
@@ -315,6 +339,17 @@ TEST_F(PresenterTest, TracksWhileTheListIsDragged) {
   EXPECT_EQ(selected(), "row 3 in 3");
   desk_->mouse(MouseAction::Release, 5, 5);
   EXPECT_EQ(tracking_, (std::vector<bool>{true, false}));
+  EXPECT_EQ(depth(), 3U);
+}
+
+TEST_F(PresenterTest, TheScrollBarIsClickedAndDragged) {
+  showFields(numbered(30));
+  const std::pair<int, std::string> steps[] = {{8, "row 23"}, {5, "row 11"}, {2, "row 0"}, {20, "row 23"}};
+  for (const auto& [line, first] : steps) {
+    desk_->mouse(line > 8 ? MouseAction::Drag : MouseAction::Press, 39, line);
+    EXPECT_EQ(desk_->line(2).substr(2, first.size() + 1), first + " ") << line;
+  }
+  EXPECT_EQ(tracking_, std::vector<bool>{true});
   EXPECT_EQ(depth(), 3U);
 }
 

@@ -111,7 +111,7 @@ TEST_F(TerminalTest, TakesALoneEscapeWhenItsTimeHasCome) {
 TEST_F(TerminalTest, ShowsAReloadAtMostOnceAFrame) {
   FakeTableScreen& fields = interface_.showFields(0, {{std::nullopt, {FakeTableScreen::row("power", "one")}}});
   open();
-  tty_.readUpTo("filter");
+  tty_.readUpTo("hold");
   const auto change = [&](std::string_view value) {
     fields.content[0].rows[0] = FakeTableScreen::row("power", value);
     fields.tableView().reloadData();

@@ -1,4 +1,5 @@
 #include <clocale>
+#include <cstdlib>
 #include <gtest/gtest.h>
 
 #include "support/pictures.h"
@@ -71,6 +72,17 @@ TEST(TextColumns, TextIsWrappedAtLineFeedsThenBlanksThenAnywhere) {
   };
   for (const auto& each : cases) {
     EXPECT_EQ(wrapText(each.text, each.width), each.lines) << each.text;
+  }
+}
+
+TEST(TextColumns, TheLocaleSaysWhetherUtf8ShowsAndNoneMeansItDoes) {
+  const struct {
+    const char* locale;
+    bool showsUtf8;
+  } cases[] = {{"C", false}, {"POSIX", false}, {"xx_YY.ISO-8859-1", false}, {"xx_YY.utf8", true}, {"C.UTF-8", true}};
+  for (const auto& each : cases) {
+    setenv("LC_ALL", each.locale, 1);
+    EXPECT_EQ(setUpCharacterLocale(), each.showsUtf8) << each.locale;
   }
 }
 

@@ -12,6 +12,7 @@
 #include "intake/metric_validator.h"
 #include "screens/category_sources.h"
 #include "screens/detail_text.h"
+#include "terminal/device/column_width.h"
 #include "values/visible_text.h"
 
 namespace vesk {
@@ -117,7 +118,8 @@ std::string readingsText(const Stores& stores, const insight::Insight& insight) 
       const std::vector<Columns> rows = readRows(messageClassOf(source), record);
       if (rows.empty()) continue;
       if (std::exchange(isFirst, false)) {
-        out += std::string(source.area) + " › " + std::string(source.category) + '\n';
+        out +=
+            std::string(source.area) + (setUpCharacterLocale() ? " › " : " > ") + std::string(source.category) + '\n';
       } else {
         out += '\n';
       }

@@ -167,6 +167,7 @@ class Run {
         .setTracking =
             [this](bool isTracking) { loop_.setMode(isTracking ? RunLoopMode::tracking : RunLoopMode::defaultMode); },
         .quit = [this] { loop_.stop(); },
+        .warn = [](const std::string& line) { tellUser("vesk: " + line); },
         .setInBackground =
             [&application](bool isInBackground) {
               if (isInBackground) {

@@ -8,6 +8,7 @@
 #include "app/output/data_output.h"
 #include "app/source/road.h"
 #include "screens/vesk_view_items.h"
+#include "terminal/device/column_width.h"
 #include "toolkit/interface_layout.h"
 #include "toolkit/walk.h"
 #include "values/json_form.h"
@@ -91,7 +92,7 @@ std::string asText(const ShowOptions& options, const std::vector<ShownSection>& 
   const std::size_t keyWidth = widestKey(sections);
   std::string out;
   appendVisible(out, options.area);
-  out += " › ";
+  out += setUpCharacterLocale() ? " › " : " > ";
   appendVisible(out, options.category);
   out += '\n';
   for (const auto& [header, rows] : sections) {

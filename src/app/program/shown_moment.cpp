@@ -53,7 +53,9 @@ void ShownMoment::release() {
 }
 
 std::optional<Arrivals> ShownMoment::arrivals(std::string_view area, std::string_view category) const {
-  return (held_ ? held_->arrivals : arrivals_).of(area, category);
+  std::optional<Arrivals> arrivals = (held_ ? held_->arrivals : arrivals_).of(area, category);
+  if (arrivals && arrivals->count > 0) arrivals->isWithoutList = !isListFilled(sourceOf(area, category), shownStores());
+  return arrivals;
 }
 
 DriveMoment ShownMoment::time() const {

@@ -1,6 +1,7 @@
 #include "terminal/device/capabilities.h"
 
 #include <algorithm>
+#include <array>
 #include <cstdint>
 #include <cstdlib>
 #include <string_view>
@@ -16,6 +17,9 @@ namespace {
 // decimal); the others pass over them. Terminfo has no names for them.
 constexpr std::string_view kMouseOn = "\x1b[?1002h\x1b[?1006h";
 constexpr std::string_view kMouseOff = "\x1b[?1006l\x1b[?1002l";
+// The same holds for the marks around pasted text.
+constexpr std::string_view kPasteMarksOn = "\x1b[?2004h";
+constexpr std::string_view kPasteMarksOff = "\x1b[?2004l";
 
 std::string_view environment(const char* name) {
   const char* value = std::getenv(name);
@@ -57,6 +61,23 @@ std::string bytesOf(const Look& look) {
   return bytes;
 }
 
+/// What stands in for a terminal that this system does not know, as after a login from a newer one. Terminals of today
+/// understand the first.
+constexpr std::array kStandIns{"xterm-256color", "xterm", "ansi"};
+
+bool hasDescription(const char* name, int descriptor) {
+  int status = 0;
+  return setupterm(name, descriptor, &status) == OK;
+}
+
+/// Loads the description of `name`, or of what stands in for it, and returns whose it is; null for none.
+const char* loadDescription(const std::string& name, int descriptor) {
+  if (hasDescription(name.c_str(), descriptor)) return name.c_str();
+  const auto* found = std::find_if(kStandIns.begin(), kStandIns.end(),
+                                   [&](const char* each) { return hasDescription(each, descriptor); });
+  return found != kStandIns.end() ? *found : nullptr;
+}
+
 }  // namespace
 
 std::string Capabilities::move(int column, int line) const {
@@ -66,13 +87,15 @@ std::string Capabilities::move(int column, int line) const {
 std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, const Appearance& appearance,
                                              std::string& reason) {
   const std::string name(environment("TERM"));
-  int status = 0;
-  if (name.empty() || setupterm(name.c_str(), descriptor, &status) != OK) {
+  const char* known = name.empty() ? nullptr : loadDescription(name, descriptor);
+  if (known == nullptr) {
     reason = name.empty() ? "TERM is not set: set it to the name of your terminal"
                           : "the terminal \"" + name + "\" is not known to this system: check TERM";
     return std::nullopt;
   }
   Capabilities found;
+  if (known != name)
+    found.warning = "the terminal \"" + name + "\" is not known to this system: its screens are those of " + known;
   found.moveTo = textCapability("cup");
   found.clear = textCapability("clear");
   if (found.moveTo.empty() || found.clear.empty()) {
@@ -81,13 +104,13 @@ std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, con
   }
   found.plain = textCapability("sgr0");
   found.enterScreen = textCapability("smcup") + textCapability("civis") + textCapability("rmam");
-  found.enterScreen += kMouseOn;
-  found.leaveScreen = kMouseOff;
+  found.enterScreen.append(kMouseOn).append(kPasteMarksOn);
+  found.leaveScreen.append(kPasteMarksOff).append(kMouseOff);
   found.leaveScreen += found.plain + textCapability("smam") + textCapability("cnorm");
   const std::string leaveOtherScreen = textCapability("rmcup");
   found.leaveScreen += leaveOtherScreen.empty() ? found.clear : leaveOtherScreen;
-  found.showsUtf8 = showsUtf8;
-  found.signs = appearance.signs.value_or(signsOf(name, showsUtf8));
+  found.showsUtf8 = showsUtf8 && !isWithoutUtf8(known);
+  found.signs = found.showsUtf8 ? appearance.signs.value_or(signsOf(name, true)) : Signs::ascii;
 
   const int colors = tigetnum("colors");
   const ColorDepth depth = colorDepthOf(colors, environment("NO_COLOR"));

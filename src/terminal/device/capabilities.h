@@ -19,6 +19,8 @@ struct Capabilities {
   std::string clear;
   std::string enterScreen;  ///< takes the terminal over: its other screen, no cursor, no wrapping, mouse reports
   std::string leaveScreen;  ///< gives it back as it was
+  /// A line for the user where another terminal stands in for that of TERM; else empty.
+  std::string warning;
   bool showsUtf8 = true;
   Signs signs = Signs::braille;
 
@@ -26,8 +28,8 @@ struct Capabilities {
   [[nodiscard]] std::string move(int column, int line) const;
 };
 
-/// Reads the terminfo entry of TERM for the terminal at `descriptor`. Absent when the terminal is unknown or
-/// too simple for screens; `reason` then says why in one line.
+/// Reads the terminfo entry of TERM, or of a usual terminal in place of an unknown one, for the terminal at
+/// `descriptor`. Absent when there is none or it is too simple for screens; `reason` then says why in one line.
 [[nodiscard]] std::optional<Capabilities> readCapabilities(int descriptor, bool showsUtf8, const Appearance& appearance,
                                                            std::string& reason);
 

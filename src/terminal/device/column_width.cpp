@@ -8,6 +8,7 @@
 #include <cwchar>
 #include <langinfo.h>
 
+#include "values/ascii.h"
 #include "values/utf8.h"
 
 namespace vesk {
@@ -65,10 +66,33 @@ bool isLocaleUtf8() {
   return std::strcmp(nl_langinfo(CODESET), "UTF-8") == 0;
 }
 
+/// The locale that the user chose for characters; empty for none.
+std::string_view chosenLocale() {
+  for (const char* variable : {"LC_ALL", "LC_CTYPE", "LANG"}) {
+    const char* value = std::getenv(variable);
+    if (value != nullptr && *value != '\0') return value;
+  }
+  return {};
+}
+
+/// Whether a locale that the system does not have says by its name that it is another one than UTF-8.
+bool namesOtherCharset(std::string_view locale) {
+  if (locale == "C" || locale == "POSIX") return true;
+  const std::size_t dot = locale.find('.');
+  if (dot == std::string_view::npos) return false;
+  const std::string_view charset = locale.substr(dot + 1, locale.find('@', dot) - dot - 1);
+  return !containsIgnoringCase(charset, "utf-8") && !containsIgnoringCase(charset, "utf8");
+}
+
 }  // namespace
 
 bool setUpCharacterLocale() {
-  if (std::setlocale(LC_CTYPE, "") != nullptr && isLocaleUtf8()) return true;
+  const std::string_view chosen = chosenLocale();
+  if (std::setlocale(LC_CTYPE, "") != nullptr) {
+    if (isLocaleUtf8()) return true;
+    if (!chosen.empty()) return false;
+  }
+  if (namesOtherCharset(chosen)) return false;
   return std::setlocale(LC_CTYPE, "C.UTF-8") != nullptr && isLocaleUtf8();
 }
 

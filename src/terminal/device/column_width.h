@@ -5,8 +5,8 @@
 
 namespace vesk {
 
-/// Takes the locale of the environment for characters, or C.UTF-8 where that one is no UTF-8 locale. False
-/// when the system has neither: then only ASCII can be shown.
+/// Takes the locale of the environment for characters, or C.UTF-8 where it names none or one that the system lacks.
+/// False when the user chose another charset than UTF-8, or the system has no UTF-8: then only ASCII can be shown.
 bool setUpCharacterLocale();
 
 /// The columns that a printable character takes: 1, 2, or 0 for a mark that combines with the one before.

@@ -109,27 +109,27 @@ constexpr Palette kLight = paletteOf({{
     {Role::Alarm, {.foreground = 160, .isBold = true}},
 }});
 
-/// Tones between the two, for a background that is not known.
+/// Tones between the two, for a background that is not known: each is readable on black and on white.
 constexpr Palette kEither = paletteOf({{
     {Role::Plain, {}},
-    {Role::Faint, {.foreground = 244}},
+    {Role::Faint, {.foreground = 243}},
     {Role::Bar, {.foreground = 231, .background = 25}},
     {Role::BarStatus, {.foreground = 231, .background = 25, .isBold = true}},
     {Role::Title, {.isBold = true}},
     {Role::FrozenMark, {.foreground = 231, .background = 160, .isBold = true}},
-    {Role::SectionHeader, {.foreground = 32, .isBold = true}},
+    {Role::SectionHeader, {.foreground = 31, .isBold = true}},
     {Role::Value, {}},
-    {Role::Changed, {.foreground = 34, .isBold = true}},
+    {Role::Changed, {.foreground = 28, .isBold = true}},
     {Role::Selected, {.foreground = 231, .background = 31}},
     {Role::SelectedChanged, {.foreground = 231, .background = 31, .isBold = true}},
-    {Role::Prompt, {.foreground = 166, .isBold = true}},
+    {Role::Prompt, {.foreground = 130, .isBold = true}},
     {Role::PaneHeader, {.foreground = 231, .background = 240}},
-    {Role::Key, {.foreground = 32, .isBold = true}},
-    {Role::Excellent, {.foreground = 35, .isBold = true}},
-    {Role::Good, {.foreground = 71}},
-    {Role::Fair, {.foreground = 172}},
-    {Role::Poor, {.foreground = 167}},
-    {Role::Alarm, {.foreground = 160, .isBold = true}},
+    {Role::Key, {.foreground = 31, .isBold = true}},
+    {Role::Excellent, {.foreground = 28, .isBold = true}},
+    {Role::Good, {.foreground = 28}},
+    {Role::Fair, {.foreground = 130}},
+    {Role::Poor, {.foreground = 161}},
+    {Role::Alarm, {.foreground = 161, .isBold = true}},
 }});
 
 }  // namespace

@@ -13,6 +13,12 @@ enum class Signs {
   braille,
 };
 
+/// Whether the terminal knows no more than the bytes of its time, whatever the locale says.
+[[nodiscard]] constexpr bool isWithoutUtf8(std::string_view terminalName) {
+  return terminalName.starts_with("ansi") || terminalName.starts_with("vt1") || terminalName.starts_with("vt2") ||
+         terminalName.starts_with("vt52");
+}
+
 /// `terminalName` is that of TERM. Consoles have fonts of a few hundred signs.
 [[nodiscard]] constexpr Signs signsOf(std::string_view terminalName, bool showsUtf8) {
   if (!showsUtf8) return Signs::ascii;

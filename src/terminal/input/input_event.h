@@ -1,5 +1,6 @@
 #pragma once
 
+#include <string>
 #include <variant>
 
 namespace vesk {
@@ -57,6 +58,13 @@ struct MouseEvent {
   friend bool operator==(const MouseEvent&, const MouseEvent&) = default;
 };
 
-using InputEvent = std::variant<KeyEvent, MouseEvent>;
+/// Text that was pasted, which is never keys.
+struct PasteEvent {
+  std::string text;
+
+  friend bool operator==(const PasteEvent&, const PasteEvent&) = default;
+};
+
+using InputEvent = std::variant<KeyEvent, MouseEvent, PasteEvent>;
 
 }  // namespace vesk

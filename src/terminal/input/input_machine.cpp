@@ -18,6 +18,10 @@ constexpr unsigned char kDelete = 0x7F;
 /// Far longer than any sequence with a meaning here.
 constexpr std::size_t kLongestSequence = 64;
 constexpr std::size_t kOldMouseBytes = 3;
+constexpr std::string_view kPasteStart = "200~";
+constexpr std::string_view kPasteEnd = "\x1b[201~";
+/// What comes behind is passed over.
+constexpr std::size_t kLongestPaste = 1024;
 
 KeyEvent keyOfControl(unsigned char byte) {
   switch (byte) {
@@ -94,6 +98,8 @@ void InputMachine::take(char byte, std::vector<InputEvent>& events) {
       if (code == kEscape) return enter(State::StringEscape);
       if (code == kBell || code == kCancel || code == kSubstitute) enter(State::Ground);
       return;
+    case State::Paste:
+      return takeInPaste(byte, events);
     case State::StringEscape:
       if (code == '\\') return enter(State::Ground);
       enter(State::Escape);
@@ -160,9 +166,20 @@ void InputMachine::takeInCsi(unsigned char byte, std::vector<InputEvent>& events
   if (collected_.empty() && byte == '[') return enter(State::LinuxConsole);
   if (collected_.size() < kLongestSequence) collected_ += static_cast<char>(byte);
   if (byte < 0x40) return;
+  if (collected_ == kPasteStart) return enter(State::Paste);
   if (collected_.size() < kLongestSequence) {
     if (const std::optional<InputEvent> event = eventOfCsi(collected_)) events.push_back(*event);
   }
+  enter(State::Ground);
+}
+
+void InputMachine::takeInPaste(char byte, std::vector<InputEvent>& events) {
+  // Room for the end is kept by shifting the last bytes.
+  if (collected_.size() == kLongestPaste + kPasteEnd.size()) collected_.erase(kLongestPaste, 1);
+  collected_ += byte;
+  if (!collected_.ends_with(kPasteEnd)) return;
+  collected_.resize(collected_.size() - kPasteEnd.size());
+  events.emplace_back(PasteEvent{collected_});
   enter(State::Ground);
 }
 

@@ -13,8 +13,8 @@
 namespace vesk {
 
 /// Turns the bytes that a terminal sends into keys and mouse events. It reads UTF-8, the CSI and SS3
-/// sequences of the usual terminals with their modifiers, and SGR mouse reports; every other sequence is
-/// swallowed whole, and so are bytes that are no UTF-8.
+/// sequences of the usual terminals with their modifiers, SGR mouse reports and bracketed pastes; every other sequence
+/// is swallowed whole, and so are bytes that are no UTF-8.
 class InputMachine {
  public:
   /// An Escape that nothing follows for this long was the key.
@@ -40,6 +40,7 @@ class InputMachine {
     OldMouse,      ///< after ESC [ M: three more bytes
     String,        ///< inside OSC, DCS, SOS, PM or APC
     StringEscape,  ///< after ESC in one of these
+    Paste,         ///< after ESC [ 200 ~, until ESC [ 201 ~
   };
 
   void take(char byte, std::vector<InputEvent>& events);
@@ -48,10 +49,11 @@ class InputMachine {
   void takeAfterEscape(unsigned char byte, std::vector<InputEvent>& events);
   void takeInCsi(unsigned char byte, std::vector<InputEvent>& events);
   void takeInSs3(unsigned char byte, std::vector<InputEvent>& events);
+  void takeInPaste(char byte, std::vector<InputEvent>& events);
   void enter(State state);
 
   State state_ = State::Ground;
-  /// What the present state has collected, cut at kLongestSequence.
+  /// What the present state has collected, cut at kLongestSequence; of a paste, at kLongestPaste.
   std::string collected_;
   bool isAltHeld_ = false;
   std::optional<Clock::Instant> deadline_;

@@ -34,7 +34,7 @@ const KeyBinding kBindings[] = {
      {letter(U'1'), letter(U'2'), letter(U'3'), letter(U'4')},
      "to 4 areas",
      "open an area of the first screen"},
-    {Action::Diagnostics, {letter(U'd')}, "lines", "show or hide the diagnostic lines"},
+    {Action::Diagnostics, {letter(U'd')}, "lines", "the diagnostic lines: some, half a screen, none"},
     {Action::OlderLines, {letter(U'[')}, "", "older diagnostic lines"},
     {Action::NewerLines, {letter(U']')}, "", "newer diagnostic lines"},
     {Action::Quit, {letter(U'q')}, "quit", "end the program"},
@@ -42,11 +42,28 @@ const KeyBinding kBindings[] = {
     {Action::Down, {{Key::Down}, letter(U'j')}, "figure", "one row down; on a trend: the next figure"},
     {Action::PageUp, {{Key::PageUp}}, "longer", "one page up; on a trend: a longer time"},
     {Action::PageDown, {{Key::PageDown}}, "shorter", "one page down; on a trend: a shorter time"},
-    {Action::First, {{Key::Home}}, "", "the first row"},
-    {Action::Last, {{Key::End}}, "", "the last row"},
+    {Action::First, {{Key::Home}, letter(U'g')}, "", "the first row"},
+    {Action::Last, {{Key::End}, letter(U'G')}, "", "the last row"},
+    {Action::NextSection, {{Key::Tab}}, "", "the next section, after the last the first"},
+};
+
+constexpr TypingBinding kTypingBindings[] = {
+    {Typing::RemoveAll, U'u', "Ctrl-U", "remove all that is typed into the filter"},
+    {Typing::RemoveWord, U'w', "Ctrl-W", "remove its last word"},
 };
 
 }  // namespace
+
+std::span<const TypingBinding> typingBindings() {
+  return kTypingBindings;
+}
+
+std::optional<Typing> typingOf(const KeyEvent& event) {
+  if (!event.modifiers.control || event.modifiers.alt) return std::nullopt;
+  for (const TypingBinding& binding : kTypingBindings)
+    if (binding.letter == event.character) return binding.typing;
+  return std::nullopt;
+}
 
 std::span<const KeyBinding> keyBindings() {
   return kBindings;

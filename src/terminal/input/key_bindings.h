@@ -38,6 +38,7 @@ enum class Action {
   PageDown,
   First,
   Last,
+  NextSection,
 };
 
 struct BoundKey {
@@ -53,6 +54,19 @@ struct KeyBinding {
   std::string_view hint;
   std::string_view help;
 };
+
+/// What a key with Control does while a filter is typed.
+enum class Typing { RemoveAll, RemoveWord };
+
+struct TypingBinding {
+  Typing typing;
+  char32_t letter;
+  std::string_view name;
+  std::string_view help;
+};
+
+[[nodiscard]] std::span<const TypingBinding> typingBindings();
+[[nodiscard]] std::optional<Typing> typingOf(const KeyEvent& event);
 
 /// In the order in which the help shows them.
 [[nodiscard]] std::span<const KeyBinding> keyBindings();

@@ -59,6 +59,7 @@ bool PanelStack::perform(Action action, std::optional<insight::Kpi> rowKpi) {
     case Action::PageDown:
     case Action::First:
     case Action::Last:
+    case Action::NextSection:
       if (top() != nullptr) top()->perform(action);
       return top() != nullptr;
     case Action::Help:

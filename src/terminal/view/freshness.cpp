@@ -49,6 +49,7 @@ Freshness freshnessOf(const Arrivals& arrivals, std::chrono::milliseconds now) {
     appendDecimal(freshness.text, arrivals.count);
     freshness.text += " times";
   }
+  if (arrivals.isWithoutList) freshness.text += ", without this list";
   return freshness;
 }
 

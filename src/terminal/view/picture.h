@@ -1,13 +1,12 @@
 #pragma once
 
-#include <cstdint>
 #include <optional>
-#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
 
 #include "terminal/panels/panel.h"
+#include "terminal/view/diagnostics_pane.h"
 #include "terminal/view/path_bar.h"
 #include "terminal/view/table_browser.h"
 
@@ -36,7 +35,7 @@ struct Regions {
   int hints = 0;
   int listColumns = 0;  ///< of the list's lines, without the scroll bar
 
-  [[nodiscard]] static Regions of(Size size, bool hasPane);
+  [[nodiscard]] static Regions of(Size size, PaneHeight paneHeight);
 };
 
 /// The columns of the bar before the path and after the status.
@@ -45,9 +44,6 @@ inline constexpr int kBarMargin = 1;
 /// Where the status starts on the bar; the column after the bar's text when there is none. The path ends one
 /// column before.
 [[nodiscard]] int statusColumn(int columns, int statusWidth);
-
-/// Lines wider than this tear a name from its value.
-inline constexpr int kWidestList = 100;
 
 /// All that one drawing of the terminal needs, and nothing that looks further. Views are good as long as the
 /// presenter is told nothing.
@@ -64,7 +60,7 @@ struct Picture {
 
   /// What shows in the place of title and list; null for a table screen.
   Panel* panel = nullptr;
-  std::span<const Action> hints = tableHints();
+  std::vector<Action> hints{};
 
   /// In the place of the hints; empty for none.
   std::string notice{};
@@ -75,11 +71,8 @@ struct Picture {
   /// The first line of the help that shows; absent when the list does.
   std::optional<int> helpStart{};
 
-  bool hasPane = false;
-  std::vector<std::string_view> paneLines{};
-  /// The number of the last line of the pane, and of the last line there is.
-  std::uint64_t paneEnd = 0;
-  std::uint64_t paneTotal = 0;
+  PaneHeight paneHeight = PaneHeight::None;
+  DiagnosticsPane::Shown pane{};
 };
 
 }  // namespace vesk

@@ -17,7 +17,7 @@ constexpr std::chrono::seconds kJump{10};
 }  // namespace
 
 Presenter::Presenter(NavigationController& stack, Surroundings surroundings, Signs signs)
-    : stack_(stack), surroundings_(std::move(surroundings)) {
+    : stack_(stack), surroundings_(std::move(surroundings)), pane_(surroundings_.diagnostics) {
   if (surroundings_.drive != nullptr) panels_.emplace(*surroundings_.drive, surroundings_.goToEvent, signs);
 }
 
@@ -110,8 +110,10 @@ void Presenter::handle(const InputEvent& event) {
   if (const auto* key = std::get_if<KeyEvent>(&event)) {
     forgetMouse();
     handleKey(*key);
-  } else {
-    handleMouse(std::get<MouseEvent>(event));
+  } else if (const auto* mouse = std::get_if<MouseEvent>(&event)) {
+    handleMouse(*mouse);
+  } else if (isTypingFilter_ && filter() != nullptr) {
+    setFilter(pasteInto(*filter(), std::get<PasteEvent>(event).text));
   }
 }
 
@@ -179,13 +181,12 @@ void Presenter::perform(Action action) {
       isTypingFilter_ = filter() != nullptr;
       return;
     case Action::Diagnostics:
-      isPaneOpen_ = !isPaneOpen_;
-      paneEnd_.reset();
+      pane_.changeHeight();
       return;
     case Action::OlderLines:
-      return scrollPane(-std::max(regions().pane.count() - 2, 1));
+      return pane_.scroll(-std::max(paneRoom().lines - 1, 1), paneRoom());
     case Action::NewerLines:
-      return scrollPane(+std::max(regions().pane.count() - 2, 1));
+      return pane_.scroll(+std::max(paneRoom().lines - 1, 1), paneRoom());
     case Action::Quit:
       if (surroundings_.quit) surroundings_.quit();
       return;
@@ -210,6 +211,7 @@ void Presenter::perform(Action action) {
     case Action::PageDown:
     case Action::First:
     case Action::Last:
+    case Action::NextSection:
       return performOnTable(action);
     case Action::Overview:
     case Action::Trend:
@@ -232,6 +234,7 @@ void Presenter::performOnTable(Action action) {
   if (action == Action::PageDown) shown->page(+1);
   if (action == Action::First) shown->selectFirst();
   if (action == Action::Last) shown->selectLast();
+  if (action == Action::NextSection) shown->selectNextSection();
 }
 
 void Presenter::jump(std::chrono::seconds distance) {
@@ -260,9 +263,9 @@ void Presenter::performInHelp(Action action) {
     case Action::PageDown:
       return scrollHelp(+page);
     case Action::First:
-      return scrollHelp(-helpLineCount());
+      return scrollHelp(-helpLineCount(size_.columns));
     case Action::Last:
-      return scrollHelp(+helpLineCount());
+      return scrollHelp(+helpLineCount(size_.columns));
     case Action::Open:
     case Action::Filter:
     case Action::Freeze:
@@ -280,23 +283,19 @@ void Presenter::performInHelp(Action action) {
     case Action::Diagnostics:
     case Action::OlderLines:
     case Action::NewerLines:
+    case Action::NextSection:
       return;
   }
 }
 
 void Presenter::scrollHelp(int lines) {
-  const int last = std::max(helpLineCount() - regions().list.count(), 0);
+  const int last = std::max(helpLineCount(size_.columns) - regions().list.count(), 0);
   helpStart_ = std::clamp(*helpStart_ + lines, 0, last);
 }
 
-void Presenter::scrollPane(int lines) {
-  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
-  const auto total = static_cast<std::int64_t>(surroundings_.diagnostics->total());
-  const auto kept = static_cast<std::int64_t>(surroundings_.diagnostics->lines().size());
-  const std::int64_t first = std::min<std::int64_t>(total - kept + regions().pane.count() - 1, total);
-  const std::int64_t present = paneEnd_ ? static_cast<std::int64_t>(*paneEnd_) : total;
-  const std::int64_t end = std::clamp(present + lines, first, total);
-  paneEnd_ = end < total ? std::optional(static_cast<std::uint64_t>(end)) : std::nullopt;
+/// Where the lines of the pane stand.
+Size Presenter::paneRoom() const {
+  return {size_.columns - kBarMargin, std::max(regions().pane.count() - 1, 1)};
 }
 
 void Presenter::open() {
@@ -321,7 +320,7 @@ void Presenter::handleMouse(const MouseEvent& event) {
     case MouseAction::WheelDown: {
       const int lines = event.action == MouseAction::WheelUp ? -kWheelLines : kWheelLines;
       if (regions().pane.has(event.line)) {
-        scrollPane(lines);
+        pane_.scroll(lines, paneRoom());
       } else if (helpStart_) {
         scrollHelp(lines);
       } else if (panel() != nullptr) {
@@ -334,9 +333,15 @@ void Presenter::handleMouse(const MouseEvent& event) {
     case MouseAction::Press:
       setTracking(false);
       held_ = event;
+      isScrollBarHeld_ = isOnScrollBar(event);
+      if (isScrollBarHeld_) scrollTo(event.line);
       return;
     case MouseAction::Drag:
       if (!held_ || shown == nullptr || helpStart_ || panel() != nullptr) return;
+      if (isScrollBarHeld_) {
+        setTracking(true);
+        return scrollTo(event.line);
+      }
       if (!isTracking_ && (event.line == held_->line || !regions().list.has(held_->line))) return;
       setTracking(true);
       shown->scroll(held_->line - event.line);
@@ -350,6 +355,17 @@ void Presenter::handleMouse(const MouseEvent& event) {
       return;
     }
   }
+}
+
+bool Presenter::isOnScrollBar(const MouseEvent& event) {
+  const Regions regions = this->regions();
+  return browser() != nullptr && !helpStart_ && panel() == nullptr && event.column == regions.listColumns &&
+         regions.list.has(event.line);
+}
+
+void Presenter::scrollTo(int line) {
+  const Regions::Lines list = regions().list;
+  browser()->scrollTo(line - list.start, list.count());
 }
 
 /// Of the path: the table screens, then the panels over them.

@@ -11,6 +11,7 @@
 #include "terminal/input/input_event.h"
 #include "terminal/input/key_bindings.h"
 #include "terminal/panels/panel_stack.h"
+#include "terminal/view/diagnostics_pane.h"
 #include "terminal/view/freshness.h"
 #include "terminal/view/picture.h"
 #include "terminal/view/surroundings.h"
@@ -73,8 +74,9 @@ class Presenter {
   void hold(bool isHeld);
   [[nodiscard]] bool isHolding() const { return isHeld_ || isOnTheWay_; }
   void scrollHelp(int lines);
-  void scrollPane(int lines);
-  void fillPane(Picture& picture);
+  [[nodiscard]] Size paneRoom() const;
+  [[nodiscard]] bool isOnScrollBar(const MouseEvent& event);
+  void scrollTo(int line);
   void setTracking(bool isTracking);
 
   /// Brings the browsers in line with the navigation stack and the top one with its table.
@@ -82,13 +84,17 @@ class Presenter {
   void addScreen(const std::shared_ptr<ViewController>& controller);
   void noteArrivals(Screen& screen, const TableBrowser& shown);
   [[nodiscard]] TableBrowser* browser() { return screens_.empty() ? nullptr : screens_.back().browser.get(); }
-  [[nodiscard]] Regions regions() const { return Regions::of(size_, isPaneOpen_); }
+  [[nodiscard]] Regions regions() const { return Regions::of(size_, paneHeight()); }
+  /// The help lies over the pane.
+  [[nodiscard]] PaneHeight paneHeight() const { return helpStart_ ? PaneHeight::None : pane_.height(); }
   [[nodiscard]] Panel* panel() const { return panels_ ? panels_->top() : nullptr; }
   /// Of what shows; null where nothing can be filtered.
   [[nodiscard]] const std::string* filter();
   void setFilter(std::string filter);
   [[nodiscard]] std::optional<insight::Kpi> selectedKpi();
   [[nodiscard]] std::vector<std::string> titles() const;
+  /// The keys that do something where the user is.
+  [[nodiscard]] std::vector<Action> hints(const Picture& picture);
   void fillTable(Picture& picture, Clock::Instant now);
   void addHeadlines(Picture& picture, std::string_view area, Clock::Instant now);
   [[nodiscard]] std::string dateBehind(std::string_view status, std::string_view date) const;
@@ -106,17 +112,16 @@ class Presenter {
   /// One for each screen of the stack, as of the last followStack.
   std::vector<Screen> screens_;
   bool isTypingFilter_ = false;
-  bool isPaneOpen_ = false;
   /// By the user.
   bool isHeld_ = false;
   bool isOnTheWay_ = false;
   bool showsReadings_ = true;
-  /// The number of the last diagnostic line that shows, counted from 1; absent while the newest one does.
-  std::optional<std::uint64_t> paneEnd_;
+  DiagnosticsPane pane_;
   std::optional<int> helpStart_;
 
   /// Where the mouse's button went down or was last dragged to.
   std::optional<MouseEvent> held_;
+  bool isScrollBarHeld_ = false;
   bool isTracking_ = false;
 
   std::string notice_;

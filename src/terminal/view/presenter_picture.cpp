@@ -1,6 +1,7 @@
 // How the presenter puts together what shows.
 
 #include <algorithm>
+#include <iterator>
 #include <utility>
 
 #include "terminal/device/column_width.h"
@@ -54,12 +55,34 @@ Picture Presenter::picture(Clock::Instant now) {
   picture.isTypingFilter = isTypingFilter_ && filter() != nullptr;
   if (panel() != nullptr) {
     picture.panel = panel();
-    picture.hints = panel()->hints();
   } else {
     fillTable(picture, now);
   }
-  fillPane(picture);
+  picture.hints = hints(picture);
+  picture.paneHeight = paneHeight();
+  if (picture.paneHeight != PaneHeight::None) picture.pane = pane_.shown(paneRoom());
   return picture;
+}
+
+std::vector<Action> Presenter::hints(const Picture& picture) {
+  if (helpStart_) return {Action::Back, Action::Quit};
+  if (panel() != nullptr) return {panel()->hints().begin(), panel()->hints().end()};
+  const auto opens = [](const ListLine& line) { return line.isSelected && line.hasDisclosure; };
+  const std::pair<Action, bool> needs[] = {
+      {Action::Open, std::any_of(picture.lines.begin(), picture.lines.end(), opens)},
+      {Action::Back, screens_.size() > 1 || !picture.filter.empty()},
+      {Action::Filter, browser() != nullptr},
+      {Action::Diagnostics, surroundings_.diagnostics != nullptr},
+      {Action::Overview, panels_.has_value()},
+  };
+  const auto isWithout = [&](Action action) {
+    const auto* found =
+        std::find_if(std::begin(needs), std::end(needs), [&](const auto& need) { return need.first == action; });
+    return found != std::end(needs) && !found->second;
+  };
+  std::vector<Action> hints;
+  std::remove_copy_if(tableHints().begin(), tableHints().end(), std::back_inserter(hints), isWithout);
+  return hints;
 }
 
 void Presenter::fillTable(Picture& picture, Clock::Instant now) {
@@ -82,7 +105,8 @@ std::string Presenter::dateBehind(std::string_view status, std::string_view date
   constexpr int kGap = 2;
   const std::string behind = std::string(kGap, ' ') + std::string(date);
   const int width = textWidth(status) + textWidth(behind);
-  return pathBar(width).text == pathBar(0).text && width + kBarMargin + kGap < size_.columns ? behind : std::string();
+  const bool fits = statusColumn(size_.columns, width) + width <= size_.columns - kBarMargin;
+  return fits && pathBar(width).text == pathBar(0).text ? behind : std::string();
 }
 
 std::chrono::milliseconds Presenter::driveTime() const {
@@ -113,7 +137,8 @@ void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Ins
     const std::string headline = surroundings_.headline(area, category);
     const std::string age = timeBound(ageOf(*arrivals, driveTime()), now);
     const std::string instead = technologyInstead(area, category);
-    const int room = rowTextEnd(regions().listColumns, line.hasDisclosure) - kRowGutter - textWidth(category) - kGap;
+    const int room = rowTextEnd(std::min(regions().listColumns, kWidestPair), line.hasDisclosure) - kRowGutter -
+                     textWidth(category) - kGap;
     std::string both = headline;
     if (!both.empty()) both += "  ";
     both += age;
@@ -125,19 +150,6 @@ void Presenter::addHeadlines(Picture& picture, std::string_view area, Clock::Ins
       break;
     }
   }
-}
-
-void Presenter::fillPane(Picture& picture) {
-  picture.hasPane = isPaneOpen_;
-  if (!isPaneOpen_ || surroundings_.diagnostics == nullptr) return;
-  scrollPane(0);
-  const auto& lines = surroundings_.diagnostics->lines();
-  picture.paneTotal = surroundings_.diagnostics->total();
-  picture.paneEnd = paneEnd_.value_or(picture.paneTotal);
-  const auto newer = static_cast<std::ptrdiff_t>(picture.paneTotal - picture.paneEnd);
-  const auto room = static_cast<std::ptrdiff_t>(std::max(regions().pane.count() - 1, 0));
-  const auto end = lines.end() - newer;
-  picture.paneLines.assign(end - std::min(room, end - lines.begin()), end);
 }
 
 }  // namespace vesk

@@ -5,6 +5,7 @@
 
 #include "terminal/device/column_width.h"
 #include "terminal/input/key_bindings.h"
+#include "terminal/view/wrapping.h"
 #include "values/text_form.h"
 
 namespace vesk {
@@ -20,7 +21,9 @@ std::vector<HelpLine> makeHelp() {
   std::vector<HelpLine> help;
   for (const KeyBinding& binding : keyBindings())
     help.push_back({namesOf(binding), binding.help});
-  help.push_back({"click", "select and open a row; on the path: go back"});
+  for (const TypingBinding& binding : typingBindings())
+    help.push_back({std::string(binding.name), binding.help});
+  help.push_back({"click", "select and open a row; on the path: go back; on the scroll bar: go there"});
   help.push_back({"wheel, drag", "scroll"});
   return help;
 }
@@ -30,11 +33,31 @@ const std::vector<HelpLine>& help() {
   return lines;
 }
 
+/// Where the meanings start.
+int helpIndent() {
+  int keysWidth = 0;
+  for (const HelpLine& each : help())
+    keysWidth = std::max(keysWidth, textWidth(each.keys));
+  return kRowGutter + keysWidth + 2;
+}
+
+/// The help with its meanings wrapped; the keys stand at the first line of theirs.
+std::vector<HelpLine> helpLines(int columns) {
+  std::vector<HelpLine> lines;
+  for (const HelpLine& each : help()) {
+    const std::size_t first = lines.size();
+    for (const std::string_view line : wrapText(each.meaning, columns - helpIndent()))
+      lines.push_back({{}, line});
+    lines[first].keys = each.keys;
+  }
+  return lines;
+}
+
 /// Draws one picture into one grid.
 class Renderer {
  public:
   explicit Renderer(const Picture& picture)
-      : picture_(picture), regions_(Regions::of(picture.size, picture.hasPane)), grid_(picture.size) {}
+      : picture_(picture), regions_(Regions::of(picture.size, picture.paneHeight)), grid_(picture.size) {}
 
   Grid run() {
     if (width() < kSmallestSize.columns || picture_.size.lines < kSmallestSize.lines) {
@@ -120,7 +143,8 @@ class Renderer {
       aside = Role::Selected;
       grid_.fill(0, line, Role::Selected, regions_.listColumns);
     }
-    const int end = rowTextEnd(regions_.listColumns, row.hasDisclosure);
+    const int columns = row.hasDisclosure ? std::min(regions_.listColumns, kWidestPair) : regions_.listColumns;
+    const int end = rowTextEnd(columns, row.hasDisclosure);
     if (row.isFirstOfRow && row.isChanged) grid_.write(0, line, "•", value, end);
     if (row.isFirstOfRow && row.hasDisclosure) grid_.write(end + 1, line, "›", name, end + 2);
     if (row.text.valueIndent) {
@@ -158,10 +182,8 @@ class Renderer {
     const ScrollExtent& extent = picture_.extent;
     if (extent.total <= extent.shown) return;
     const int height = regions_.list.count();
-    const int thumb = std::max(height * extent.shown / extent.total, 1);
-    const int travel = height - thumb;
-    const int hidden = extent.total - extent.shown;
-    const int start = std::clamp((travel * extent.before + hidden / 2) / hidden, 0, travel);
+    const int thumb = extent.thumb(height);
+    const int start = extent.thumbStart(height);
     for (int line = 0; line < height; ++line) {
       const bool isThumb = start <= line && line < start + thumb;
       grid_.write(regions_.listColumns, regions_.list.start + line, isThumb ? "█" : "│", Role::Faint, width());
@@ -169,14 +191,12 @@ class Renderer {
   }
 
   void drawHelp() {
-    int keysWidth = 0;
-    for (const HelpLine& each : help())
-      keysWidth = std::max(keysWidth, textWidth(each.keys));
     int line = regions_.list.start;
-    for (auto index = static_cast<std::size_t>(*picture_.helpStart); index < help().size() && line < regions_.list.end;
+    const std::vector<HelpLine> lines = helpLines(width());
+    for (auto index = static_cast<std::size_t>(*picture_.helpStart); index < lines.size() && line < regions_.list.end;
          ++index, ++line) {
-      grid_.write(kRowGutter, line, help()[index].keys, Role::Key, width());
-      writeCut(kRowGutter + keysWidth + 2, line, help()[index].meaning, Role::Plain, width());
+      grid_.write(kRowGutter, line, lines[index].keys, Role::Key, width());
+      grid_.write(helpIndent(), line, lines[index].meaning, Role::Plain, width());
     }
   }
 
@@ -185,15 +205,15 @@ class Renderer {
     int line = regions_.pane.start;
     grid_.fill(0, line, Role::PaneHeader, width());
     std::string count;
-    if (picture_.paneEnd < picture_.paneTotal) {
-      appendDecimal(count, picture_.paneEnd);
+    if (picture_.pane.end < picture_.pane.total) {
+      appendDecimal(count, picture_.pane.end);
       count += " of ";
     }
-    appendDecimal(count, picture_.paneTotal);
-    count += picture_.paneTotal == 1 ? " line" : " lines";
+    appendDecimal(count, picture_.pane.total);
+    count += picture_.pane.total == 1 ? " line" : " lines";
     grid_.write(kBarMargin, line, "Diagnostics", Role::PaneHeader, width());
     grid_.write(width() - kBarMargin - textWidth(count), line, count, Role::PaneHeader, width());
-    for (const std::string_view each : picture_.paneLines)
+    for (const std::string_view each : picture_.pane.lines)
       writeCut(kBarMargin, ++line, each, Role::Plain, width());
   }
 
@@ -206,7 +226,7 @@ class Renderer {
     }
     if (picture_.isTypingFilter || !picture_.filter.empty()) {
       column = grid_.write(column, line, "/", Role::Prompt, width());
-      column = writeCut(column, line, picture_.filter, Role::Prompt, width() / 2);
+      column = grid_.write(column, line, endOf(picture_.filter, width() / 2 - column), Role::Prompt, width() / 2);
       if (picture_.isTypingFilter) {
         column = grid_.write(column, line, "▏", Role::Prompt, width()) + 1;
         column = drawHint(column, "Enter", "keep");
@@ -219,6 +239,14 @@ class Renderer {
       const KeyBinding& binding = bindingOf(action);
       column = drawHint(column, nameOf(*binding.keys.begin()), binding.hint);
     }
+  }
+
+  /// As much of the end of `text` as fits, where one types, with an ellipsis before it.
+  static std::string endOf(std::string_view text, int columns) {
+    if (textWidth(text) <= columns) return std::string(text);
+    while (textWidth(text) >= columns)
+      takeGlyph(text);
+    return "…" + std::string(text);
   }
 
   /// The column after the hint, or the width when it did not fit and nothing after it shall.
@@ -236,15 +264,17 @@ class Renderer {
 
 }  // namespace
 
-Regions Regions::of(Size size, bool hasPane) {
+Regions Regions::of(Size size, PaneHeight height) {
   constexpr int kSmallestPane = 3;
-  constexpr int kTallestPane = 12;
+  constexpr int kTallestThird = 12;
   Regions regions;
   regions.hints = size.lines - 1;
-  const int paneHeight = hasPane ? std::clamp(size.lines / 3, kSmallestPane, kTallestPane) : 0;
+  const int third = std::clamp(size.lines / 3, kSmallestPane, kTallestThird);
+  const int paneHeight =
+      height == PaneHeight::Half ? std::max(size.lines / 2, third) : (height == PaneHeight::Third ? third : 0);
   regions.pane = {regions.hints - paneHeight, regions.hints};
   regions.list = {regions.title + 1, regions.pane.start};
-  regions.listColumns = std::min(size.columns - 1, kWidestList);
+  regions.listColumns = size.columns - 1;
   return regions;
 }
 
@@ -258,8 +288,8 @@ Grid render(const Picture& picture) {
   return Renderer(picture).run();
 }
 
-int helpLineCount() {
-  return static_cast<int>(help().size());
+int helpLineCount(int columns) {
+  return static_cast<int>(helpLines(columns).size());
 }
 
 }  // namespace vesk

@@ -8,7 +8,7 @@ namespace vesk {
 /// Draws a picture. Below the smallest size it only says that the terminal is too small.
 [[nodiscard]] Grid render(const Picture& picture);
 
-/// The lines that the whole help takes.
-[[nodiscard]] int helpLineCount();
+/// The lines that the whole help takes on a terminal that wide.
+[[nodiscard]] int helpLineCount(int columns);
 
 }  // namespace vesk

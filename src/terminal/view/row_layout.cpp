@@ -29,7 +29,7 @@ bool fitsBesideItsName(std::string_view name, std::string_view value, int width)
 std::optional<int> valueEndBesideReadings(int columns) {
   constexpr int kNarrowest = 64;
   if (columns < kNarrowest) return std::nullopt;
-  const int end = rowTextEnd(columns, false);
+  const int end = rowTextEnd(std::min(columns, kWidestPair), false);
   return end - end * 2 / 5 - kRowGap;
 }
 

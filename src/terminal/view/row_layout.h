@@ -35,6 +35,12 @@ struct RowLine {
   std::optional<int> valueEnd{};
   /// The row has more text than lines.
   bool isCut = false;
+
+  [[nodiscard]] RowLine withoutReading() const {
+    RowLine line = *this;
+    line.reading = {};
+    return line;
+  }
 };
 
 /// The columns before a row's texts, where the mark of a change stands.
@@ -45,6 +51,8 @@ inline constexpr int kRowGutter = 2;
 }
 
 inline constexpr int kRowGap = 2;
+/// A value further from its name would be torn from it; long values and readings take the columns beyond.
+inline constexpr int kWidestPair = 100;
 /// Where values end in a list that has a column of readings too; absent in one that is too narrow for it.
 [[nodiscard]] std::optional<int> valueEndBesideReadings(int columns);
 

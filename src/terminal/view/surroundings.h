@@ -36,6 +36,8 @@ struct Arrivals {
   /// In the drive's time; absent before the first.
   std::optional<std::chrono::milliseconds> last{};
   std::uint64_t count = 0;
+  /// It came, but never with the list that the screen shows.
+  bool isWithoutList = false;
 };
 
 /// What the terminal shows besides the screens, and whom it tells. Every member is optional; all are called
@@ -71,6 +73,8 @@ struct Surroundings {
   /// While true, the user holds a list with the mouse: timers of the default mode wait.
   std::function<void(bool)> setTracking{};
   std::function<void()> quit{};
+  /// Says a line to the user before the terminal is taken over.
+  std::function<void(const std::string& line)> warn{};
   /// The program was stopped (true) and goes on (false).
   std::function<void(bool)> setInBackground{};
 };

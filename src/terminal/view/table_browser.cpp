@@ -23,7 +23,10 @@ void TableBrowser::setViewport(Size size) {
 }
 
 void TableBrowser::follow() {
-  if (!isFrozen_ && content_.follow()) rebuild();
+  if (isFrozen_ || !content_.follow()) return;
+  rebuild();
+  // Other rows may pass the filter now.
+  if (!filter_.empty() && !isSelectionInView()) showSelection();
 }
 
 void TableBrowser::setFrozen(bool isFrozen) {
@@ -48,8 +51,9 @@ void TableBrowser::rebuild() {
     const std::size_t start = entries_.size();
     if (content_.header(section)) entries_.push_back({{section, 0}, false});
     const std::size_t firstRow = entries_.size();
+    const bool isWanted = filter_.empty() || contains(content_.header(section), filter_);
     for (std::size_t row = 0; row < content_.rowCount(section); ++row) {
-      if (passesFilter({section, row})) entries_.push_back({{section, row}, true});
+      if (isWanted || passesFilter({section, row})) entries_.push_back({{section, row}, true});
     }
     if (!filter_.empty() && entries_.size() == firstRow) entries_.resize(start);
   }
@@ -69,7 +73,6 @@ void TableBrowser::rebuild() {
 }
 
 bool TableBrowser::passesFilter(IndexPath at) {
-  if (filter_.empty()) return true;
   const RowContent& row = content_.row(at);
   return contains(row.main, filter_) || contains(row.detail, filter_);
 }
@@ -136,6 +139,13 @@ void TableBrowser::showSelection() {
   clampTop();
 }
 
+/// Whether some of the selected row is.
+bool TableBrowser::isSelectionInView() {
+  const std::size_t selected = selectedEntry();
+  return selected == entries_.size() ||
+         (top_ < moved({selected, height(selected)}, 0) && Position{selected, 0} < moved(top_, size_.lines));
+}
+
 /// After scrolling: when nothing of the selected row shows, the row nearest to it of those that show.
 void TableBrowser::keepSelectionInView() {
   const std::size_t selected = selectedEntry();
@@ -180,10 +190,32 @@ void TableBrowser::selectLast() {
   clampTop();
 }
 
+void TableBrowser::selectNextSection() {
+  const std::size_t section = selection_ ? selection_->section : 0;
+  const auto next = std::find_if(entries_.begin(), entries_.end(),
+                                 [&](const Entry& each) { return each.isRow && each.at.section > section; });
+  if (next == entries_.end()) return selectFirst();
+  select(static_cast<std::size_t>(next - entries_.begin()));
+  showSelection();
+}
+
 void TableBrowser::scroll(int lines) {
   top_ = moved(top_, lines);
   clampTop();
   keepSelectionInView();
+}
+
+void TableBrowser::scrollTo(int line, int height) {
+  const ScrollExtent extent = scrollExtent();
+  const int hidden = extent.total - extent.shown;
+  if (hidden <= 0) return;
+  const int thumb = extent.thumb(height);
+  const int travel = height - thumb;
+  const int start = std::clamp(line - thumb / 2, 0, travel);
+  // At the ends all of the list counts, since heights may be estimates.
+  constexpr int kWhole = 1 << 30;
+  const int between = travel > 0 ? start * hidden / travel - extent.before : 0;
+  scroll(start == 0 ? -kWhole : (start == travel ? kWhole : between));
 }
 
 void TableBrowser::page(int direction) {
@@ -209,8 +241,13 @@ bool TableBrowser::selectLine(int line) {
 }
 
 std::vector<ListLine> TableBrowser::lines(bool withReadings) {
-  const std::optional<int> valueEnd =
-      withReadings && content_.hasReadings() ? valueEndBesideReadings(size_.columns) : std::nullopt;
+  withReadings = withReadings && content_.hasReadings();
+  std::optional<int> valueEnd;
+  if (withReadings) {
+    valueEnd = valueEndBesideReadings(size_.columns);
+  } else if (size_.columns > kWidestPair) {
+    valueEnd = rowTextEnd(kWidestPair, false);
+  }
   std::vector<ListLine> lines;
   std::size_t entry = top_.entry;
   for (int skipped = top_.line; entry < entries_.size(); ++entry, skipped = 0) {
@@ -225,7 +262,7 @@ std::vector<ListLine> TableBrowser::lines(bool withReadings) {
     const std::vector<RowLine> rowLines = layOutRow(row, size_.columns, valueEnd);
     const std::size_t end = std::min(rowLines.size(), static_cast<std::size_t>(skipped) + room);
     for (auto index = static_cast<std::size_t>(skipped); index < end; ++index) {
-      lines.push_back({.text = rowLines[index],
+      lines.push_back({.text = withReadings ? rowLines[index] : rowLines[index].withoutReading(),
                        .isFirstOfRow = index == 0,
                        .isSelected = selection_ == at,
                        .isChanged = row.isChanged,

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <optional>
 #include <string>
@@ -31,6 +32,14 @@ struct ScrollExtent {
   int before = 0;
   int shown = 0;
   int total = 0;
+
+  /// The lines of the thumb on a bar of `height` lines, and the first of them. There must be more than shows.
+  [[nodiscard]] int thumb(int height) const { return std::max(height * shown / total, 1); }
+  [[nodiscard]] int thumbStart(int height) const {
+    const int travel = height - thumb(height);
+    const int hidden = total - shown;
+    return std::clamp((travel * before + hidden / 2) / hidden, 0, travel);
+  }
 };
 
 /// A way through one screen's table: what of it shows in a viewport, which row is selected, which rows pass a
@@ -50,7 +59,7 @@ class TableBrowser {
   [[nodiscard]] std::uint64_t reloadCount() const { return content_.reloadCount(); }
   void setFrozen(bool isFrozen);
   [[nodiscard]] bool isFrozen() const { return isFrozen_; }
-  /// Shows only rows whose name or value has `filter` in it, in either case; all when empty.
+  /// Shows only rows whose name, value or section header has `filter` in it, in either case; all when empty.
   void setFilter(std::string filter);
   [[nodiscard]] const std::string& filter() const { return filter_; }
 
@@ -58,8 +67,12 @@ class TableBrowser {
   void moveSelection(int step);
   void selectFirst();
   void selectLast();
+  /// The first row after the next header; after the last header, the first row.
+  void selectNextSection();
   /// By lines; the selection stays within what shows.
   void scroll(int lines);
+  /// So that the thumb of a scroll bar of `height` lines is around the bar's `line`, which may lie beyond its ends.
+  void scrollTo(int line, int height);
   /// By almost a viewport; at an end, to the last or first row.
   void page(int direction);
 
@@ -100,6 +113,7 @@ class TableBrowser {
   void select(std::size_t entry);
   void clampTop();
   void showSelection();
+  [[nodiscard]] bool isSelectionInView();
   void keepSelectionInView();
 
   TableViewController& screen_;
