@@ -65,7 +65,7 @@ class Reading {
     if (!parsed) return tell(parsed.error().source().begin.line, std::string(parsed.error().description()));
     for (const auto& [key, value] : parsed.table()) {
       const auto* known =
-          std::find_if(kKeys.begin(), kKeys.end(), [&](const Key& each) { return each.name == key.str(); });
+          std::find_if(kKeys.begin(), kKeys.end(), [name = key.str()](const Key& each) { return each.name == name; });
       if (known != kKeys.end()) {
         (this->*known->take)(value);
       } else {

@@ -213,9 +213,9 @@ void TableBrowser::scrollTo(int line, int height) {
   const int travel = height - thumb;
   const int start = std::clamp(line - thumb / 2, 0, travel);
   // At the ends all of the list counts, since heights may be estimates.
-  constexpr int kWhole = 1 << 30;
+  constexpr int kAll = 1 << 30;
   const int between = travel > 0 ? start * hidden / travel - extent.before : 0;
-  scroll(start == 0 ? -kWhole : (start == travel ? kWhole : between));
+  scroll(start == 0 ? -kAll : (start == travel ? kAll : between));
 }
 
 void TableBrowser::page(int direction) {
