@@ -75,18 +75,18 @@ TEST(Frame, IsDamagedOrNot) {
       {"", {}},
   };
   for (const Case& row : cases) {
-    for (const std::size_t pieceSize : {1, 2, 100})
+    for (const std::size_t pieceSize : {1U, 2U, 100U})
       EXPECT_EQ(readFrames(bytesOf(row.bytes), pieceSize), row.read) << row.bytes;
   }
 }
 
 TEST(Frame, IsNoLongerThanIsKept) {
-  for (const std::size_t excess : {0, 1, 1'000'000}) {
+  for (const std::size_t excess : {0U, 1U, 1'000'000U}) {
     Bytes bytes = frameOf(Bytes(kLongestFrame - kChecksumSize + excess, 0x11));
     ASSERT_EQ(bytes.size(), kLongestFrame + excess + 1);
     const Bytes next = frameOf({0});
     bytes.insert(bytes.end(), next.begin(), next.end());
-    for (const std::size_t pieceSize : {1000, 10'000'000}) {
+    for (const std::size_t pieceSize : {1000U, 10'000'000U}) {
       const Read read = readFrames(bytes, pieceSize);
       ASSERT_EQ(read.size(), 2U);
       EXPECT_EQ(read[0] == "damaged", excess > 0) << excess;

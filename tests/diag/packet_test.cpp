@@ -89,7 +89,7 @@ TEST(PacketList, EndsWithTheFirstDamage) {
   };
   for (const auto& row : cases) {
     const Bytes bytes = bytesOf(row.bytes);
-    for (const std::size_t pieceSize : {1, 5, 16, 100}) {
+    for (const std::size_t pieceSize : {1U, 5U, 16U, 100U}) {
       std::string read;
       PacketListReader reader;
       for (std::size_t begin = 0; begin < bytes.size(); begin += pieceSize) {
