@@ -40,7 +40,8 @@ class TerminalLanguage {
     bool isUsual;
   };
   static constexpr std::array kModes{Mode{"?1049", false}, Mode{"?25", true},    Mode{"?7", true},
-                                     Mode{"?1002", false}, Mode{"?1006", false}, Mode{"?12", false}};
+                                     Mode{"?1002", false}, Mode{"?1006", false}, Mode{"?2004", false},
+                                     Mode{"?12", false}};
   static constexpr std::size_t kKept = 200;
 
   static std::size_t indexOf(const Mode& mode) { return static_cast<std::size_t>(&mode - kModes.data()); }
