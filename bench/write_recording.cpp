@@ -20,7 +20,7 @@ int main(int argc, char** argv) {
   std::string line;
   for (const Event& event : corpus.events()) {
     line.clear();
-    appendRecordedEvent(line, {event.at, event.kind->metricId, event.payload});
+    vesk::appendRecordedEvent(line, {event.at, event.kind->metricId, event.payload});
     std::fputs(line.c_str(), stdout);
   }
   if (std::fflush(stdout) != 0) stop("the recording cannot be written");
