@@ -77,7 +77,11 @@ class ByteInput::Unpacking {
       const int status = inflate(&stream_, Z_NO_FLUSH);
       if (status == Z_BUF_ERROR) break;
       if (status == Z_MEM_ERROR) throw std::bad_alloc();
-      if (status != Z_OK && status != Z_STREAM_END) return std::nullopt;
+      if (status != Z_OK && status != Z_STREAM_END) {
+        // It fails again at the next call: what stands before the damage goes first.
+        if (stream_.avail_out < place.size()) break;
+        return std::nullopt;
+      }
       isBetweenMembers_ = status == Z_STREAM_END;
     }
     return place.size() - stream_.avail_out;
@@ -201,6 +205,7 @@ bool ByteInput::rewind() {
   taken_ = 0;
   hasBegun_ = false;
   unpacking_.reset();
+  failure_.reset();
   return true;
 }
 
