@@ -31,7 +31,7 @@ class RunLoop {
 
   /// Serves until stop() is called. The lines of the output are flushed before every sleep.
   void run();
-  /// Makes run(), or the next run(), return. From any thread, and from a signal handler.
+  /// Makes run(), or the next run(), return. From any thread.
   void stop() noexcept;
   /// Serves all that is due, until nothing is, without sleeping.
   void runDue();

@@ -10,7 +10,6 @@ namespace vesk {
 namespace {
 
 /// Looked up beforehand: a handler may not.
-RunLoop* mainLoop = nullptr;
 const WakeUp* stopRequest = nullptr;
 
 }  // namespace
@@ -18,12 +17,11 @@ const WakeUp* stopRequest = nullptr;
 const WakeUp& stopMainLoopOnSignals() {
   static const WakeUp theRequest;
   stopRequest = &theRequest;
-  mainLoop = &RunLoop::main();
+  RunLoop& loop = RunLoop::main();
+  // Not by the handler itself: on another thread it could still be at it when the loop has ended.
+  loop.addInput(theRequest.descriptor(), [&loop] { loop.stop(); });
   struct sigaction action {};
-  action.sa_handler = [](int /*signal*/) {
-    stopRequest->signal();
-    mainLoop->stop();
-  };
+  action.sa_handler = [](int /*signal*/) { stopRequest->signal(); };
   action.sa_flags = SA_RESTART;
   for (const int signal : {SIGINT, SIGTERM, SIGHUP})
     sigaction(signal, &action, nullptr);
