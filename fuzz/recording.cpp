@@ -26,6 +26,12 @@ void checkDuration(std::string_view content, const Outcomes& outcomes) {
 }
 
 void checkRecording(std::string_view content, std::size_t longestLine, std::size_t pieceSize) {
+  if (content.starts_with("\x1F\x8B\x08")) {
+    // Compressed: what its lines are is known to the reader alone.
+    require(readPipe(content, longestLine, pieceSize) == readFile(content, longestLine),
+            "the pieces in which a compressed recording comes do not matter");
+    return;
+  }
   const Outcomes expected = expectedOutcomes(content, longestLine);
   require(readFile(content, longestLine) == expected, "each line has one outcome, whatever stands around it");
   require(readPipe(content, longestLine, pieceSize) == expected, "the pieces in which a recording comes do not matter");
