@@ -1,8 +1,9 @@
 #include "app/command_options.h"
 
-#include <charconv>
 #include <cmath>
 #include <string>
+
+#include "values/parse_number.h"
 
 namespace vesk {
 
@@ -14,10 +15,8 @@ bool parseSpeed(const std::string& text, std::optional<double>& speed) {
     speed.reset();
     return true;
   }
-  double number = 0;
-  const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
-  const bool isWhole = result.ec == std::errc{} && result.ptr == text.data() + text.size();
-  if (!isWhole || !std::isfinite(number) || number <= 0) return false;
+  const auto number = parseNumber<double>(text);
+  if (!number || !std::isfinite(*number) || *number <= 0) return false;
   speed = number;
   return true;
 }
@@ -26,10 +25,8 @@ bool parseSpeed(const std::string& text, std::optional<double>& speed) {
 
 CLI::Validator secondsFrom(double least) {
   const auto reasonAgainst = [least](const std::string& text) -> std::string {
-    double seconds = 0;
-    const auto result = std::from_chars(text.data(), text.data() + text.size(), seconds);
-    const bool isWhole = result.ec == std::errc{} && result.ptr == text.data() + text.size();
-    if (isWhole && seconds >= least && seconds <= 1e9) return "";
+    const auto seconds = parseNumber<double>(text);
+    if (seconds && *seconds >= least && *seconds <= 1e9) return "";
     return "expected a number of seconds, got " + text;
   };
   return {reasonAgainst, ""};
@@ -37,10 +34,7 @@ CLI::Validator secondsFrom(double least) {
 
 void addSimOption(CLI::App& command, std::optional<std::uint32_t>& sim) {
   const auto reasonAgainst = [](const std::string& text) -> std::string {
-    std::uint32_t number = 0;
-    const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
-    const bool isWhole = result.ec == std::errc{} && result.ptr == text.data() + text.size();
-    return isWhole && number > 0 ? "" : "expected a SIM's number, from 1, got " + text;
+    return parseNumber<std::uint32_t>(text).value_or(0) > 0 ? "" : "expected a SIM's number, from 1, got " + text;
   };
   command.add_option("--sim", sim, "Take one SIM's packets only, from 1: of a port or a capture")
       ->type_name("N")

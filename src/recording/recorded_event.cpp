@@ -6,6 +6,7 @@
 
 #include "recording/hex.h"
 #include "values/ascii.h"
+#include "values/parse_number.h"
 #include "values/text_form.h"
 #include "values/utf8.h"
 
@@ -90,13 +91,13 @@ class RecordedEventParser::Fields : public rapidjson::BaseReaderHandler<rapidjso
 
   bool RawNumber(const char* text, rapidjson::SizeType length, bool /*copy*/) {
     if (key_ == Name::at) {
-      at = number<double>({text, length});
+      at = parseNumber<double>({text, length});
       if (!at) return Default();
       if (*at > kLatest) return parser_.fail("\"at\": expected at most a billion seconds");
       return *at >= 0 || parser_.fail("\"at\": expected seconds that are not negative");
     }
     if (key_ == Name::metric) {
-      metricId = number<std::int64_t>({text, length});
+      metricId = parseNumber<std::int64_t>({text, length});
       return metricId || Default();
     }
     return Default();
@@ -124,14 +125,6 @@ class RecordedEventParser::Fields : public rapidjson::BaseReaderHandler<rapidjso
 
  private:
   enum class Name { at, metric, payload, other };
-
-  template <class Number>
-  static std::optional<Number> number(std::string_view text) {
-    Number number{};
-    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
-    if (error != std::errc{} || end != text.data() + text.size()) return std::nullopt;
-    return number;
-  }
 
   bool enter() {
     if (!Default()) return false;

@@ -6,7 +6,7 @@
 
 #include "app/commands/suggestion.h"
 #include "app/output/data_output.h"
-#include "app/source/road.h"
+#include "app/source/play_recording.h"
 #include "screens/vesk_view_items.h"
 #include "terminal/device/column_width.h"
 #include "toolkit/interface_layout.h"

@@ -1,7 +1,7 @@
 #include "app/commands/stores_command.h"
 
 #include "app/output/data_output.h"
-#include "app/source/road.h"
+#include "app/source/play_recording.h"
 #include "intake/metric_validator.h"
 #include "values/json_form.h"
 

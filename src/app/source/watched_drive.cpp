@@ -1,6 +1,6 @@
 #include "app/source/watched_drive.h"
 
-#include "app/source/road.h"
+#include "app/source/play_recording.h"
 #include "system/run_loop.h"
 
 namespace vesk {

@@ -2,7 +2,8 @@
 
 #include <algorithm>
 #include <array>
-#include <charconv>
+
+#include "values/parse_number.h"
 
 namespace vesk {
 
@@ -35,9 +36,7 @@ constexpr std::array<std::string_view, 8> kColors{"black", "red",     "green", "
 std::optional<std::uint8_t> colorNamed(std::string_view word) {
   if (const auto* named = std::find(kColors.begin(), kColors.end(), word); named != kColors.end())
     return static_cast<std::uint8_t>(named - kColors.begin());
-  std::uint8_t number = 0;
-  const auto [end, error] = std::from_chars(word.data(), word.data() + word.size(), number);
-  return error == std::errc{} && end == word.data() + word.size() ? std::optional(number) : std::nullopt;
+  return parseNumber<std::uint8_t>(word);
 }
 
 /// Takes the first word off; empty when there is none.

@@ -1,6 +1,6 @@
 #include "terminal/device/palette.h"
 
-#include <charconv>
+#include "values/parse_number.h"
 
 namespace vesk {
 
@@ -156,12 +156,11 @@ Palette makePalette(ColorDepth depth, Background background) {
 
 Background backgroundOf(std::string_view colorfgbg) {
   const std::string_view last = colorfgbg.substr(colorfgbg.rfind(';') + 1);
-  int number = 0;
-  const auto [end, error] = std::from_chars(last.data(), last.data() + last.size(), number);
-  if (error != std::errc{} || end != last.data() + last.size() || number > 15) return Background::Unknown;
+  const auto number = parseNumber<int>(last);
+  if (!number || *number > 15) return Background::Unknown;
   constexpr int kGrey = 8;
   constexpr int kWhite = 7;
-  return number < kWhite || number == kGrey ? Background::Dark : Background::Light;
+  return *number < kWhite || *number == kGrey ? Background::Dark : Background::Light;
 }
 
 ColorDepth colorDepthOf(int colors, std::string_view noColor) {

@@ -38,7 +38,7 @@ void checkScreen(NavigationController& root, std::size_t area, std::size_t categ
   requireDrawable(desk.grid(), size);
 }
 
-void checkRoad(Payload events, std::size_t screen, Size size) {
+void checkPipeline(Payload events, std::size_t screen, Size size) {
   RecordedOutput output;
   ConnectedProgram program;
   const int status = program.run([&](NavigationController& root) {
@@ -62,6 +62,6 @@ void checkRoad(Payload events, std::size_t screen, Size size) {
 int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   static const bool kIsInUtc = setenv("TZ", "UTC", 1) == 0;
   if (size < 3 || !kIsInUtc) return 0;
-  vesk::checkRoad({data + 3, size - 3}, data[0], {data[1] % 130, data[2] % 60});
+  vesk::checkPipeline({data + 3, size - 3}, data[0], {data[1] % 130, data[2] % 60});
   return 0;
 }

@@ -22,9 +22,9 @@ namespace {
 
 using namespace metrics;
 
-class Road : public testing::Test {
+class Pipeline : public testing::Test {
  protected:
-  Road() {
+  Pipeline() {
     setenv("TZ", "UTC", 1);
     tzset();
   }
@@ -47,7 +47,7 @@ std::string connected() {
   return rrcState(1, 1500, LteRrcState::KLTE_RRC_STATE_CONNECTED);
 }
 
-TEST_F(Road, PrintsTheLinesOfEveryEvent) {
+TEST_F(Pipeline, PrintsTheLinesOfEveryEvent) {
   KCellularLteScellInfo cell;
   cell.setDlBw(7);
   cell.setUlBw(1);
@@ -65,7 +65,7 @@ TEST_F(Road, PrintsTheLinesOfEveryEvent) {
   EXPECT_EQ(finished.status, 0);
 }
 
-TEST_F(Road, FillsTheStoresUpToTheLastEvent) {
+TEST_F(Pipeline, FillsTheStoresUpToTheLastEvent) {
   const auto carrier = std::make_shared<SecondaryComponentCarrier>();
   carrier->setRsrp(-785);
   carrier->setRsrq(-50);
@@ -99,7 +99,7 @@ TEST_F(Road, FillsTheStoresUpToTheLastEvent) {
   EXPECT_EQ(finished.status, 0);
 }
 
-TEST_F(Road, GoesOnBehindLinesThatAreNoEventAndTellsTheUser) {
+TEST_F(Pipeline, GoesOnBehindLinesThatAreNoEventAndTellsTheUser) {
   const TemporaryFile recording("{}\nbad\n" + connected());
   const std::string told = recording.path() + ":1: \"at\": missing\n" + recording.path() + ":2: no JSON object\n";
   struct Case {
@@ -123,7 +123,7 @@ TEST_F(Road, GoesOnBehindLinesThatAreNoEventAndTellsTheUser) {
   }
 }
 
-TEST_F(Road, ShowsWhatAnUnknownPairShowsAndTellsWhichThereAre) {
+TEST_F(Pipeline, ShowsWhatAnUnknownPairShowsAndTellsWhichThereAre) {
   struct Case {
     const char* area;
     const char* category;
@@ -150,7 +150,7 @@ TEST_F(Road, ShowsWhatAnUnknownPairShowsAndTellsWhichThereAre) {
   EXPECT_EQ(hostile.output.find('\x1B'), std::string::npos);
 }
 
-TEST_F(Road, TheSameSeedDrivesTheSameWay) {
+TEST_F(Pipeline, TheSameSeedDrivesTheSameWay) {
   const Finished drive = vesk({"simulate", "--seed", "4", "--seconds", "60"});
   EXPECT_EQ(vesk({"simulate", "--seed", "4", "--seconds", "60"}).output, drive.output);
   EXPECT_NE(vesk({"simulate", "--seed", "5", "--seconds", "60"}).output, drive.output);
@@ -194,7 +194,7 @@ std::map<std::string, std::string> everyScreen(NavigationController& root) {
   return screens;
 }
 
-TEST_F(Road, ADriveFillsEveryScreen) {
+TEST_F(Pipeline, ADriveFillsEveryScreen) {
   handset::Handset handset(4, 0);
   std::string drive;
   handset::recordDrive(handset, 120, [&drive](std::string_view line) {
@@ -226,7 +226,7 @@ TEST_F(Road, ADriveFillsEveryScreen) {
   });
 }
 
-TEST_F(Road, HeadlessEndsAfterItsTime) {
+TEST_F(Pipeline, HeadlessEndsAfterItsTime) {
   const Finished timed = vesk({"--headless", "--log", "none", "--seconds", "0.05"});
   EXPECT_TRUE(timed.output.starts_with(kStartLines)) << timed.output;
   EXPECT_EQ(timed.status, 0);

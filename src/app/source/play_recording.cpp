@@ -1,4 +1,4 @@
-#include "app/source/road.h"
+#include "app/source/play_recording.h"
 
 #include <chrono>
 #include <memory>
