@@ -33,7 +33,7 @@ ninja_in() {
   local preset=$1 options=(-C "$root/build/$1")
   shift
   NINJA_STATUS='[%p] ' ninja "${options[@]}" "$@" |
-    sed -u -e 's/^\[ *\([0-9]*\)%\] .*/compiling \1/; t' -e '/^ninja: Entering/d; /^ninja: build stopped/d; /^-- /d; w /dev/stderr' -e d |
+    sed -u -e 's/^\[ *\([0-9]*\)%\] .*/\1 compiling/; t' -e '/^ninja: Entering/d; /^ninja: build stopped/d; /^-- /d; w /dev/stderr' -e d |
     show_progress || die "the build failed (preset $preset); the compiler's messages stand above"
 }
 

@@ -24,11 +24,14 @@ quietly() {
   fi
 }
 
-# show_progress: reads lines "WHAT PERCENT" and tells standard error how far it is, on a terminal in a line that moves,
-# elsewhere at every quarter.
+# show_progress: reads lines "PERCENT WHAT" and tells standard error how far it is, on a terminal in a line that moves,
+# elsewhere at every quarter. What begins anew below what was told is no progress.
 show_progress() {
-  local what percent told='' quarter=-1
-  while read -r what percent; do
+  local what percent told='' quarter=-1 most=0
+  while read -r percent what; do
+    [[ $what == "$told" ]] || most=0
+    ((percent >= most)) || continue
+    most=$percent
     if [[ -t 2 ]]; then
       printf '\r%s: %s %d %%\e[K' "${0##*/}" "$what" "$percent" >&2
     elif [[ $what != "$told" ]] || ((percent / 25 > quarter)); then

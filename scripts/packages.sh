@@ -72,24 +72,37 @@ as_root() {
   fi
 }
 
-# apt_get WHAT ARGUMENT…: shows how far it is; its other output only when it fails.
+# apt_get WHAT LOG ARGUMENT…: shows how far it is; what it says otherwise goes to LOG.
 apt_get() {
-  local what=$1 log=$root/build/apt.log
-  shift
-  as_root env DEBIAN_FRONTEND=noninteractive apt-get --yes -qq -o APT::Status-Fd=1 -o DPkg::Lock::Timeout=600 "$@" 2>&1 |
-    tee "$log" | sed -nu "s/^dlstatus:[^:]*:\([0-9]*\).*/fetching \1/p; s/^pmstatus:[^:]*:\([0-9]*\).*/$what \1/p" |
-    show_progress || { grep -vE '^(dl|pm)status:' "$log" >&2 && return 1; }
+  local what=$1 log=$2
+  shift 2
+  as_root env DEBIAN_FRONTEND=noninteractive LC_ALL=C \
+    apt-get --yes -qq -o APT::Status-Fd=1 -o DPkg::Lock::Timeout=600 "$@" 2>&1 |
+    tee "$log" | sed -nu "s/^dlstatus:[^:]*:\([0-9]*\).*/\1 $what/p; s/^pmstatus:[^:]*:\([0-9]*\).*/\1 installing/p" |
+    show_progress
+}
+
+# is_out_of_reach LOG: whether apt-get could reach no mirror.
+is_out_of_reach() {
+  grep -qE 'Could not (resolve|connect)|Temporary failure resolving|Unable to connect|Network is unreachable' "$1"
 }
 
 install_packages() {
   command -v apt-get >/dev/null || die "these Debian packages are missing, and there is no apt-get: $*"
   ((EUID == 0)) || command -v sudo >/dev/null ||
     die "these Debian packages are missing; without sudo, root must install them: apt-get install $*"
+  ((EUID == 0)) || sudo -v ||
+    die "these Debian packages are missing; sudo was refused, root must install them: apt-get install $*"
   say "installing Debian packages: $*"
   # A mirror out of reach is no fault while the lists at hand suffice.
-  apt_get updating update || say "apt-get update failed; going on with the lists at hand"
-  apt_get installing install --no-install-recommends "$@" ||
-    die "the packages could not be installed: $*"
+  local lists=$root/build/apt-lists.log log=$root/build/apt.log
+  apt_get 'package lists' "$lists" update || true
+  apt_get fetching "$log" install --no-install-recommends "$@" && return
+  if is_out_of_reach "$lists" || is_out_of_reach "$log"; then
+    die "these Debian packages are missing, and no Debian mirror can be reached (is there a network?): $*"
+  fi
+  grep -hE '^[EW]: ' "$lists" "$log" >&2 || true
+  die "the packages could not be installed, see build/apt.log: $*"
 }
 
 # need_packages PURPOSE…: installs what is missing; two scripts at once wait for each other.

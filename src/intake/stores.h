@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <optional>
 #include <type_traits>
 
@@ -23,6 +24,14 @@ struct Stores {
 
   friend bool operator==(const Stores&, const Stores&) = default;
 };
+
+/// Whether an event of that metric was stored.
+[[nodiscard]] inline bool hasArrived(const Stores& stores, std::int64_t metric) {
+#define DECODED_METRIC(constant, identifier, Message, record) \
+  if (metric == (identifier)) return stores.record.has_value();
+#include "messages/registry/metrics.def"
+  return false;
+}
 
 /// Calls `visit(name, record)` for the latest record of each kind of metric, in the order of the table of metrics.
 template <SameButConst<Stores> S, class Visit>

@@ -147,6 +147,10 @@ TEST_F(Pipeline, ShowsWhatAnUnknownPairShowsAndTellsWhichThereAre) {
   bearers.bearerContextsAtIndex(0)->setApn(Text::copy("\x1B[2J"));
   const Finished hostile = vesk({"show", "LTE", "Active Bearers", "-"}, recorded(0, K_CELLULAR_ACTIVE_BEARER, bearers));
   EXPECT_NE(hostile.output.find("[2J"), std::string::npos) << hostile.output;
+  EXPECT_EQ(hostile.error, "");
+  const Finished unfilled = vesk({"show", "LTE", "Active Bearers", "-"},
+                                 recorded(0, K_CELLULAR_ACTIVE_BEARER, KCellularActivatedBearerContexts()));
+  EXPECT_EQ(unfilled.error, "vesk: what fills LTE, Active Bearers came, but without this list\n");
   EXPECT_EQ(hostile.output.find('\x1B'), std::string::npos);
 }
 

@@ -1,12 +1,15 @@
 #include "app/commands/show_command.h"
 
 #include <algorithm>
+#include <string>
 #include <string_view>
 #include <vector>
 
 #include "app/commands/suggestion.h"
 #include "app/output/data_output.h"
 #include "app/source/play_recording.h"
+#include "intake/metric_validator.h"
+#include "screens/category_sources.h"
 #include "screens/vesk_view_items.h"
 #include "terminal/device/column_width.h"
 #include "toolkit/interface_layout.h"
@@ -146,6 +149,14 @@ bool checkLabels(const ShowOptions& options) {
   return true;
 }
 
+/// A metric that came is looked for in vain where it has not filled the list.
+void tellMissingList(const ShowOptions& options) {
+  const Stores& stores = MetricValidator::shared()->stores;
+  const CategorySource& source = sourceOf(options.area, options.category);
+  if (source.metric && hasArrived(stores, *source.metric) && !isListFilled(source, stores))
+    tellUser("vesk: what fills " + options.area + ", " + options.category + " came, but without this list");
+}
+
 }  // namespace
 
 Outcome runShow(const ShowOptions& options) {
@@ -156,6 +167,7 @@ Outcome runShow(const ShowOptions& options) {
     openLabel(root, options.category);
     const std::vector<ShownSection> sections = sectionsOf(topTable(root).tableView());
     output.writeLine(options.asJson ? asJson(options, sections) : asText(options, sections));
+    tellMissingList(options);
   });
   if (outcome == Outcome::done && !areLabelsKnown) outcome = Outcome::wrongUsage;
   return output.finish(outcome);
