@@ -42,12 +42,14 @@ void Insight::take(const TakenEvent& event, const Stores& stores, std::uint64_t 
   if (passing->gap) {
     summary_.takeGap(*passing->gap);
     timeline_.forget();
+    details_.forget();
     heard_.forget();
     judge_.forget();
     step.add(EventKind::gap, *passing->gap);
   }
   const Report& report = reader_.read(*event.metricId, *event.record, stores);
   timeline_.take(report, step);
+  details_.take(report, timeline_.mobility(), moment.time);
   heard_.take(report, timeline_, moment.time);
   judge_.judge(timeline_.kpis(), moment, events_);
   summary_.take(report, events_, timeline_);

@@ -8,6 +8,7 @@
 
 #include "insight/drive_clock.h"
 #include "insight/heard_cells.h"
+#include "insight/serving_details.h"
 #include "insight/summary.h"
 #include "insight/timeline.h"
 #include "insight/trend.h"
@@ -36,6 +37,8 @@ class Present {
   [[nodiscard]] std::optional<std::int64_t> age(Kpi kpi) const { return timeline_.kpis().age(kpi, time()); }
   [[nodiscard]] std::vector<HeardCell> cellsHeard() const { return heard_.cells(timeline_, time()); }
 
+  [[nodiscard]] const ServingDetails& servingDetails() const { return details_; }
+
   /// The last events, oldest first.
   [[nodiscard]] const std::deque<Happening>& happenings() const { return happenings_; }
   /// How many there were before the first of these.
@@ -49,6 +52,7 @@ class Present {
   DriveClock clock_;
   EventCounts counts_;
   Timeline timeline_;
+  ServingDetails details_;
   HeardCells heard_;
   Trend trend_;
 

@@ -119,6 +119,11 @@ struct Report {
   std::vector<CarrierReport> carriers;
   std::optional<std::vector<Bearer>> bearers;
   std::optional<CdrxReport> cdrx;
+  std::optional<std::int64_t> transmissionMode;
+  /// Of the serving LTE cell's downlink, MHz.
+  std::optional<double> bandwidth;
+  /// The least level to stay on the LTE cell, dBm.
+  std::optional<double> leastLevel;
   std::optional<std::size_t> simFiles;
   std::vector<NeighborReport> neighbors;
 };

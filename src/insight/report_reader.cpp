@@ -23,6 +23,7 @@ constexpr std::array kReadings{
     MetricReading{K_LTE_TX_POWER, readLteTxPower},
     MetricReading{K_UMTS_TX_POWER, readUmtsTxPower},
     MetricReading{K_LTE_CDRX_CONFIG, readCdrx},
+    MetricReading{K_LTE_SEL_RESEL_INFO, readLteSelection},
     MetricReading{K_LTE_RRC_STATE, readLteRrcState},
     MetricReading{K_LTE_SCELL_INFO, readLteServingCell},
     MetricReading{K_LTE_CA_STATUS, readCarriers},
@@ -54,6 +55,9 @@ void clear(Report& report) {
   report.carriers.clear();
   report.bearers.reset();
   report.cdrx.reset();
+  report.transmissionMode.reset();
+  report.bandwidth.reset();
+  report.leastLevel.reset();
   report.simFiles.reset();
   report.neighbors.clear();
 }

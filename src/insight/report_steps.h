@@ -24,6 +24,7 @@ void readNeighborsOfUmts(Report& report, const Dictionary& record, const Stores&
 void readNeighborsOfGsm(Report& report, const Dictionary& record, const Stores& stores);
 void readGmmContext(Report& report, const Dictionary& record, const Stores& stores);
 void readBearers(Report& report, const Dictionary& record, const Stores& stores);
+void readLteSelection(Report& report, const Dictionary& record, const Stores& stores);
 void readCdrx(Report& report, const Dictionary& record, const Stores& stores);
 void readSimFiles(Report& report, const Dictionary& record, const Stores& stores);
 template <Registration registration>

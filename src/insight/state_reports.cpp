@@ -32,13 +32,21 @@ std::optional<CarrierState> carrierStateOf(const Dictionary& record) {
   return std::nullopt;
 }
 
-Number bandwidthOf(const Dictionary& record) {
+Number carrierBandwidthOf(const Dictionary& record) {
   constexpr std::array kCarrierBandwidths{1.4F, 3.0F, 5.0F, 10.0F, 15.0F, 20.0F};
   const Value* value = record.find("dl_bandwidth"_text);
   const std::optional<float> bandwidth = value == nullptr ? std::nullopt : value->exactFloat();
   const bool isPossible = bandwidth && std::find(kCarrierBandwidths.begin(), kCarrierBandwidths.end(), *bandwidth) !=
                                            kCarrierBandwidths.end();
   return isPossible ? Number(*bandwidth) : std::nullopt;
+}
+
+/// The serving cell's comes in whole MHz.
+Number bandwidthOf(const Dictionary& record) {
+  constexpr std::array kBandwidths{1, 3, 5, 10, 15, 20};
+  const Integer bandwidth = integerOf(record, "dl_bw"_text);
+  if (!bandwidth || std::find(kBandwidths.begin(), kBandwidths.end(), *bandwidth) == kBandwidths.end()) return {};
+  return *bandwidth == 1 ? 1.4 : static_cast<double>(*bandwidth);
 }
 
 }  // namespace
@@ -48,6 +56,7 @@ void readLteServingCell(Report& report, const Dictionary& record, const Stores& 
   report.servingCell = {Technology::lte,
                         {earfcnOf(record, "dl_freq"_text), pciOf(record, "phy_cell_id"_text),
                          integerIn(record, "cell_id"_text, 0, kLastCellIdentity)}};
+  report.bandwidth = bandwidthOf(record);
   readArea(report, Area::tracking, plmnOf(record, "sel_plmn_mcc"_text, "sel_plmn_mnc"_text),
            integerIn(record, "tracking_area_code"_text, 0, kLastAreaCode));
 }
@@ -106,7 +115,7 @@ void readCarriers(Report& report, const Dictionary& record, const Stores& stores
                                .state = carrierStateOf(each),
                                .channel = earfcnOf(each, "dl_earfcn"_text),
                                .code = pciOf(each, "pci"_text),
-                               .bandwidth = bandwidthOf(each),
+                               .bandwidth = carrierBandwidthOf(each),
                                .level = levelOf(kRsrp, each, "rsrp"_text),
                                .quality = levelOf(kRsrq, each, "rsrq"_text)});
     if (!level) level = report.carriers.back().level;
@@ -148,9 +157,15 @@ void readBearers(Report& report, const Dictionary& record, const Stores& stores)
   }
 }
 
+void readLteSelection(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+  const Integer code = integerIn(record, "QRxLevMin"_text, -70, -22);
+  if (code) report.leastLevel = 2.0 * static_cast<double>(*code);
+}
+
 void readCdrx(Report& report, const Dictionary& record, const Stores& /*stores*/) {
   if (const auto state = nameIn(record, "rrc_state"_text))
     report.rrc = {.technology = Technology::lte, .state = *state, .isMention = true};
+  report.transmissionMode = integerIn(record, "transmission_mode"_text, 1, 10);
   const Integer status = integerIn(record, "cdrx_config_status"_text, 0, 1);
   if (!status) return;
   report.cdrx = {*status == 1,

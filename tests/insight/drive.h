@@ -44,16 +44,24 @@ DriveEvent event(std::int64_t at, std::int64_t metricId, Fill fill) {
 
 using Part = std::optional<std::uint32_t>;
 
-inline DriveEvent lteCell(std::int64_t at, Part channel, Part code, Part cellId = {}, Part trackingArea = {}) {
+/// `bandwidth` is in units of 0.5 MHz.
+inline DriveEvent lteCell(std::int64_t at, Part channel, Part code, Part cellId = {}, Part trackingArea = {},
+                          Part bandwidth = {}) {
   return event<KCellularLteScellInfo>(at, K_LTE_SCELL_INFO, [=](auto& message) {
     if (channel) message.setDlFreq(*channel);
     if (code) message.setPhyCellId(*code);
     if (cellId) message.setCellId(*cellId);
+    if (bandwidth) message.setDlBw(*bandwidth);
     if (!trackingArea) return;
     message.setTrackingAreaCode(*trackingArea);
     message.setSelPlmnMcc(310);
     message.setSelPlmnMnc(410);
   });
+}
+
+inline DriveEvent lteSelection(std::int64_t at, std::int32_t leastLevelCode) {
+  return event<KCellularLteSelReselCellInfo>(at, K_LTE_SEL_RESEL_INFO,
+                                             [=](auto& message) { message.setQRxLevMin(leastLevelCode); });
 }
 
 inline DriveEvent lteRrc(std::int64_t at, LteRrcState state, std::optional<LteRrcCause> cause = {},
@@ -80,6 +88,7 @@ struct LteNeighbor {
   Part channel;
   Part code;
   std::int32_t rsrp;
+  Part rsrqCode{};
 };
 
 inline DriveEvent lteNeighbors(std::int64_t at, const std::vector<LteNeighbor>& neighbors) {
@@ -89,6 +98,7 @@ inline DriveEvent lteNeighbors(std::int64_t at, const std::vector<LteNeighbor>& 
       if (each.channel) cell->setNbrEarfcn(*each.channel);
       if (each.code) cell->setNbrPhysCellId(*each.code);
       cell->setNbrRsrp(each.rsrp + 140);
+      if (each.rsrqCode) cell->setNbrRsrq(*each.rsrqCode);
       message.addMeasNbrEutra(cell);
     }
   });

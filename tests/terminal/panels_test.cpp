@@ -21,12 +21,13 @@ std::vector<DriveEvent> smallDrive() {
       lteRrc(100, S::KLTE_RRC_STATE_CONNECTED),
       lteLevel(1000, -112, -15),
       lteNeighbors(1500, {{5815, 338, -104}, {2000, 62, -118}, {{}, 7, -120}}),
+      lteSelection(9900, -61),
       lteCell(10'000, 5815, 338, 48906257, 19980),
       lteLevel(11'000, -96, -9),
       emm(12'000, RegStatus::KREG_STATUS_NORMAL_SERVICE),
       lteRrc(20'000, S::KLTE_RRC_STATE_ATMPT_CONNECTION, C::KLTE_RRC_CAUSE_REEST_OTHER_FAIL),
       lteRrc(20'200, S::KLTE_RRC_STATE_CONNECTED, C::KLTE_RRC_CAUSE_REEST_OTHER_FAIL),
-      lteLevel(25'000, -88, -9),
+      lteLevel(25'000, -88, -9, 338),
   };
 }
 
@@ -89,14 +90,14 @@ TEST_F(PanelsTest, AnOrdinaryOverviewHasTrendAndEvents) {
 |│  RSRQ      -9 dB ███████████████░░░░░ good       60 s -15…-9                 │
 |│  SINR          – not reported                                                │
 |│  RRC CONNECTED 4.8 s   serves 15.0 s   age 0.0 s                             │
+|│  Srxlev +34 dB over QRxLevMin -122 dBm   measured PCI agrees                 │
 |│  next PCI 316 B17 5815, -112 dBm, -24 dB                                     │
 |├─ RSRP dBm, 2 min 24 s ───────────────────────────────────────────────────────┤
-|│  -90                                                                        ▃│
-|│  -95                                                                        █│
-|│ -100                                                                 ▆▆▆▆▆▆ █│
-|│ -105                                                                 ██████ █│
+|│  -80                                                                         │
+|│  -90                                                                        ▂│
+|│ -100                                                                 ▃▃▃▃▃▃ █│
 |│ -110                                                                 ██████ █│
-|│ -115                                                            ▅▅▅▅▅██████ █│
+|│ -120                                                            ▆▆▆▆▆██████ █│
 |│                                                                      C    R  │
 |├─ WHAT HAPPENED ──────────────────────────────────────────────────────────────┤
 |│ 21:53:00.200  reestablished  PCI 338 B17 5815 CI 48906257 -> PCI 338 B17 581…│
@@ -115,9 +116,9 @@ TEST_F(PanelsTest, WideOverviewsAreFilled) {
     Size size;
     std::string titles;
   } const cases[] = {
-      {{120, 40}, "1 SERVING, 1 CONNECTION, 9 RSRP dBm, 9 LAST 60 s, 18 CELLS HEARD, 27 WHAT HAPPENED, "},
-      {{200, 60}, "1 SERVING, 1 CONNECTION, 9 RSRP dBm, 9 LAST 60 s, 34 CELLS HEARD, 34 WHAT HAPPENED, "},
-      {{80, 50}, "1 SERVING, 9 CONNECTION, 16 RSRP dBm, 27 CELLS HEARD, 38 WHAT HAPPENED, "},
+      {{120, 40}, "1 SERVING, 1 CONNECTION, 10 RSRP dBm, 10 LAST 60 s, 18 CELLS HEARD, 27 WHAT HAPPENED, "},
+      {{200, 60}, "1 SERVING, 1 CONNECTION, 10 RSRP dBm, 10 LAST 60 s, 35 CELLS HEARD, 35 WHAT HAPPENED, "},
+      {{80, 50}, "1 SERVING, 10 CONNECTION, 17 RSRP dBm, 27 CELLS HEARD, 38 WHAT HAPPENED, "},
       {{60, 17}, "1 SERVING, 9 WHAT HAPPENED, "},
   };
   for (const auto& each : cases) {
@@ -141,6 +142,21 @@ TEST_F(PanelsTest, WideOverviewsAreFilled) {
       lineWith("▸ LTE   B17           5815  742.5   338    -88             -9 ██████████████░░░░░░   0.0 s serving"),
       "");
   EXPECT_NE(lineWith("742.5   316   -112    -24     -15 ██████░░░░░░░░░░░░░░  24.0 s served 15.0 s ago"), "");
+}
+
+TEST_F(PanelsTest, TheOverviewTellsOfTheServingCellWhatIsTrueOfIt) {
+  show(smallDrive(), {120, 40});
+  desk_->type(U"o");
+  drive_.play({lteCell(30'000, 2000, 62, 62, {}, 10), lteLevel(30'100, -90, -9, 338)});
+  EXPECT_NE(lineWith("EARFCN 2000   B4 2115.0 MHz, UL 1715.0 MHz   5 MHz wide"), "");
+  EXPECT_NE(lineWith("age 0.0 s, of PCI 338"), "");
+  EXPECT_EQ(lineWith("Srxlev"), "") << "what the cell before has broadcast";
+  EXPECT_EQ(lineWith("agrees"), "");
+  EXPECT_NE(lineWith("338    -88    +30      -9 ██████████████░░░░░░   5.1 s re-established 9.9 s ago"), "");
+  drive_.play({lteCell(31'000, 2000, 63), lteNeighbors(31'100, {{2000, 62, -100}, {2000, 7, -99, 36}}),
+               lteLevel(31'200, -90, -12)});
+  EXPECT_NE(lineWith("0.1 s served 0.2 s ago"), "");
+  EXPECT_NE(lineWith("0.1 s best quality"), "");
 }
 
 TEST_F(PanelsTest, EveryTechnologyHasAnOverview) {
@@ -217,7 +233,7 @@ TEST_F(PanelsTest, TheTimelineFiltersAndTellsAllFields) {
   EXPECT_EQ(lineWith("  to  "), R"(  to          {"channel":5815,"code":338,"cell_id":48906257})");
   EXPECT_TRUE(wentTo_.empty());
   desk_->press(Key::Enter);
-  EXPECT_EQ(wentTo_, std::vector<std::uint64_t>{4});
+  EXPECT_EQ(wentTo_, std::vector<std::uint64_t>{5});
   desk_->press(Key::Escape);
   EXPECT_EQ(lineWith("stay_ms"), "");
   desk_->press(Key::Escape);

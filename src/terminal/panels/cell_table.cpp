@@ -63,10 +63,6 @@ std::string nothing(const HeardCell& /*cell*/) {
 std::string ageText(const HeardCell& cell) {
   return lastingText(cell.age);
 }
-std::string noteText(const HeardCell& cell) {
-  if (cell.role != insight::HeardRole::neighbor) return std::string(nameOf(cell.role));
-  return cell.servedAgo ? "served " + lastingText(*cell.servedAgo) + " ago" : "";
-}
 
 Number number(const std::optional<std::int64_t>& integer) {
   return integer ? Number(static_cast<double>(*integer)) : std::nullopt;
@@ -124,10 +120,11 @@ constexpr std::array kColumns{
     CellColumn{"quality", 7, true, 50, qualityText, qualityRank, true},
     CellColumn{"", 20, false, 96, nothing},
     CellColumn{"age", 6, true, 64, ageText, ageRank},
-    CellColumn{"note", 24, false, 78, noteText, noteRank},
+    CellColumn{"note", 24, false, 78, nothing, noteRank},
 };
 // clang-format on
 constexpr std::size_t kLevelBarColumn = 8;
+constexpr std::size_t kNoteColumn = 10;
 constexpr int kTableGutter = 2;
 
 Role textRole(std::size_t column, const HeardCell& cell) {
@@ -139,7 +136,39 @@ Role textRole(std::size_t column, const HeardCell& cell) {
   return Role::Plain;
 }
 
+/// Beyond it nobody looks for a cell's past.
+constexpr std::int64_t kRemembered = 60'000;
+
 }  // namespace
+
+CellNotes::CellNotes(const insight::Present& drive, const std::vector<HeardCell>& cells) {
+  const std::int64_t now = drive.now().value_or(0);
+  const auto& happenings = drive.happenings();
+  for (auto each = happenings.rbegin(); each != happenings.rend(); ++each) {
+    const std::int64_t ago = now - each->event.moment.time;
+    if (ago > kRemembered) break;
+    const auto* entry = std::get_if<insight::Reestablishment>(&each->event.fields);
+    if (entry != nullptr && entry->to)
+      reestablished_.push_back({{entry->technology, entry->to->channel, entry->to->code}, ago});
+  }
+  for (const insight::Technology technology : insight::kTechnologies) {
+    const HeardCell* best = nullptr;
+    for (const HeardCell& cell : cells) {
+      if (cell.key.technology == technology && cell.quality && (best == nullptr || cell.quality > best->quality))
+        best = &cell;
+    }
+    if (best != nullptr && best->role == insight::HeardRole::neighbor) best_.push_back(best->key);
+  }
+}
+
+std::string CellNotes::of(const HeardCell& cell) const {
+  if (cell.role != insight::HeardRole::neighbor) return std::string(nameOf(cell.role));
+  const auto entered = std::find_if(reestablished_.begin(), reestablished_.end(),
+                                    [&](const Entered& each) { return each.cell == cell.key; });
+  if (entered != reestablished_.end()) return "re-established " + lastingText(entered->ago) + " ago";
+  if (cell.servedAgo) return "served " + lastingText(*cell.servedAgo) + " ago";
+  return std::find(best_.begin(), best_.end(), cell.key) != best_.end() ? "best quality" : "";
+}
 
 CellTable::CellTable(int columns) {
   int start = kTableGutter;
@@ -164,7 +193,8 @@ void CellTable::drawHeads(const Canvas& canvas, const std::optional<CellOrder>& 
   }
 }
 
-void CellTable::drawRow(const Canvas& canvas, int line, const HeardCell& cell, bool isSelected) const {
+void CellTable::drawRow(const Canvas& canvas, int line, const HeardCell& cell, const CellNotes& notes,
+                        bool isSelected) const {
   if (isSelected) canvas.fill(line, Role::Selected);
   const auto roleFor = [&](Role role) { return isSelected ? Role::Selected : role; };
   if (cell.role == insight::HeardRole::serving) canvas.write(0, line, "▸", roleFor(Role::Key));
@@ -173,6 +203,8 @@ void CellTable::drawRow(const Canvas& canvas, int line, const HeardCell& cell, b
     const Role role = roleFor(textRole(place.column, cell));
     if (place.column == kLevelBarColumn && cell.level) {
       drawLevelBar(canvas, place.start, line, place.end - place.start, levelOf(cell.key.technology), *cell.level);
+    } else if (place.column == kNoteColumn) {
+      canvas.write(place.start, line, notes.of(cell), role, place.end);
     } else if (column.isAtRight) {
       canvas.writeRight(place.end, line, column.text(cell), role);
     } else {

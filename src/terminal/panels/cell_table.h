@@ -1,7 +1,9 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <optional>
+#include <string>
 #include <vector>
 
 #include "insight/present.h"
@@ -15,6 +17,28 @@ struct CellOrder {
   bool isFalling;
 };
 
+/// What is said of cells beside their figures.
+class CellNotes {
+ public:
+  /// Of the cells that are heard on `drive`.
+  CellNotes(const insight::Present& drive, const std::vector<insight::HeardCell>& cells);
+
+  /// "serving", "re-established 4.0 s ago", "served 15.0 s ago", "best quality"; the first of these that is so, or
+  /// nothing.
+  [[nodiscard]] std::string of(const insight::HeardCell& cell) const;
+
+ private:
+  struct Entered {
+    insight::HeardKey cell;
+    std::int64_t ago;
+  };
+
+  /// By re-establishments, latest first.
+  std::vector<Entered> reestablished_;
+  /// The best of each technology, where that is not the one that serves.
+  std::vector<insight::HeardKey> best_;
+};
+
 /// The table of the cells heard: its columns as far as there is room for them.
 class CellTable {
  public:
@@ -23,7 +47,8 @@ class CellTable {
 
   /// The heads, on the first line; the column of `order` bears an arrow.
   void drawHeads(const Canvas& canvas, const std::optional<CellOrder>& order) const;
-  void drawRow(const Canvas& canvas, int line, const insight::HeardCell& cell, bool isSelected) const;
+  void drawRow(const Canvas& canvas, int line, const insight::HeardCell& cell, const CellNotes& notes,
+               bool isSelected) const;
 
   /// The table's column at a column of the canvas.
   [[nodiscard]] std::optional<std::size_t> columnAt(int column) const;

@@ -35,8 +35,10 @@ void CellsPanel::draw(const Canvas& canvas) {
   const Canvas space = canvas.part({0, 1, canvas.columns(), canvas.lines() - 1});
   table_.emplace(space.columns());
   table_->drawHeads(space, order_);
+  const CellNotes notes(drive_.present(), cells_);
   for (int row = window_.top(); row < window_.end(); ++row)
-    table_->drawRow(space, 1 + row - window_.top(), cells_[static_cast<std::size_t>(row)], row == window_.selected());
+    table_->drawRow(space, 1 + row - window_.top(), cells_[static_cast<std::size_t>(row)], notes,
+                    row == window_.selected());
 }
 
 bool CellsPanel::perform(Action action) {

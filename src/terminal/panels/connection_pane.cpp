@@ -50,15 +50,18 @@ ConnectionLine registrationLine(const insight::Present& drive, insight::Registra
   return line;
 }
 
-/// "10 of 320 ms, short 80, inactivity 100".
+/// "on 10 of 320 ms, short 80, inactivity 100   TM3".
 ConnectionLine drxLine(const insight::Present& drive) {
   const auto& parameters = drive.timeline().connectedDrx().parameters();
-  if (!parameters) return {"C-DRX", "off"};
+  const auto& mode = drive.servingDetails().transmissionMode();
+  const std::string transmission = mode ? "   TM" + std::to_string(*mode) : "";
+  if (!parameters) return {"C-DRX", "off" + transmission};
   const auto part = [](std::string_view before, const std::optional<std::int64_t>& number) {
     return number ? std::string(before) + std::to_string(*number) : "";
   };
   return {"C-DRX", "on" + part(" ", parameters->onDuration) + part(" of ", parameters->longCycle) + " ms" +
-                       part(", short ", parameters->shortCycle) + part(", inactivity ", parameters->inactivity)};
+                       part(", short ", parameters->shortCycle) + part(", inactivity ", parameters->inactivity) +
+                       transmission};
 }
 
 ConnectionLine carriersLine(const insight::Present& drive) {

@@ -12,7 +12,9 @@ constexpr int kWideColumns = 100;
 constexpr int kVeryWideColumns = 160;
 
 /// With their frames.
-constexpr int kServingLines = 9;
+constexpr int kServingLines = 10;
+/// Without the details of the cell.
+constexpr int kLeastServingLines = 9;
 constexpr int kLeastPane = 6;
 
 /// A row of boxes is divided where this many hundredths of the width are.
@@ -52,7 +54,8 @@ OverviewLayout wideLayout(Size size) {
 OverviewLayout narrowLayout(Size size) {
   OverviewLayout layout;
   int line = 0;
-  addBox(layout.panes, size, line, kServingLines, PaneKind::serving);
+  constexpr int kRoomyLines = 20;
+  addBox(layout.panes, size, line, size.lines < kRoomyLines ? kLeastServingLines : kServingLines, PaneKind::serving);
   const int left = size.lines - line;
   if (left >= 4 * kLeastPane + 2) addBox(layout.panes, size, line, kLeastPane + 2, PaneKind::connection);
   const bool hasCells = left >= 4 * kLeastPane;
@@ -70,7 +73,7 @@ OverviewLayout narrowLayout(Size size) {
 OverviewLayout OverviewLayout::of(Size size) {
   if (size.columns < kLeastFramed.columns || size.lines < kLeastFramed.lines) {
     // Without frames the panes reach beyond the edge, and over the line between them.
-    const int serving = std::min(size.lines, kServingLines - 2);
+    const int serving = std::min(size.lines, kLeastServingLines - 2);
     return {{{PaneKind::serving, {-1, -1, size.columns + 2, serving + 2}},
              {PaneKind::happenings, {-1, serving - 1, size.columns + 2, size.lines - serving + 2}}},
             false};

@@ -126,9 +126,11 @@ void OverviewPanel::drawCells(const Canvas& canvas) const {
   const CellTable table(canvas.columns());
   table.drawHeads(canvas, std::nullopt);
   int line = 1;
-  for (const insight::HeardCell& cell : drive_.present().cellsHeard()) {
+  const std::vector<insight::HeardCell> cells = drive_.present().cellsHeard();
+  const CellNotes notes(drive_.present(), cells);
+  for (const insight::HeardCell& cell : cells) {
     if (line == canvas.lines()) break;
-    table.drawRow(canvas, line++, cell, false);
+    table.drawRow(canvas, line++, cell, notes, false);
   }
 }
 

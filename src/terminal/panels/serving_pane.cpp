@@ -43,13 +43,15 @@ std::string identityText(const insight::Present& drive, Technology technology) {
   return out;
 }
 
-/// "EARFCN 5815   B17 742.5 MHz, UL 712.5 MHz".
+/// "EARFCN 5815   B17 742.5 MHz, UL 712.5 MHz   5 MHz wide".
 std::string channelText(const insight::Present& drive, Technology technology) {
   const auto& cell = drive.timeline().mobility().cell();
   if (!cell || !cell->identity.channel) return {};
   const auto reading = channelReading(technology, *cell->identity.channel);
+  const auto& bandwidth = drive.servingDetails().bandwidth();
   return std::string(channelNameOf(technology)) + " " + std::to_string(*cell->identity.channel) +
-         (reading ? "   " + reading->text : "");
+         (reading ? "   " + reading->text : "") +
+         (bandwidth ? "   " + insight::numberText(*bandwidth) + " MHz wide" : "");
 }
 
 void drawUnknown(const Canvas& canvas, int line, const insight::Present& drive, Kpi kpi) {
@@ -77,6 +79,13 @@ void drawKpi(const Canvas& canvas, int line, const insight::Present& drive, Kpi 
   if (column + textWidth(text) <= canvas.columns()) canvas.write(column, line, text, Role::Faint);
 }
 
+/// The cell that was measured, where it is not the one that serves.
+std::optional<std::int64_t> otherPci(const insight::Present& drive) {
+  const auto& cell = drive.timeline().mobility().cell();
+  const auto& measured = drive.servingDetails().samplePci();
+  return cell && cell->identity.code && measured != cell->identity.code ? measured : std::nullopt;
+}
+
 /// "RRC CONNECTED 23 s   serves 4.4 s   age 0.3 s".
 std::string stateText(const insight::Present& drive, Technology technology) {
   std::string out;
@@ -88,7 +97,26 @@ std::string stateText(const insight::Present& drive, Technology technology) {
         lastingText(now - connections.stateSince(technology)));
   }
   if (const auto& cell = drive.timeline().mobility().cell()) add("serves " + lastingText(now - cell->since));
-  if (const auto age = drive.age(levelOf(technology))) add("age " + lastingText(*age));
+  if (const auto age = drive.age(levelOf(technology))) {
+    const auto other = otherPci(drive);
+    add("age " + lastingText(*age) + (other ? ", of PCI " + std::to_string(*other) : ""));
+  }
+  return out;
+}
+
+/// "Srxlev +26 dB over QRxLevMin -122 dBm   measured PCI agrees".
+std::string detailsText(const insight::Present& drive) {
+  std::string out;
+  const auto& details = drive.servingDetails();
+  const auto level = drive.value(Kpi::lteRsrp);
+  if (const auto& least = details.leastLevel(); least && level) {
+    const double margin = *level - *least;
+    out = "Srxlev " + std::string(margin > 0 ? "+" : "") + insight::numberText(margin) + " dB over QRxLevMin " +
+          insight::numberText(*least) + " dBm";
+  }
+  const auto& cell = drive.timeline().mobility().cell();
+  if (level && cell && cell->identity.code && details.samplePci() == cell->identity.code)
+    out += std::string(out.empty() ? "" : "   ") + "measured PCI agrees";
   return out;
 }
 
@@ -140,10 +168,11 @@ void drawServing(const Canvas& canvas, const insight::Present& drive, std::optio
   int line = kFirstKpiLine;
   for (const Kpi kpi : servingKpis(*technology))
     drawKpi(canvas, line++, drive, kpi, kpi == selected);
-  canvas.write(kServingIndent, line++, stateText(drive, *technology), Role::Plain);
-  if (line < canvas.lines() - (drive.timeline().registrations().noServiceSince() ? 1 : 0)) {
-    canvas.write(kServingIndent, line, neighborText(drive, *technology), Role::Faint);
-  }
+  const int room = canvas.lines() - (drive.timeline().registrations().noServiceSince() ? 1 : 0);
+  canvas.write(kServingIndent, line++, stateText(drive, *technology), otherPci(drive) ? Role::Fair : Role::Plain);
+  const std::string details = line + 1 < room ? detailsText(drive) : "";
+  if (!details.empty()) canvas.write(kServingIndent, line++, details, Role::Plain);
+  if (line < room) canvas.write(kServingIndent, line, neighborText(drive, *technology), Role::Faint);
 }
 
 }  // namespace vesk

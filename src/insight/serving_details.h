@@ -1,0 +1,39 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+
+#include "insight/mobility.h"
+#include "insight/report.h"
+
+namespace vesk::insight {
+
+/// What the serving LTE cell says of itself besides its identity; each absent while it is unknown.
+class ServingDetails {
+ public:
+  /// Of the downlink, MHz.
+  [[nodiscard]] const std::optional<double>& bandwidth() const { return bandwidth_; }
+  /// The level that a phone must receive to stay (QRxLevMin), dBm.
+  [[nodiscard]] std::optional<double> leastLevel() const;
+  [[nodiscard]] const std::optional<std::int64_t>& transmissionMode() const { return transmissionMode_; }
+  /// Of the last measurement: during a change it may be another cell's.
+  [[nodiscard]] const std::optional<std::int64_t>& samplePci() const { return samplePci_; }
+
+  /// `mobility` is as the report left it.
+  void take(const Report& report, const Mobility& mobility, std::int64_t now);
+  void forget() { *this = ServingDetails(); }
+
+ private:
+  struct Broadcast {
+    double leastLevel;
+    std::int64_t heardAt;
+  };
+
+  std::optional<CellIdentity> cell_;
+  std::optional<double> bandwidth_;
+  std::optional<Broadcast> broadcast_;
+  std::optional<std::int64_t> transmissionMode_;
+  std::optional<std::int64_t> samplePci_;
+};
+
+}  // namespace vesk::insight
