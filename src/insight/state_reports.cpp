@@ -43,9 +43,11 @@ Number carrierBandwidthOf(const Dictionary& record) {
 
 /// The serving cell's comes in whole MHz.
 Number bandwidthOf(const Dictionary& record) {
-  constexpr std::array kBandwidths{1, 3, 5, 10, 15, 20};
+  constexpr std::array kServingBandwidths{1, 3, 5, 10, 15, 20};
   const Integer bandwidth = integerOf(record, "dl_bw"_text);
-  if (!bandwidth || std::find(kBandwidths.begin(), kBandwidths.end(), *bandwidth) == kBandwidths.end()) return {};
+  if (!bandwidth ||
+      std::find(kServingBandwidths.begin(), kServingBandwidths.end(), *bandwidth) == kServingBandwidths.end())
+    return {};
   return *bandwidth == 1 ? 1.4 : static_cast<double>(*bandwidth);
 }
 
