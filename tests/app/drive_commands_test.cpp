@@ -1,5 +1,8 @@
 // The commands that tell what a drive was, as a user runs them.
 
+#include <filesystem>
+#include <fstream>
+
 #include "app/vesk_program.h"
 
 namespace vesk {
@@ -91,6 +94,39 @@ TEST(DriveCommands, WriteAReportThatIsOneFile) {
   finished = vesk({"report", "-o", page.path() + "/none"}, kDrive);
   EXPECT_EQ(finished.error, "vesk: " + page.path() + "/none: Not a directory\n");
   EXPECT_EQ(finished.status, 1);
+}
+
+TEST(DriveCommands, KeepAFileUntilAReportCanTakeItsPlace) {
+  const std::filesystem::path folder = testing::TempDir() + "vesk-report-" + std::to_string(getpid());
+  std::filesystem::create_directory(folder);
+  const std::string recording = folder / "drive.jsonl";
+  const std::string page = folder / "page.html";
+  const std::string link = folder / "link";
+  std::filesystem::create_symlink("page.html", link);
+  const auto contentOf = [](const std::string& path) {
+    std::ifstream file(path);
+    return std::string(std::istreambuf_iterator<char>(file), {});
+  };
+  std::ofstream(recording) << kDrive;
+  std::filesystem::create_hard_link(recording, page);
+  for (const std::string& output : {recording, page, link}) {
+    EXPECT_EQ(vesk({"report", recording, "-o", output}).status, 2) << output;
+    EXPECT_EQ(contentOf(recording), kDrive);
+  }
+  std::filesystem::remove(page);
+  EXPECT_EQ(vesk({"report", recording, "-o", link}).status, 0) << "a link to nothing yet";
+  EXPECT_TRUE(std::filesystem::is_symlink(link));
+  EXPECT_EQ(std::filesystem::status(page).permissions(), std::filesystem::perms(0600));
+  const std::string written = contentOf(page);
+  EXPECT_TRUE(written.ends_with("</html>\n\n")) << written.substr(written.size() - 20);
+  for (const std::string& input : {recording + "x", std::string("/dev/null/x"), folder.string()})
+    EXPECT_EQ(vesk({"report", input, "-o", page}).status, 1) << input;
+  EXPECT_EQ(vesk({"report", "-o", page}, "no recording\n").status, 1);
+  EXPECT_EQ(contentOf(page), written);
+  EXPECT_EQ(vesk({"report", recording, "-o", "/dev/full"}).error, "vesk: /dev/full: No space left on device\n");
+  EXPECT_EQ(vesk({"report", recording, "-o", "/dev/stdout"}).output, written);
+  EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder), {}), 3) << "what was written aside is gone";
+  std::filesystem::remove_all(folder);
 }
 
 TEST(DriveCommands, RefuseToServeWhereTheyCannot) {
