@@ -11,6 +11,8 @@
 namespace vesk::web {
 namespace {
 
+using namespace std::string_literals;
+
 constexpr std::string_view kHost = "Host: 127.0.0.1:8080\r\n\r\n";
 
 TEST(RequestHead, RefusesWhatIsNotARequestOfThisHost) {
@@ -22,9 +24,24 @@ TEST(RequestHead, RefusesWhatIsNotARequestOfThisHost) {
       {"GET / HTTP/1.1\r\nHost: van-3.example.net\r\n\r\n", 0},
       {"GET / HTTP/1.1\r\nHost: evil.example\r\n\r\n", 403},
       {"GET / HTTP/1.1\r\nHost: 127.0.0.1.evil.example\r\n\r\n", 403},
-      {"GET / HTTP/1.1\r\n\r\n", 403},
+      {"GET / HTTP/1.1\r\nHost: localhost.\r\n\r\n", 403},
+      {"GET / HTTP/1.1\r\n\r\n", 400},
+      {"GET / HTTP/1.0\r\n\r\n", 403},
+      {"GET / HTTP/1.1\r\nHost: localhost:http\r\n\r\n", 400},
+      {"GET / HTTP/1.1\r\nHost: 127.0.0.1:65536\r\n\r\n", 400},
+      {"GET / HTTP/1.1\r\nHost: 127.0.0.1\0.evil.example\r\n\r\n"s, 400},
+      {"GET / HTTP/1.1\r\nHost: localhost\nX: y\r\n\r\n", 400},
+      {"GET /\x7f HTTP/1.1\r\nHost: localhost\r\n\r\n", 400},
+      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: none\r\n\r\n", 0},
+      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: same-origin\r\nSec-Fetch-Mode: cors\r\n\r\n", 0},
+      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: same-site\r\nSec-Fetch-Mode: cors\r\n\r\n", 403},
       {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: cross-site\r\nSec-Fetch-Mode: cors\r\n\r\n", 403},
-      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: cross-site\r\nSec-Fetch-Mode: navigate\r\n\r\n", 0},
+      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: cross-site\r\nSec-Fetch-Mode: navigate\r\n"
+       "Sec-Fetch-Dest: document\r\n\r\n",
+       0},
+      {"GET / HTTP/1.1\r\nHost: localhost\r\nSec-Fetch-Site: cross-site\r\nSec-Fetch-Mode: navigate\r\n"
+       "Sec-Fetch-Dest: iframe\r\n\r\n",
+       403},
       {"GET / HTTP/1.1\r\nHost: localhost\r\nHost: evil.example\r\n\r\n", 400},
       {"POST / HTTP/1.1\r\nHost: localhost\r\n\r\n", 405},
       {"GET / HTTP/1.1\r\nHost: localhost\r\nContent-Length: 5\r\n\r\n", 413},
