@@ -17,6 +17,9 @@ constexpr std::chrono::milliseconds kNewsInterval{500};
 constexpr RecordLimits kNews{32, 50};
 constexpr RecordLimits kLiveDrive{4096, 200};
 
+/// A connection that says nothing for long is cut on its way, and nobody notices when its visitor is gone.
+constexpr std::chrono::seconds kLongestSilence{15};
+
 constexpr std::string_view kJson = "application/json; charset=utf-8";
 constexpr std::string_view kStream = "text/event-stream; charset=utf-8";
 constexpr std::string_view kScript = "text/javascript; charset=utf-8";
@@ -73,6 +76,7 @@ LiveServer::~LiveServer() {
 
 void LiveServer::start(std::unique_ptr<HttpServer> server) {
   server_ = std::move(server);
+  server_->setRemarkHandler(std::move(sources_.remark));
   server_->setStreamEndHandler([this](StreamId stream) {
     watchers_.erase(stream);
     walks_.erase(stream);
@@ -83,7 +87,10 @@ void LiveServer::start(std::unique_ptr<HttpServer> server) {
     sendNews();
     sendScreens();
   });
-  idleTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { server_->dropSlow(); });
+  tendTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] {
+    server_->tend();
+    server_->sendToQuiet(kLongestSilence, silence_);
+  });
 }
 
 void LiveServer::take(const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {

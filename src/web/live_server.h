@@ -25,6 +25,8 @@ struct LiveSources {
   RowReadings readings;
   /// What the source of the events is at: "simulated", "replaying 3:12 of 9:40".
   std::function<std::string()> state;
+  /// Told what keeps visitors away, in one line. May be null.
+  std::function<void(const std::string& reason)> remark{};
 };
 
 /// Serves the live page, its JSON and the metrics for Prometheus, on the main run loop. Whatever a visitor is shown is
@@ -81,8 +83,10 @@ class LiveServer {
   std::map<StreamId, Walk> walks_;
   /// The beginning of a watcher's stream, for those who come before the next news.
   SharedText beginning_;
+  /// A comment of an event stream.
+  SharedText silence_ = std::make_shared<const std::string>(":\n\n");
   std::optional<Timer> newsTimer_;
-  std::optional<Timer> idleTimer_;
+  std::optional<Timer> tendTimer_;
 };
 
 }  // namespace vesk::web

@@ -66,8 +66,11 @@ class Serving {
   void mainLoop(NavigationController& root) {
     if (const auto reason = whyNoMetricArrives(root)) return fail(*reason);
     std::string reason;
-    const std::unique_ptr<web::LiveServer> page = web::LiveServer::open(
-        options_.server, {insight_, veskInterface(), readingOfRow, [this] { return source_.state().text; }}, reason);
+    const std::unique_ptr<web::LiveServer> page =
+        web::LiveServer::open(options_.server,
+                              {insight_, veskInterface(), readingOfRow, [this] { return source_.state().text; },
+                               [](const std::string& remark) { tellUser("vesk: " + remark); }},
+                              reason);
     if (page == nullptr) return fail("vesk: " + reason);
     tellPlace(page->port());
     insight_.setStepHandler([&](const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
