@@ -51,6 +51,23 @@ std::string servedPage() {
   return page;
 }
 
+/// The answers that never change, by their paths: all who ask share them.
+const std::map<std::string_view, Response>& pageParts() {
+  static const std::map<std::string_view, Response> kParts = [] {
+    const auto part = [](std::string_view type, std::string content) {
+      return Response{.type = type, .body = shared(std::move(content))};
+    };
+    return std::map<std::string_view, Response>{
+        {"/", part("text/html; charset=utf-8", servedPage())},
+        {"/page.css", part("text/css; charset=utf-8", std::string(kPageStyle.content))},
+        {"/icon.svg", part("image/svg+xml", std::string(kPageIcon.content))},
+        {"/charts.js", part(kScript, std::string(kChartScript.content))},
+        {"/page.js", part(kScript, std::string(kPageScript.content))},
+    };
+  }();
+  return kParts;
+}
+
 }  // namespace
 
 struct LiveServer::Route {
@@ -159,13 +176,19 @@ Response LiveServer::answer(const Request& request) {
   return route == kRoutes.end() ? plainResponse(404, "There is no such page.") : (this->*route->answer)(request);
 }
 
+template <class Write>
+Response LiveServer::kept(const Request& request, Write write) {
+  Kept& kept = kept_[request.path];
+  if (const std::uint64_t events = sources_.insight.counts().all; kept.text == nullptr || kept.events != events) {
+    std::string text;
+    write(text);
+    kept = {events, shared(std::move(text))};
+  }
+  return {.type = kJson, .body = kept.text};
+}
+
 Response LiveServer::page(const Request& request) {
-  if (request.path == "/page.css")
-    return {.type = "text/css; charset=utf-8", .body = shared(std::string(kPageStyle.content))};
-  if (request.path == "/icon.svg") return {.type = "image/svg+xml", .body = shared(std::string(kPageIcon.content))};
-  if (request.path == "/charts.js") return {.type = kScript, .body = shared(std::string(kChartScript.content))};
-  if (request.path == "/page.js") return {.type = kScript, .body = shared(std::string(kPageScript.content))};
-  return {.type = "text/html; charset=utf-8", .body = shared(servedPage())};
+  return pageParts().at(request.path);
 }
 
 /// News that were not sent yet are sent to a new watcher nevertheless: so the others' are sent first.
@@ -193,7 +216,11 @@ Response LiveServer::menu(const Request& /*request*/) {
 
 Response LiveServer::screens(const Request& request) {
   if (request.query.empty())
-    return jsonResponse([&](JsonWriter& json) { writeScreensJson(json, sources_.layout, sources_.readings); });
+    return kept(request, [&](std::string& out) {
+      JsonWriter json(out);
+      writeScreensJson(json, sources_.layout, sources_.readings);
+      json.finish();
+    });
   ScreenWalk walk(sources_.layout);
   if (!walk.open(request.parameter("area"), request.parameter("category")))
     return plainResponse(404, "There is no such screen; /api/menu tells which there are.");
@@ -211,14 +238,12 @@ Response LiveServer::timeline(const Request& /*request*/) {
   });
 }
 
-Response LiveServer::series(const Request& /*request*/) {
-  std::string json;
-  appendDriveJson(json, whole_, sources_.insight);
-  return {.type = kJson, .body = shared(std::move(json))};
+Response LiveServer::series(const Request& request) {
+  return kept(request, [&](std::string& out) { appendDriveJson(out, whole_, sources_.insight); });
 }
 
-Response LiveServer::summary(const Request& /*request*/) {
-  return {.type = kJson, .body = shared(insight::summaryJson(sources_.insight))};
+Response LiveServer::summary(const Request& request) {
+  return kept(request, [&](std::string& out) { out = insight::summaryJson(sources_.insight); });
 }
 
 Response LiveServer::metrics(const Request& /*request*/) {

@@ -54,6 +54,12 @@ class LiveServer {
     bool isChanged = false;
   };
 
+  /// An answer that stays the same until another event has come.
+  struct Kept {
+    std::uint64_t events = 0;
+    SharedText text;
+  };
+
   explicit LiveServer(LiveSources sources);
   void start(std::unique_ptr<HttpServer> server);
   void sendNews();
@@ -61,6 +67,9 @@ class LiveServer {
   [[nodiscard]] std::string driveMessage(std::string_view event, const DriveRecord& record) const;
   [[nodiscard]] std::string screenMessage(const ScreenWalk& walk) const;
 
+  /// What `write` appends to a text, written once for all who ask until another event has come.
+  template <class Write>
+  [[nodiscard]] Response kept(const Request& request, Write write);
   [[nodiscard]] Response beginDrive(const Request& request);
   [[nodiscard]] Response beginScreen(const Request& request);
   [[nodiscard]] Response menu(const Request& request);
@@ -83,6 +92,8 @@ class LiveServer {
   std::map<StreamId, Walk> walks_;
   /// The beginning of a watcher's stream, for those who come before the next news.
   SharedText beginning_;
+  /// By path.
+  std::map<std::string, Kept, std::less<>> kept_;
   /// A comment of an event stream.
   SharedText silence_ = std::make_shared<const std::string>(":\n\n");
   std::optional<Timer> newsTimer_;
