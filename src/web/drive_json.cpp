@@ -163,11 +163,13 @@ void appendDriveJson(std::string& out, const DriveRecord& record, const insight:
   writeKpiDescriptions(json);
   drive.plainKey("stretches");
   Pairs stretches(json);
-  for (const StretchBegin& each : record.stretches()) {
+  for (const StretchBegin& each : record.stretches().begins()) {
     stretches.addPosition(each.position);
     stretches.addPosition(each.time);
   }
   stretches.end();
+  drive.plainKey("time_error");
+  json.write(record.stretches().error());
   drive.plainKey("series");
   writeSeries(json, record);
   drive.plainKey("cells");

@@ -195,6 +195,7 @@ class Charts {
     this.window = null;
     this.isFollowing = false;
     this.moment = element('p', {id: 'moment', class: 'quiet', 'aria-live': 'polite'});
+    this.note = element('p', {class: 'quiet'});
     this.controls = element('div', {class: 'row', role: 'group', 'aria-label': 'What the charts show'},
       button('whole drive', () => this.showWhole()), trail ? button('now', () => this.showTrail(trail)) : '',
       button('+', () => this.zoom(0.5), {'aria-label': 'zoom in'}), button('−', () => this.zoom(2), {'aria-label': 'zoom out'}),
@@ -218,6 +219,9 @@ class Charts {
 
   /** The series that have values; anew whenever another one has. */
   draw() {
+    const error = this.drive.time_error;
+    this.note.hidden = error === 0;
+    this.note.textContent = `There were more gaps than are kept: times in the charts may be off by ${duration(error)}.`;
     const groups = chartGroups.map((group) => [group, group.names.filter((name) => this.drive.series[name]?.length)])
       .filter(([, names]) => names.length > 0);
     const layout = JSON.stringify(groups.map(([, names]) => names));
@@ -231,7 +235,7 @@ class Charts {
     this.layout = layout;
     for (const chart of this.charts) chart.graph.destroy();
     this.charts = groups.map(([group, names]) => new Chart(this, group, names));
-    fill(this.section, this.controls, this.moment, ...this.charts.map((chart) => chart.frame),
+    fill(this.section, this.controls, this.moment, this.note, ...this.charts.map((chart) => chart.frame),
       ...(this.charts.length ? [] : [element('p', {class: 'quiet', text: 'No level or power was measured.'})]));
     for (const chart of this.charts) chart.draw();
   }

@@ -25,6 +25,7 @@ class Drive {
     this.now = news.now;
     this.cells = news.cells;
     append(this.stretches, news.stretches, Drive.mostPoints);
+    this.time_error = Math.max(this.time_error, news.time_error);
     append(this.serving, news.serving, Drive.mostPoints);
     append(this.events, news.events, Drive.mostEvents);
     for (const [mark, positions] of Object.entries(news.marks)) append(this.marks[mark], positions, Drive.mostPoints);
