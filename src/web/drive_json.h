@@ -17,4 +17,8 @@ namespace vesk::web {
 /// `insight` knows at its last event.
 void appendDriveJson(std::string& out, const DriveRecord& record, const insight::Insight& insight);
 
+/// Appends the same of what came since the record was cleared last, to be added to the drive as it was told until then:
+/// without "kpis", and of "cells" the new ones alone, whose places follow those of the known.
+void appendNewsJson(std::string& out, const DriveRecord& record, const insight::Insight& insight);
+
 }  // namespace vesk::web

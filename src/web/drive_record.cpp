@@ -84,6 +84,7 @@ void DriveRecord::clear() {
   for (Thinned<MeasuredPoint>& course : courses_)
     course.clear();
   serving_.clear();
+  firstNewCell_ = cells_.size();
   for (Thinned<MarkPoint>& mark : marks_)
     mark.clear();
   for (auto& ofKind : events_)

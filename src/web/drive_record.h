@@ -85,6 +85,8 @@ class DriveRecord {
   }
   [[nodiscard]] const std::vector<ServingPoint>& serving() const { return serving_.points(); }
   [[nodiscard]] const std::vector<std::string>& cells() const { return cells_; }
+  /// Where in cells() those begin that served for the first time since it was made or cleared.
+  [[nodiscard]] std::size_t firstNewCell() const { return firstNewCell_; }
   [[nodiscard]] const std::vector<MarkPoint>& marks(Mark mark) const {
     return marks_[static_cast<std::size_t>(mark)].points();
   }
@@ -108,6 +110,7 @@ class DriveRecord {
   /// The cell of the step before.
   std::optional<std::pair<insight::Technology, insight::CellIdentity>> servingNow_;
   std::vector<std::string> cells_;
+  std::size_t firstNewCell_ = 0;
   std::map<std::string, std::size_t, std::less<>> cellNumbers_;
   std::vector<Thinned<MarkPoint>> marks_;
   std::uint64_t eventCount_ = 0;

@@ -115,11 +115,11 @@ void LiveServer::take(const insight::Report& report, const std::vector<insight::
   news_.take(sources_.insight, report, events);
 }
 
-std::string LiveServer::driveMessage(std::string_view event, const DriveRecord& record) const {
+std::string LiveServer::driveMessage(std::string_view event, const DriveRecord& record, AppendDrive append) const {
   std::string message = "event: " + std::string(event) + "\ndata: {\"state\":";
   appendJson(message, std::string_view(sources_.state()));
   message += ",\"drive\":";
-  appendDriveJson(message, record, sources_.insight);
+  append(message, record, sources_.insight);
   return message + "}\n\n";
 }
 
@@ -136,7 +136,7 @@ void LiveServer::sendNews() {
   std::string state = sources_.state();
   const bool isNothingNew = news_.isEmpty() && state == lastState_;
   if (!watchers_.empty() && !isNothingNew) {
-    const SharedText message = shared(driveMessage("news", news_));
+    const SharedText message = shared(driveMessage("news", news_, appendNewsJson));
     const std::vector<StreamId> watchers(watchers_.begin(), watchers_.end());
     for (const StreamId watcher : watchers)
       server_->send(watcher, message);
@@ -195,7 +195,7 @@ Response LiveServer::page(const Request& request) {
 Response LiveServer::beginDrive(const Request& /*request*/) {
   if (beginning_ == nullptr) {
     if (!news_.isEmpty()) sendNews();
-    beginning_ = shared(driveMessage("drive", whole_));
+    beginning_ = shared(driveMessage("drive", whole_, appendDriveJson));
   }
   return {.type = kStream, .body = beginning_, .begin = [this](StreamId stream) { watchers_.insert(stream); }};
 }

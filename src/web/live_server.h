@@ -64,7 +64,8 @@ class LiveServer {
   void start(std::unique_ptr<HttpServer> server);
   void sendNews();
   void sendScreens();
-  [[nodiscard]] std::string driveMessage(std::string_view event, const DriveRecord& record) const;
+  using AppendDrive = void (*)(std::string& out, const DriveRecord& record, const insight::Insight& insight);
+  [[nodiscard]] std::string driveMessage(std::string_view event, const DriveRecord& record, AppendDrive append) const;
   [[nodiscard]] std::string screenMessage(const ScreenWalk& walk) const;
 
   /// What `write` appends to a text, written once for all who ask until another event has come.

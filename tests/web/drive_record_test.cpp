@@ -116,12 +116,14 @@ TEST(DriveRecord, TellsNewsAloneAfterItWasCleared) {
   RecordedDrive drive({lteCell(0, 850, 443), lteLevel(500, -125, -20)});
   drive.record.clear();
   EXPECT_TRUE(drive.record.isEmpty());
-  drive.drive.play({lteLevel(900, -100, -10)});
+  drive.drive.play({lteLevel(900, -100, -10), lteCell(1000, 5815, 271)});
   EXPECT_FALSE(drive.record.isEmpty());
-  const std::string json = drive.json();
-  for (const char* part : {R"("stretches":[],"time_error":0,"series":{"lte.rsrp":[900,-100],"lte.rsrq":[900,-10]})",
-                           R"("cells":["PCI 443 B2 850"],"serving":[])", R"("events":[])"})
+  std::string json;
+  appendNewsJson(json, drive.record, drive.drive.insight);
+  for (const char* part : {R"({"stretches":[],"time_error":0,"series":{"lte.rsrp":[900,-100],"lte.rsrq":[900,-10]})",
+                           R"("cells":["PCI 271 B17 5815"],"serving":[1000,1])", R"("events":[[1000,)"})
     EXPECT_NE(json.find(part), std::string::npos) << part << " is not in\n" << json;
+  EXPECT_NE(drive.json().find(R"({"kpis":[{"name":"lte.rsrp")"), std::string::npos);
 }
 
 TEST(PrometheusText, TellsKnownKpisWithTheirCellAndCountsWhatHappened) {

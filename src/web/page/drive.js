@@ -23,7 +23,7 @@ class Drive {
       if (all.length > most) all.splice(0, all.length - most);
     };
     this.now = news.now;
-    this.cells = news.cells;
+    this.cells.push(...news.cells);
     append(this.stretches, news.stretches, Drive.mostPoints);
     this.time_error = Math.max(this.time_error, news.time_error);
     append(this.serving, news.serving, Drive.mostPoints);
