@@ -206,15 +206,20 @@ class Charts {
           swatch.style.color = `var(--${name})`;
           return element('li', {}, swatch, text);
         }), element('li', {text: 'foot of each chart: serving cell'})));
-    this.scheme = matchMedia('(prefers-color-scheme: dark)');
-    this.repaint = () => { for (const chart of this.charts) chart.graph.updateOptions(chart.looks()); };
-    this.scheme.addEventListener('change', this.repaint);
+    matchMedia('(prefers-color-scheme: dark)').addEventListener('change', () => this.repaint());
+    addEventListener('beforeprint', () => this.setPrinting(true));
+    addEventListener('afterprint', () => this.setPrinting(false));
   }
 
-  destroy() {
-    this.scheme.removeEventListener('change', this.repaint);
-    for (const chart of this.charts) chart.graph.destroy();
-    this.charts = [];
+  repaint() {
+    for (const chart of this.charts) chart.graph.updateOptions(chart.looks());
+  }
+
+  /** What is drawn does not follow the style sheet of paper by itself: neither its colours nor its width. */
+  setPrinting(isPrinting) {
+    document.documentElement.classList.toggle('printing', isPrinting);
+    for (const chart of this.charts) chart.graph.resize();
+    this.repaint();
   }
 
   /** The series that have values; anew whenever another one has. */
@@ -323,7 +328,7 @@ class Charts {
 
   /** The last value at or before a position while it is known; else null. */
   valueAt(name, position) {
-    const series = this.drive.series[name];
+    const series = this.drive.series[name] || [];
     let low = -1;
     let high = series.length / 2;
     while (high - low > 1) {
