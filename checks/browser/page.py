@@ -120,6 +120,18 @@ def check_width(browser):
     browser.wait(lambda: browser.run("return document.documentElement.scrollWidth") <= 360, "a page of 360 pixels")
 
 
+def check_paper(browser):
+    """On paper a page is light and unfolded, also where the screen is dark."""
+    look = "const style = getComputedStyle(document.documentElement); return [style.getPropertyValue('--text').trim(), style.getPropertyValue('--series-1').trim(), document.querySelectorAll('details:not([open], .menu)').length]"
+    browser.look(1280, 1000, "dark")
+    dark = browser.wait(lambda: (now := browser.run(look))[0] == "#e3e6e9" and now, "a dark screen")
+    browser.run("addEventListener('beforeprint', () => { window.paper = (() => {" + look + "})(); })")
+    browser.command("Page.printToPDF")
+    paper = browser.run("return window.paper")
+    demand(paper == ["#1b1f23", "#0b5fa5", 0], f"on paper: {paper}")
+    browser.wait(lambda: browser.run(look) == dark, "the screen as it was")
+
+
 def take_pictures(browser, pictures, name):
     for width, height in ((360, 1600), (1280, 1600)):
         for scheme in ("light", "dark"):
@@ -146,6 +158,9 @@ def check_report(browser, vesk, scratch, pictures):
     browser.run("for (const fold of document.querySelectorAll('#screens details')) fold.open = true")
     browser.wait(lambda: browser.run("return document.querySelectorAll('#screens .number, #screens td').length > 50"), "the screens")
     check_hostile(browser)
+    browser.run("for (const fold of document.querySelectorAll('#screens details')) fold.open = false")
+    demand(browser.run("return document.querySelectorAll('details:not([open])').length") > 20, "screens that are folded")
+    check_paper(browser)
     check_width(browser)
     take_pictures(browser, pictures, "report")
     check_clean(browser, page.as_uri())
@@ -174,6 +189,7 @@ def check_live(browser, vesk, scratch, pictures):
         check_width(browser)
         check_hidden(browser, place)
         browser.look(1280, 1000, "light")
+        check_paper(browser)
         take_pictures(browser, pictures, "live")
         check_clean(browser, place)
     finally:
