@@ -202,7 +202,7 @@ class Charts {
       button('◀', () => this.move(-0.5), {'aria-label': 'earlier'}), button('▶', () => this.move(0.5), {'aria-label': 'later'}),
       element('ul', {class: 'legend'}, ...[['change', 'cell change'], ['reestablished', 're-establishment'], ['drop', 'drop'], ['gap', 'gap in time']]
         .map(([name, text]) => {
-          const swatch = element('span', {class: 'swatch bar'});
+          const swatch = element('span', {class: `swatch bar ${name}`});
           swatch.style.color = `var(--${name})`;
           return element('li', {}, swatch, text);
         }), element('li', {text: 'foot of each chart: serving cell'})));
