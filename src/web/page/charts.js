@@ -78,7 +78,8 @@ class Chart {
       element('div', {class: 'head'}, element('h3', {text: title}), legend), this.plot);
   }
 
-  draw() {
+  drawOnce() {
+    if (this.graph) return;
     this.rows = chartRows(this.charts.drive, this.names);
     this.graph = new Dygraph(this.plot, this.rows, {
       labels: ['position', ...this.names],
@@ -212,12 +213,13 @@ class Charts {
   }
 
   repaint() {
-    for (const chart of this.charts) chart.graph.updateOptions(chart.looks());
+    for (const chart of this.drawnCharts) chart.graph.updateOptions(chart.looks());
   }
 
   /** What is drawn does not follow the style sheet of paper by itself: neither its colours nor its width. */
   setPrinting(isPrinting) {
     document.documentElement.classList.toggle('printing', isPrinting);
+    for (const chart of this.charts) chart.drawOnce();
     for (const chart of this.charts) chart.graph.resize();
     this.repaint();
   }
@@ -233,23 +235,35 @@ class Charts {
     if (layout === this.layout) {
       const window = this.range();
       this.isFollowing = true;
-      for (const chart of this.charts) chart.update(window);
+      for (const chart of this.drawnCharts) chart.update(window);
       this.isFollowing = false;
       return;
     }
     this.layout = layout;
-    for (const chart of this.charts) chart.graph.destroy();
+    for (const chart of this.drawnCharts) chart.graph.destroy();
     this.charts = groups.map(([group, names]) => new Chart(this, group, names));
     fill(this.section, this.controls, this.moment, this.note, ...this.charts.map((chart) => chart.frame),
       ...(this.charts.length ? [] : [element('p', {class: 'quiet', text: 'No level or power was measured.'})]));
-    for (const chart of this.charts) chart.draw();
+    this.drawNext(this.charts);
+  }
+
+  get drawnCharts() {
+    return this.charts.filter((chart) => chart.graph);
+  }
+
+  /** One after the other, each in a picture of its own: the first shows while the others are still to be drawn. */
+  drawNext(charts) {
+    const next = charts.find((chart) => !chart.graph);
+    if (!next || charts !== this.charts) return;
+    next.drawOnce();
+    requestAnimationFrame(() => setTimeout(() => this.drawNext(charts)));
   }
 
   show(window) {
     this.window = window;
     const shown = this.range();
     this.isFollowing = true;
-    for (const chart of this.charts) chart.graph.updateOptions({dateWindow: shown});
+    for (const chart of this.drawnCharts) chart.graph.updateOptions({dateWindow: shown});
     this.isFollowing = false;
   }
 
@@ -263,7 +277,7 @@ class Charts {
 
   /** A double click unzooms a chart: then all of them show the whole drive. */
   zoomed() {
-    if (this.charts.some((chart) => chart.graph.isZoomed('x'))) return;
+    if (this.drawnCharts.some((chart) => chart.graph.isZoomed('x'))) return;
     this.showWhole();
   }
 
@@ -323,7 +337,7 @@ class Charts {
     this.pointed = position;
     const cell = this.drive.cellAt(position);
     this.moment.textContent = `${dateAndTime(Math.round(this.drive.timeAt(position)))} UTC${cell ? `, ${cell}` : ''}`;
-    for (const chart of this.charts) chart.pointAt(position);
+    for (const chart of this.drawnCharts) chart.pointAt(position);
   }
 
   /** The last value at or before a position while it is known; else null. */
