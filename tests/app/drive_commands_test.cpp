@@ -129,6 +129,30 @@ TEST(DriveCommands, KeepAFileUntilAReportCanTakeItsPlace) {
   std::filesystem::remove_all(folder);
 }
 
+TEST(DriveCommands, TellWhoCanReadWhatTheyServe) {
+  struct Case {
+    std::vector<std::string> arguments;
+    std::string place;
+    std::string warning;
+  };
+  const std::string everybody = "vesk: everybody who reaches this machine";
+  for (const auto& [arguments, place, warning] : std::vector<Case>{
+           {{"--bind", "localhost"}, "http://localhost:", ""},
+           {{"--bind", "0.0.0.0"},
+            "http://127.0.0.1:",
+            "without a password, and the subscriber's identities; --redact"},
+           {{"--bind", "0.0.0.0", "--redact"}, "http://127.0.0.1:", "can read the measurements, without a password\n"},
+       }) {
+    std::vector<std::string> all{"serve", "--port", "0", "--seconds", "0.01"};
+    all.insert(all.end(), arguments.begin(), arguments.end());
+    const Finished finished = vesk(all);
+    EXPECT_EQ(finished.status, 0);
+    EXPECT_TRUE(finished.error.starts_with("vesk: serving " + place)) << finished.error;
+    EXPECT_EQ(finished.error.find(everybody) == std::string::npos, warning.empty()) << finished.error;
+    EXPECT_NE(finished.error.find(warning), std::string::npos) << finished.error;
+  }
+}
+
 TEST(DriveCommands, RefuseToServeWhereTheyCannot) {
   const Finished finished = vesk({"serve", "--bind", "everywhere", "--seconds", "1"});
   EXPECT_EQ(finished.error, "vesk: everywhere is no address\n");

@@ -4,6 +4,9 @@
 #include <array>
 #include <cerrno>
 #include <cstring>
+#include <ifaddrs.h>
+#include <memory>
+#include <net/if.h>
 #include <netinet/in.h>
 #include <netinet/tcp.h>
 #include <optional>
@@ -24,11 +27,12 @@ class SocketAddress {
     sockaddr_in four{};
     four.sin_family = AF_INET;
     four.sin_port = htons(port);
-    if (inet_pton(AF_INET, text.c_str(), &four.sin_addr) == 1) return address.holding(four);
+    const char* number = text == "localhost" ? "127.0.0.1" : text.c_str();
+    if (inet_pton(AF_INET, number, &four.sin_addr) == 1) return address.holding(four);
     sockaddr_in6 six{};
     six.sin6_family = AF_INET6;
     six.sin6_port = htons(port);
-    if (inet_pton(AF_INET6, text.c_str(), &six.sin6_addr) == 1) return address.holding(six);
+    if (inet_pton(AF_INET6, number, &six.sin6_addr) == 1) return address.holding(six);
     return std::nullopt;
   }
   static SocketAddress boundTo(int descriptor) {
@@ -85,6 +89,21 @@ void setOptions(const FileDescriptor& listener) {
     setsockopt(listener.get(), level, name, &value, sizeof value);
 }
 
+/// The number of an address; empty for one of another family, or that means nothing to other machines.
+std::string numberOf(const sockaddr& address) {
+  std::array<char, INET6_ADDRSTRLEN> text{};
+  if (address.sa_family == AF_INET) {
+    sockaddr_in four{};
+    std::memcpy(&four, &address, sizeof four);
+    inet_ntop(AF_INET, &four.sin_addr, text.data(), text.size());
+  } else if (address.sa_family == AF_INET6) {
+    sockaddr_in6 six{};
+    std::memcpy(&six, &address, sizeof six);
+    if (IN6_IS_ADDR_LINKLOCAL(&six.sin6_addr) == 0) inet_ntop(AF_INET6, &six.sin6_addr, text.data(), text.size());
+  }
+  return text.data();
+}
+
 }  // namespace
 
 FileDescriptor listenOn(const std::string& address, std::uint16_t port, std::string& reason) {
@@ -107,6 +126,26 @@ FileDescriptor listenOn(const std::string& address, std::uint16_t port, std::str
 
 std::uint16_t portOf(const FileDescriptor& listener) {
   return SocketAddress::boundTo(listener.get()).port();
+}
+
+bool isLocal(const std::string& address) {
+  return address == "localhost" || address == "::1" || address.starts_with("127.");
+}
+
+std::vector<std::string> reachableAddresses(const std::string& address) {
+  const bool isAnyFour = address == "0.0.0.0";
+  if (!isAnyFour && address != "::") return {address};
+  ifaddrs* first = nullptr;
+  if (getifaddrs(&first) != 0) return {};
+  const std::unique_ptr<ifaddrs, decltype(&freeifaddrs)> all(first, &freeifaddrs);
+  std::vector<std::string> addresses;
+  for (const ifaddrs* each = first; each != nullptr; each = each->ifa_next) {
+    const bool isOthers =
+        each->ifa_addr != nullptr && (each->ifa_flags & IFF_UP) != 0 && (each->ifa_flags & IFF_LOOPBACK) == 0;
+    if (!isOthers || (isAnyFour && each->ifa_addr->sa_family != AF_INET)) continue;
+    if (std::string number = numberOf(*each->ifa_addr); !number.empty()) addresses.push_back(std::move(number));
+  }
+  return addresses;
 }
 
 }  // namespace vesk::web
