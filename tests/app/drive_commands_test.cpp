@@ -72,12 +72,16 @@ TEST(DriveCommands, RefuseRulesThatAreNone) {
   EXPECT_EQ(option.status, 2);
 }
 
-TEST(DriveCommands, HaveHeadlessRunsJudgeRules) {
+TEST(DriveCommands, HaveRunsWithoutScreensJudgeRules) {
   const TemporaryFile recording(kDrive);
   const Finished finished =
       vesk({"--headless", "--replay", recording.path(), "--speed", "max", "--rule", "event technology"});
   EXPECT_NE(finished.output.find("\nAlert: event technology\n"), std::string::npos);
   EXPECT_EQ(finished.status, 3);
+  EXPECT_EQ(vesk({"serve", "--port", "0", "--replay", recording.path(), "--speed", "max", "--seconds", "0.3", "--rule",
+                  "event technology"})
+                .status,
+            3);
 }
 
 TEST(DriveCommands, WriteAReportThatIsOneFile) {

@@ -67,7 +67,7 @@ class Serving {
     // The connection outlives all that the service was made of here.
     service->shutDown();
     redaction_.tellLeftOut();
-    return outcome_;
+    return insight_.alerts() > 0 ? Outcome::ruleFired : outcome_;
   }
 
  private:
