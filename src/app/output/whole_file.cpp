@@ -36,7 +36,7 @@ std::string behindLinks(std::string path) {
     const ssize_t size = readlink(path.c_str(), link.data(), link.size());
     if (size <= 0) return path;
     const std::string next(link.data(), static_cast<std::size_t>(size));
-    path = next.starts_with('/') ? next : folderOf(path) + next;
+    path = (next.starts_with('/') ? std::string() : folderOf(path)).append(next);
   }
   return path;
 }

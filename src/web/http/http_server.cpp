@@ -55,13 +55,12 @@ void HttpServer::serve() {
     const auto found = visitors_.find(id);
     if (found == visitors_.end()) continue;
     Visitor& visitor = found->second;
-    if ((event.events & (EPOLLERR | EPOLLHUP)) != 0) {
-      drop(id);
-    } else if (visitor.isLeaving) {
+    const bool isGone = (event.events & (EPOLLERR | EPOLLHUP)) != 0;
+    if (!isGone && visitor.isLeaving) {
       hearOut(id, visitor);
-    } else if ((event.events & EPOLLIN) != 0) {
+    } else if (!isGone && (event.events & EPOLLIN) != 0) {
       receive(id, visitor);
-    } else if (!flush(id, visitor)) {
+    } else if (isGone || !flush(id, visitor)) {
       drop(id);
     } else {
       answerNext(id, visitor);
