@@ -118,6 +118,7 @@ def check_hostile(browser):
 def check_width(browser):
     browser.look(360, 800, "light")
     browser.wait(lambda: browser.run("return document.documentElement.scrollWidth") <= 360, "a page of 360 pixels")
+    demand(browser.run("const list = document.querySelector('#timeline .table'); return list.scrollWidth <= list.clientWidth"), "events are cut off")
 
 
 def check_paper(browser):
