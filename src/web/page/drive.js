@@ -10,6 +10,7 @@ class Drive {
   constructor(data) {
     Object.assign(this, data);
     this.kpiNamed = new Map(this.kpis.map((kpi) => [kpi.name, kpi]));
+    this.lengthAtFirst = this.length;
   }
 
   get end() {
@@ -30,9 +31,14 @@ class Drive {
     for (const [name, points] of Object.entries(news.series)) append(this.series[name] = this.series[name] || [], points);
   }
 
-  get isTooLong() {
+  /** Of what has most numbers. */
+  get length() {
     const all = [this.stretches, this.serving, ...Object.values(this.marks), ...Object.values(this.series)];
-    return all.some((each) => each.length > Drive.mostNumbers);
+    return Math.max(...all.map((each) => each.length));
+  }
+
+  get isTooLong() {
+    return this.length > Math.max(Drive.mostNumbers, 2 * this.lengthAtFirst);
   }
 
   /** The place in `stretches` of the one that a position lies in. */
