@@ -129,6 +129,7 @@ TEST(DriveCommands, KeepAFileUntilAReportCanTakeItsPlace) {
   EXPECT_EQ(contentOf(page), written);
   EXPECT_EQ(vesk({"report", recording, "-o", "/dev/full"}).error, "vesk: /dev/full: No space left on device\n");
   EXPECT_EQ(vesk({"report", recording, "-o", "/dev/stdout"}).output, written);
+  EXPECT_EQ(vesk({"report", recording, "-o", ""}).output, "");
   EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder), {}), 3) << "what was written aside is gone";
   std::filesystem::remove_all(folder);
 }

@@ -51,7 +51,7 @@ WholeFile::WholeFile(const std::optional<std::string>& path)
 void WholeFile::findPlace(const std::string& path) {
   Status status{};
   const bool isThere = stat(path.c_str(), &status) == 0;
-  if (!isThere && errno != ENOENT) return fail();
+  if (!isThere && (errno != ENOENT || path.empty())) return fail();
   // As /dev/stdout is, whatever that leads to.
   Status output{};
   if (isThere && fstat(STDOUT_FILENO, &output) == 0 && isSameRegularFile(status, output)) return;
