@@ -12,6 +12,7 @@ import threading
 import time
 
 MOST_MEMORY_MIB = 64
+SECONDS_ALONE = 2
 
 
 class Visitor:
@@ -36,23 +37,31 @@ class Visitor:
         self.is_open = bool(piece)
         self.bytes += len(piece)
         *whole, self.rest = (self.rest + piece).split(b"\n\n")
-        self.messages += len(whole)
-        if whole:
-            self.last = whole[-1]
+        told = [each for each in whole if b"data: " in each]
+        self.messages += len(told)
+        if told:
+            self.last = told[-1]
 
     def events(self):
         """How many events there were by the last message."""
         return json.loads(self.last.partition(b"data: ")[2])["drive"]["now"]["events"]
 
 
-def feed(stream, lap, seconds, count):
-    """Writes the lap over and over; `count` takes how many lines that were."""
-    end = time.monotonic() + seconds
-    lines = lap.count(b"\n")
-    while time.monotonic() < end:
-        stream.write(lap)
-        count[0] += lines
-    stream.flush()
+class Feeder(threading.Thread):
+    """Writes the lap over and over for as long; `count` is how many lines that were."""
+
+    def __init__(self, stream, lap, seconds):
+        super().__init__()
+        self.stream, self.lap, self.seconds = stream, lap, seconds
+        self.count = 0
+
+    def run(self):
+        end = time.monotonic() + self.seconds
+        lines = self.lap.count(b"\n")
+        while time.monotonic() < end:
+            self.stream.write(self.lap)
+            self.count += lines
+        self.stream.flush()
 
 
 def cost(process):
@@ -70,41 +79,49 @@ def start(vesk, *source):
     return process, ("127.0.0.1", port)
 
 
-def run(vesk, lap, visitor_count, seconds):
-    """The events, the processor seconds, the memory, the messages of a visitor and their bytes; what was wrong."""
+def watch(visitors, feeder):
+    """Lets them read until all have seen the last event, or nothing comes any more; what was wrong."""
+    ready = selectors.DefaultSelector()
+    for visitor in visitors:
+        ready.register(visitor.socket, selectors.EVENT_READ, visitor)
+    quiet_since = time.monotonic()
+    while feeder.is_alive() or time.monotonic() - quiet_since < 3:
+        for key, _ in ready.select(0.2):
+            quiet_since = time.monotonic()
+            key.data.read()
+            if not key.data.is_open:
+                return "a visitor who reads was dropped"
+        if not feeder.is_alive() and all(visitor.events() == feeder.count for visitor in visitors):
+            return None
+    return f"of {feeder.count} events the visitors saw {sorted({visitor.events() for visitor in visitors})}"
+
+
+def run(vesk, visitor_count, seconds):
+    """Prints what it cost; what was wrong."""
+    lap = subprocess.run([vesk, "simulate", "--seconds", "120"], stdout=subprocess.PIPE, check=True).stdout
     process, place = start(vesk, "--replay", "-", "--speed", "max")
-    faults = []
     try:
+        feeder = Feeder(process.stdin, lap, SECONDS_ALONE + seconds)
+        feeder.start()
+        time.sleep(SECONDS_ALONE)
+        alone, (processor_alone, _) = feeder.count, cost(process)
         visitors = [Visitor(place) for _ in range(visitor_count)]
         deaf = Visitor(place, reads=False)
-        fed = [0]
-        feeder = threading.Thread(target=feed, args=(process.stdin, lap, seconds, fed))
-        feeder.start()
-        ready = selectors.DefaultSelector()
-        for visitor in visitors:
-            ready.register(visitor.socket, selectors.EVENT_READ, visitor)
-        quiet_since = time.monotonic()
-        # Three seconds without news after the last event: all has been said.
-        while feeder.is_alive() or time.monotonic() - quiet_since < 3:
-            for key, _ in ready.select(0.2):
-                quiet_since = time.monotonic()
-                key.data.read()
-                if not key.data.is_open:
-                    faults.append("a visitor who reads was dropped")
-                    ready.unregister(key.data.socket)
+        faults = [watch(visitors, feeder)]
         processor, memory = cost(process)
-        if visitors and {visitor.events() for visitor in visitors} != {fed[0]}:
-            faults.append(f"of {fed[0]} events the visitors saw {sorted({visitor.events() for visitor in visitors})}")
         if seconds > 25 and not was_dropped(deaf):
             faults.append("a visitor who does not read was kept")
         if memory > MOST_MEMORY_MIB:
             faults.append(f"{memory:.0f} MiB of memory, more than {MOST_MEMORY_MIB}")
-        one = visitors[0] if visitors else deaf
-        return fed[0], processor, memory, one.messages, one.bytes, faults
     finally:
         process.stdin.close()
         process.terminate()
         process.wait()
+    events, per_event = feeder.count - alone, processor_alone / alone
+    print(f"alone: {alone} events, {1e6 * per_event:.2f} us of processor an event")
+    print(f"{visitor_count} visitors: {events} events, {1e6 * (processor - processor_alone) / events:.2f} us of processor an event, "
+          f"{memory:.0f} MiB, {visitors[0].messages} messages and {visitors[0].bytes / 1e6:.1f} MB a visitor")
+    return "; ".join(fault for fault in faults if fault)
 
 
 def was_dropped(deaf):
@@ -120,21 +137,5 @@ def was_dropped(deaf):
         return False
 
 
-def main(vesk, visitor_count, seconds):
-    lap = subprocess.run([vesk, "simulate", "--seconds", "120"], stdout=subprocess.PIPE, check=True).stdout
-    faults = []
-    alone = {}
-    for count in (0, int(visitor_count)):
-        events, processor, memory, messages, size, wrong = run(vesk, lap, count, float(seconds))
-        faults += wrong
-        print(f"{count:3} visitors: {events} events, {1e6 * processor / events:.2f} us of processor an event, "
-              f"{memory:.0f} MiB, {messages} messages and {size / 1e6:.1f} MB a visitor")
-        if count == 0:
-            alone = processor / events
-        elif count:
-            print(f"a visitor costs {1e3 * (processor - alone * events) / count / float(seconds):.2f} ms of processor a second")
-    return "; ".join(faults)
-
-
 if __name__ == "__main__":
-    sys.exit(main(*sys.argv[1:]) or 0)
+    sys.exit(run(sys.argv[1], int(sys.argv[2]), float(sys.argv[3])) or 0)

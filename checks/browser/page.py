@@ -1,11 +1,14 @@
 """page.py VESK PICTURES: the report and the live page as their readers use them. Ends with what went wrong."""
 
+import http.server
 import pathlib
 import re
 import subprocess
 import sys
 import tempfile
+import threading
 import time
+import urllib.request
 
 from browser import Browser
 
@@ -115,6 +118,19 @@ def check_hostile(browser):
 def check_width(browser):
     browser.look(360, 800, "light")
     browser.wait(lambda: browser.run("return document.documentElement.scrollWidth") <= 360, "a page of 360 pixels")
+    demand(browser.run("const list = document.querySelector('#timeline .table'); return list.scrollWidth <= list.clientWidth"), "events are cut off")
+
+
+def check_paper(browser):
+    """On paper a page is light and unfolded, also where the screen is dark."""
+    look = "const style = getComputedStyle(document.documentElement); return [style.getPropertyValue('--text').trim(), style.getPropertyValue('--series-1').trim(), document.querySelectorAll('details:not([open], .menu)').length]"
+    browser.look(1280, 1000, "dark")
+    dark = browser.wait(lambda: (now := browser.run(look))[0] == "#e3e6e9" and now, "a dark screen")
+    browser.run("addEventListener('beforeprint', () => { window.paper = (() => {" + look + "})(); })")
+    browser.command("Page.printToPDF")
+    paper = browser.run("return window.paper")
+    demand(paper == ["#1b1f23", "#0b5fa5", 0], f"on paper: {paper}")
+    browser.wait(lambda: browser.run(look) == dark, "the screen as it was")
 
 
 def take_pictures(browser, pictures, name):
@@ -143,14 +159,17 @@ def check_report(browser, vesk, scratch, pictures):
     browser.run("for (const fold of document.querySelectorAll('#screens details')) fold.open = true")
     browser.wait(lambda: browser.run("return document.querySelectorAll('#screens .number, #screens td').length > 50"), "the screens")
     check_hostile(browser)
+    browser.run("for (const fold of document.querySelectorAll('#screens details')) fold.open = false")
+    demand(browser.run("return document.querySelectorAll('details:not([open])').length") > 20, "screens that are folded")
+    check_paper(browser)
     check_width(browser)
     take_pictures(browser, pictures, "report")
     check_clean(browser, page.as_uri())
 
 
-def serve(vesk, *arguments):
+def serve(vesk, *arguments, port=0):
     """The program and where its page is."""
-    process = subprocess.Popen([vesk, "serve", "--port", "0", *arguments], stderr=subprocess.PIPE, text=True)
+    process = subprocess.Popen([vesk, "serve", "--port", str(port), *arguments], stderr=subprocess.PIPE, text=True)
     return process, re.search(r"http://\S+(?=;)", process.stderr.readline()).group()
 
 
@@ -169,12 +188,56 @@ def check_live(browser, vesk, scratch, pictures):
         browser.wait(lambda: browser.run(row) != shown, "the screen to go on")
         browser.wait(lambda: browser.run("return document.querySelectorAll('#cells tbody tr').length"), "the cells")
         check_width(browser)
+        check_hidden(browser, place)
+        browser.look(1280, 1000, "light")
+        check_paper(browser)
         take_pictures(browser, pictures, "live")
         check_clean(browser, place)
     finally:
         process.terminate()
         process.wait()
-    browser.wait(lambda: "lost" in browser.run("return document.querySelector('#state').textContent"), "the loss of the connection to be told")
+    check_connects_again(browser, vesk, place)
+
+
+def check_hidden(browser, place):
+    """A page that nobody sees gives its connections back."""
+    hide = "Object.defineProperty(document, 'hidden', {configurable: true, value: arguments[0]}); document.dispatchEvent(new Event('visibilitychange'))"
+    visitors = lambda: int(re.search(r"^vesk_visitors (\d+)", urllib.request.urlopen(place + "/metrics").read().decode(), re.M).group(1))
+    # He who asks is one of them, and connections without an answer under way stay open for a while.
+    seen = visitors()
+    browser.run(hide, True)
+    browser.wait(lambda: visitors() <= seen - 2, "the connections of a page that is hidden to be closed")
+    browser.run(hide, False)
+    browser.wait(lambda: visitors() >= seen, "the connections of a page that is seen again")
+
+
+class Refusing(http.server.BaseHTTPRequestHandler):
+    def do_GET(self):
+        self.server.refused += 1
+        self.send_error(503)
+
+    def log_message(self, *_):
+        pass
+
+
+def check_connects_again(browser, vesk, place):
+    """Also when somebody has answered in between that it is not possible, where a browser gives up."""
+    state = "return document.querySelector('#state').textContent"
+    browser.wait(lambda: browser.run(state).startswith("not connected"), "the loss of the connection to be told")
+    port = int(place.rpartition(":")[2])
+    with http.server.ThreadingHTTPServer(("127.0.0.1", port), Refusing) as refusing:
+        refusing.refused = 0
+        threading.Thread(target=refusing.serve_forever).start()
+        try:
+            browser.wait(lambda: refusing.refused >= 2, "a refusal")
+        finally:
+            refusing.shutdown()
+    process, _ = serve(vesk, port=port)
+    try:
+        browser.wait(lambda: browser.run(state).startswith("simulated"), "the page to connect again")
+    finally:
+        process.terminate()
+        process.wait()
 
 
 def check_hostile_live(browser, vesk, scratch):

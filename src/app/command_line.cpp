@@ -118,7 +118,8 @@ class CommandLine {
         ->type_name("N")
         ->check(CLI::Range(0, 65535).description(""))
         ->default_str("8080");
-    serve->add_option("--bind", serve_.server.address, "Listen here; anywhere but 127.0.0.1 others can read it all")
+    serve
+        ->add_option("--bind", serve_.server.address, "Listen here; 0.0.0.0 lets everybody in who reaches this machine")
         ->type_name("ADDRESS")
         ->default_str("127.0.0.1");
     serve->add_option("--host", serve_.server.names, "A name of this machine that browsers may ask for")

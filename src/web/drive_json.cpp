@@ -1,6 +1,7 @@
 #include "web/drive_json.h"
 
 #include <array>
+#include <span>
 #include <string_view>
 
 #include "insight/enumeration_names.h"
@@ -154,24 +155,23 @@ void writeNow(JsonWriter& json, const insight::Insight& insight) {
   fields.end();
 }
 
-}  // namespace
-
-void appendDriveJson(std::string& out, const DriveRecord& record, const insight::Insight& insight) {
-  JsonWriter json(out);
-  JsonObject drive(json);
-  drive.plainKey("kpis");
-  writeKpiDescriptions(json);
+/// What both forms have: from `firstCell` on the cells' names.
+void writeDrive(JsonWriter& json, JsonObject& drive, const DriveRecord& record, const insight::Insight& insight,
+                std::size_t firstCell) {
   drive.plainKey("stretches");
   Pairs stretches(json);
-  for (const StretchBegin& each : record.stretches()) {
+  for (const StretchBegin& each : record.stretches().begins()) {
     stretches.addPosition(each.position);
     stretches.addPosition(each.time);
   }
   stretches.end();
+  drive.plainKey("time_error");
+  json.write(record.stretches().error());
   drive.plainKey("series");
   writeSeries(json, record);
   drive.plainKey("cells");
-  writeJsonArray(json, record.cells(), [&](const std::string& cell) { json.write(std::string_view(cell)); });
+  writeJsonArray(json, std::span(record.cells()).subspan(firstCell),
+                 [&](const std::string& cell) { json.write(std::string_view(cell)); });
   drive.plainKey("serving");
   writeServing(json, record);
   drive.plainKey("marks");
@@ -182,6 +182,22 @@ void appendDriveJson(std::string& out, const DriveRecord& record, const insight:
   writeNow(json, insight);
   drive.end();
   json.finish();
+}
+
+}  // namespace
+
+void appendDriveJson(std::string& out, const DriveRecord& record, const insight::Insight& insight) {
+  JsonWriter json(out);
+  JsonObject drive(json);
+  drive.plainKey("kpis");
+  writeKpiDescriptions(json);
+  writeDrive(json, drive, record, insight, 0);
+}
+
+void appendNewsJson(std::string& out, const DriveRecord& record, const insight::Insight& insight) {
+  JsonWriter json(out);
+  JsonObject drive(json);
+  writeDrive(json, drive, record, insight, record.firstNewCell());
 }
 
 }  // namespace vesk::web

@@ -31,6 +31,7 @@ void MeasuredPoint::absorb(const MeasuredPoint& later) {
 
 DriveRecord::DriveRecord(const RecordLimits& limits)
     : limits_(limits),
+      stretches_(limits.stretches),
       courses_(insight::kKpiCount, Thinned<MeasuredPoint>(limits.points)),
       serving_(limits.points),
       marks_(kMarkCount, Thinned<MarkPoint>(limits.points)) {}
@@ -41,7 +42,7 @@ void DriveRecord::take(const insight::Insight& insight, const insight::Report& r
   const std::int64_t position = insight.clock().counted();
   if (insight.clock().stretches() != stretchCount_) {
     stretchCount_ = insight.clock().stretches();
-    if (stretches_.size() < kMostStretches) stretches_.push_back({position, insight.now().value_or(0)});
+    stretches_.add({position, insight.now().value_or(0)});
   }
   for (const auto& [kpi, value] : report.kpis)
     courses_[insight::indexOf(kpi)].add({position, position, value, position, value});
@@ -83,6 +84,7 @@ void DriveRecord::clear() {
   for (Thinned<MeasuredPoint>& course : courses_)
     course.clear();
   serving_.clear();
+  firstNewCell_ = cells_.size();
   for (Thinned<MarkPoint>& mark : marks_)
     mark.clear();
   for (auto& ofKind : events_)

@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "insight/insight.h"
+#include "web/stretches.h"
 #include "web/thinned.h"
 
 namespace vesk::web {
@@ -46,18 +47,13 @@ struct MarkPoint {
 enum class Mark : std::uint8_t { cellChange, reestablishment, drop, technologyChange };
 inline constexpr std::size_t kMarkCount = 4;
 
-/// Where a stretch of the drive begins: its charts run over counted time, without the gaps between.
-struct StretchBegin {
-  std::int64_t position;
-  std::int64_t time;
-};
-
 /// How much of a drive is kept.
 struct RecordLimits {
   /// Of each KPI, of the serving cells and of each mark: as many as a wide screen has pixels.
   std::size_t points;
   /// Of each kind of event. The last are kept.
   std::size_t eventsOfKind;
+  std::size_t stretches = 10'000;
 };
 
 inline constexpr RecordLimits kWholeDrive{4096, 2000};
@@ -83,12 +79,14 @@ class DriveRecord {
   /// Nothing was taken since it was made or cleared.
   [[nodiscard]] bool isEmpty() const { return !hasTaken_; }
 
-  [[nodiscard]] const std::vector<StretchBegin>& stretches() const { return stretches_; }
+  [[nodiscard]] const Stretches& stretches() const { return stretches_; }
   [[nodiscard]] const std::vector<MeasuredPoint>& course(insight::Kpi kpi) const {
     return courses_[insight::indexOf(kpi)].points();
   }
   [[nodiscard]] const std::vector<ServingPoint>& serving() const { return serving_.points(); }
   [[nodiscard]] const std::vector<std::string>& cells() const { return cells_; }
+  /// Where in cells() those begin that served for the first time since it was made or cleared.
+  [[nodiscard]] std::size_t firstNewCell() const { return firstNewCell_; }
   [[nodiscard]] const std::vector<MarkPoint>& marks(Mark mark) const {
     return marks_[static_cast<std::size_t>(mark)].points();
   }
@@ -98,7 +96,6 @@ class DriveRecord {
  private:
   /// Cells beyond these have no name in the band; damage alone brings so many.
   static constexpr std::size_t kMostCells = 4096;
-  static constexpr std::size_t kMostStretches = 10'000;
 
   void takeServing(const std::optional<insight::ServingCell>& cell, std::int64_t position);
   [[nodiscard]] std::optional<std::size_t> numberOf(const insight::ServingCell& cell);
@@ -107,12 +104,13 @@ class DriveRecord {
   RecordLimits limits_;
   bool hasTaken_ = false;
   std::uint64_t stretchCount_ = 0;
-  std::vector<StretchBegin> stretches_;
+  Stretches stretches_;
   std::vector<Thinned<MeasuredPoint>> courses_;
   Thinned<ServingPoint> serving_;
   /// The cell of the step before.
   std::optional<std::pair<insight::Technology, insight::CellIdentity>> servingNow_;
   std::vector<std::string> cells_;
+  std::size_t firstNewCell_ = 0;
   std::map<std::string, std::size_t, std::less<>> cellNumbers_;
   std::vector<Thinned<MarkPoint>> marks_;
   std::uint64_t eventCount_ = 0;

@@ -17,6 +17,9 @@ constexpr std::chrono::milliseconds kNewsInterval{500};
 constexpr RecordLimits kNews{32, 50};
 constexpr RecordLimits kLiveDrive{4096, 200};
 
+/// A connection that says nothing for long is cut on its way, and nobody notices when its visitor is gone.
+constexpr std::chrono::seconds kLongestSilence{15};
+
 constexpr std::string_view kJson = "application/json; charset=utf-8";
 constexpr std::string_view kStream = "text/event-stream; charset=utf-8";
 constexpr std::string_view kScript = "text/javascript; charset=utf-8";
@@ -48,6 +51,23 @@ std::string servedPage() {
   return page;
 }
 
+/// The answers that never change, by their paths: all who ask share them.
+const std::map<std::string_view, Response>& pageParts() {
+  static const std::map<std::string_view, Response> kParts = [] {
+    const auto part = [](std::string_view type, std::string content) {
+      return Response{.type = type, .body = shared(std::move(content))};
+    };
+    return std::map<std::string_view, Response>{
+        {"/", part("text/html; charset=utf-8", servedPage())},
+        {"/page.css", part("text/css; charset=utf-8", std::string(kPageStyle.content))},
+        {"/icon.svg", part("image/svg+xml", std::string(kPageIcon.content))},
+        {"/charts.js", part(kScript, std::string(kChartScript.content))},
+        {"/page.js", part(kScript, std::string(kPageScript.content))},
+    };
+  }();
+  return kParts;
+}
+
 }  // namespace
 
 struct LiveServer::Route {
@@ -73,6 +93,7 @@ LiveServer::~LiveServer() {
 
 void LiveServer::start(std::unique_ptr<HttpServer> server) {
   server_ = std::move(server);
+  server_->setRemarkHandler(std::move(sources_.remark));
   server_->setStreamEndHandler([this](StreamId stream) {
     watchers_.erase(stream);
     walks_.erase(stream);
@@ -83,7 +104,10 @@ void LiveServer::start(std::unique_ptr<HttpServer> server) {
     sendNews();
     sendScreens();
   });
-  idleTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { server_->dropSlow(); });
+  tendTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] {
+    server_->tend();
+    server_->sendToQuiet(kLongestSilence, silence_);
+  });
 }
 
 void LiveServer::take(const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
@@ -91,11 +115,11 @@ void LiveServer::take(const insight::Report& report, const std::vector<insight::
   news_.take(sources_.insight, report, events);
 }
 
-std::string LiveServer::driveMessage(std::string_view event, const DriveRecord& record) const {
+std::string LiveServer::driveMessage(std::string_view event, const DriveRecord& record, AppendDrive append) const {
   std::string message = "event: " + std::string(event) + "\ndata: {\"state\":";
   appendJson(message, std::string_view(sources_.state()));
   message += ",\"drive\":";
-  appendDriveJson(message, record, sources_.insight);
+  append(message, record, sources_.insight);
   return message + "}\n\n";
 }
 
@@ -112,7 +136,7 @@ void LiveServer::sendNews() {
   std::string state = sources_.state();
   const bool isNothingNew = news_.isEmpty() && state == lastState_;
   if (!watchers_.empty() && !isNothingNew) {
-    const SharedText message = shared(driveMessage("news", news_));
+    const SharedText message = shared(driveMessage("news", news_, appendNewsJson));
     const std::vector<StreamId> watchers(watchers_.begin(), watchers_.end());
     for (const StreamId watcher : watchers)
       server_->send(watcher, message);
@@ -152,20 +176,26 @@ Response LiveServer::answer(const Request& request) {
   return route == kRoutes.end() ? plainResponse(404, "There is no such page.") : (this->*route->answer)(request);
 }
 
+template <class Write>
+Response LiveServer::kept(const Request& request, Write write) {
+  Kept& kept = kept_[request.path];
+  if (const std::uint64_t events = sources_.insight.counts().all; kept.text == nullptr || kept.events != events) {
+    std::string text;
+    write(text);
+    kept = {events, shared(std::move(text))};
+  }
+  return {.type = kJson, .body = kept.text};
+}
+
 Response LiveServer::page(const Request& request) {
-  if (request.path == "/page.css")
-    return {.type = "text/css; charset=utf-8", .body = shared(std::string(kPageStyle.content))};
-  if (request.path == "/icon.svg") return {.type = "image/svg+xml", .body = shared(std::string(kPageIcon.content))};
-  if (request.path == "/charts.js") return {.type = kScript, .body = shared(std::string(kChartScript.content))};
-  if (request.path == "/page.js") return {.type = kScript, .body = shared(std::string(kPageScript.content))};
-  return {.type = "text/html; charset=utf-8", .body = shared(servedPage())};
+  return pageParts().at(request.path);
 }
 
 /// News that were not sent yet are sent to a new watcher nevertheless: so the others' are sent first.
 Response LiveServer::beginDrive(const Request& /*request*/) {
   if (beginning_ == nullptr) {
     if (!news_.isEmpty()) sendNews();
-    beginning_ = shared(driveMessage("drive", whole_));
+    beginning_ = shared(driveMessage("drive", whole_, appendDriveJson));
   }
   return {.type = kStream, .body = beginning_, .begin = [this](StreamId stream) { watchers_.insert(stream); }};
 }
@@ -186,7 +216,11 @@ Response LiveServer::menu(const Request& /*request*/) {
 
 Response LiveServer::screens(const Request& request) {
   if (request.query.empty())
-    return jsonResponse([&](JsonWriter& json) { writeScreensJson(json, sources_.layout, sources_.readings); });
+    return kept(request, [&](std::string& out) {
+      JsonWriter json(out);
+      writeScreensJson(json, sources_.layout, sources_.readings);
+      json.finish();
+    });
   ScreenWalk walk(sources_.layout);
   if (!walk.open(request.parameter("area"), request.parameter("category")))
     return plainResponse(404, "There is no such screen; /api/menu tells which there are.");
@@ -204,14 +238,12 @@ Response LiveServer::timeline(const Request& /*request*/) {
   });
 }
 
-Response LiveServer::series(const Request& /*request*/) {
-  std::string json;
-  appendDriveJson(json, whole_, sources_.insight);
-  return {.type = kJson, .body = shared(std::move(json))};
+Response LiveServer::series(const Request& request) {
+  return kept(request, [&](std::string& out) { appendDriveJson(out, whole_, sources_.insight); });
 }
 
-Response LiveServer::summary(const Request& /*request*/) {
-  return {.type = kJson, .body = shared(insight::summaryJson(sources_.insight))};
+Response LiveServer::summary(const Request& request) {
+  return kept(request, [&](std::string& out) { out = insight::summaryJson(sources_.insight); });
 }
 
 Response LiveServer::metrics(const Request& /*request*/) {

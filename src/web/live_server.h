@@ -25,6 +25,8 @@ struct LiveSources {
   RowReadings readings;
   /// What the source of the events is at: "simulated", "replaying 3:12 of 9:40".
   std::function<std::string()> state;
+  /// Told what keeps visitors away, in one line. May be null.
+  std::function<void(const std::string& reason)> remark{};
 };
 
 /// Serves the live page, its JSON and the metrics for Prometheus, on the main run loop. Whatever a visitor is shown is
@@ -52,13 +54,23 @@ class LiveServer {
     bool isChanged = false;
   };
 
+  /// An answer that stays the same until another event has come.
+  struct Kept {
+    std::uint64_t events = 0;
+    SharedText text;
+  };
+
   explicit LiveServer(LiveSources sources);
   void start(std::unique_ptr<HttpServer> server);
   void sendNews();
   void sendScreens();
-  [[nodiscard]] std::string driveMessage(std::string_view event, const DriveRecord& record) const;
+  using AppendDrive = void (*)(std::string& out, const DriveRecord& record, const insight::Insight& insight);
+  [[nodiscard]] std::string driveMessage(std::string_view event, const DriveRecord& record, AppendDrive append) const;
   [[nodiscard]] std::string screenMessage(const ScreenWalk& walk) const;
 
+  /// What `write` appends to a text, written once for all who ask until another event has come.
+  template <class Write>
+  [[nodiscard]] Response kept(const Request& request, Write write);
   [[nodiscard]] Response beginDrive(const Request& request);
   [[nodiscard]] Response beginScreen(const Request& request);
   [[nodiscard]] Response menu(const Request& request);
@@ -81,8 +93,12 @@ class LiveServer {
   std::map<StreamId, Walk> walks_;
   /// The beginning of a watcher's stream, for those who come before the next news.
   SharedText beginning_;
+  /// By path.
+  std::map<std::string, Kept, std::less<>> kept_;
+  /// A comment of an event stream.
+  SharedText silence_ = std::make_shared<const std::string>(":\n\n");
   std::optional<Timer> newsTimer_;
-  std::optional<Timer> idleTimer_;
+  std::optional<Timer> tendTimer_;
 };
 
 }  // namespace vesk::web

@@ -1,5 +1,8 @@
 // The commands that tell what a drive was, as a user runs them.
 
+#include <filesystem>
+#include <fstream>
+
 #include "app/vesk_program.h"
 
 namespace vesk {
@@ -69,12 +72,16 @@ TEST(DriveCommands, RefuseRulesThatAreNone) {
   EXPECT_EQ(option.status, 2);
 }
 
-TEST(DriveCommands, HaveHeadlessRunsJudgeRules) {
+TEST(DriveCommands, HaveRunsWithoutScreensJudgeRules) {
   const TemporaryFile recording(kDrive);
   const Finished finished =
       vesk({"--headless", "--replay", recording.path(), "--speed", "max", "--rule", "event technology"});
   EXPECT_NE(finished.output.find("\nAlert: event technology\n"), std::string::npos);
   EXPECT_EQ(finished.status, 3);
+  EXPECT_EQ(vesk({"serve", "--port", "0", "--replay", recording.path(), "--speed", "max", "--seconds", "0.3", "--rule",
+                  "event technology"})
+                .status,
+            3);
 }
 
 TEST(DriveCommands, WriteAReportThatIsOneFile) {
@@ -91,6 +98,64 @@ TEST(DriveCommands, WriteAReportThatIsOneFile) {
   finished = vesk({"report", "-o", page.path() + "/none"}, kDrive);
   EXPECT_EQ(finished.error, "vesk: " + page.path() + "/none: Not a directory\n");
   EXPECT_EQ(finished.status, 1);
+}
+
+TEST(DriveCommands, KeepAFileUntilAReportCanTakeItsPlace) {
+  const std::filesystem::path folder = testing::TempDir() + "vesk-report-" + std::to_string(getpid());
+  std::filesystem::create_directory(folder);
+  const std::string recording = folder / "drive.jsonl";
+  const std::string page = folder / "page.html";
+  const std::string link = folder / "link";
+  std::filesystem::create_symlink("page.html", link);
+  const auto contentOf = [](const std::string& path) {
+    std::ifstream file(path);
+    return std::string(std::istreambuf_iterator<char>(file), {});
+  };
+  std::ofstream(recording) << kDrive;
+  std::filesystem::create_hard_link(recording, page);
+  for (const std::string& output : {recording, page, link}) {
+    EXPECT_EQ(vesk({"report", recording, "-o", output}).status, 2) << output;
+    EXPECT_EQ(contentOf(recording), kDrive);
+  }
+  std::filesystem::remove(page);
+  EXPECT_EQ(vesk({"report", recording, "-o", link}).status, 0) << "a link to nothing yet";
+  EXPECT_TRUE(std::filesystem::is_symlink(link));
+  EXPECT_EQ(std::filesystem::status(page).permissions(), std::filesystem::perms(0600));
+  const std::string written = contentOf(page);
+  EXPECT_TRUE(written.ends_with("</html>\n\n")) << written.substr(written.size() - 20);
+  for (const std::string& input : {recording + "x", std::string("/dev/null/x"), folder.string()})
+    EXPECT_EQ(vesk({"report", input, "-o", page}).status, 1) << input;
+  EXPECT_EQ(vesk({"report", "-o", page}, "no recording\n").status, 1);
+  EXPECT_EQ(contentOf(page), written);
+  EXPECT_EQ(vesk({"report", recording, "-o", "/dev/full"}).error, "vesk: /dev/full: No space left on device\n");
+  EXPECT_EQ(vesk({"report", recording, "-o", "/dev/stdout"}).output, written);
+  EXPECT_EQ(vesk({"report", recording, "-o", ""}).output, "");
+  EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder), {}), 3) << "what was written aside is gone";
+  std::filesystem::remove_all(folder);
+}
+
+TEST(DriveCommands, TellWhoCanReadWhatTheyServe) {
+  struct Case {
+    std::vector<std::string> arguments;
+    std::string place;
+    std::string warning;
+  };
+  const std::string everybody = "vesk: everybody who reaches this machine";
+  for (const auto& [arguments, place, warning] : std::vector<Case>{
+           {{"--bind", "localhost"}, "http://localhost:", ""},
+           {{"--bind", "0.0.0.0"},
+            "http://127.0.0.1:",
+            "without a password, and the subscriber's identities; --redact"},
+           {{"--bind", "0.0.0.0", "--redact"}, "http://127.0.0.1:", "can read the measurements, without a password\n"},
+       }) {
+    std::vector<std::string> all{"serve", "--port", "0", "--seconds", "0.01"};
+    all.insert(all.end(), arguments.begin(), arguments.end());
+    const Finished finished = vesk(all);
+    EXPECT_EQ(finished.status, 0);
+    EXPECT_TRUE(finished.error.starts_with("vesk: serving " + place)) << finished.error;
+    EXPECT_EQ(finished.error.find(everybody) == std::string::npos, warning.empty()) << finished.error;
+    EXPECT_NE(finished.error.find(warning), std::string::npos) << finished.error;
+  }
 }
 
 TEST(DriveCommands, RefuseToServeWhereTheyCannot) {

@@ -79,7 +79,7 @@ TEST(DriveRecord, RunsOverCountedTimeAndMarksWhatHappened) {
                              lteCell(100'000'000, 850, 7)});
   const std::string json = drive.json();
   for (const char* part :
-       {R"("stretches":[0,1516485160000,1300,1516585160000])",
+       {R"("stretches":[0,1516485160000,1300,1516585160000],"time_error":0)",
         R"("series":{"lte.rsrp":[500,-125],"lte.rsrq":[500,-20]})",
         R"("cells":["PCI 443 B2 850","PCI 271 B17 5815","PCI 7 B2 850"],"serving":[0,0,1100,1,1300,2])",
         R"("marks":{"change":[1100],"reestablished":[1200],"drop":[1300],"technology":[0,1300]})",
@@ -87,16 +87,43 @@ TEST(DriveRecord, RunsOverCountedTimeAndMarksWhatHappened) {
     EXPECT_NE(json.find(part), std::string::npos) << part << " is not in\n" << json;
 }
 
+TEST(DriveRecord, KeepsTimesRightInABoundedNumberOfStretches) {
+  std::vector<DriveEvent> events;
+  std::int64_t time = 0;
+  for (int at = 0; at < 3000; ++at)
+    events.push_back(lteLevel(time += at % 3 == 0 ? 70'000 + at * 10 : 1000, -90, -10));
+  const RecordedDrive whole(events);
+  EXPECT_EQ(whole.record.stretches().begins().size(), 1000U);
+  EXPECT_EQ(whole.record.stretches().error(), 0);
+  const RecordedDrive drive(events, {4096, 100, 64});
+  const auto& kept = drive.record.stretches().begins();
+  EXPECT_LE(kept.size(), 64U);
+  EXPECT_GT(kept.size(), 16U);
+  const std::int64_t error = drive.record.stretches().error();
+  EXPECT_LT(error, time / 16);
+  std::size_t at = 0;
+  std::int64_t before = 0;
+  for (const StretchBegin& each : whole.record.stretches().begins()) {
+    while (at + 1 < kept.size() && kept[at + 1].position <= each.position)
+      ++at;
+    const std::int64_t told = each.position + kept[at].shift();
+    EXPECT_LE(std::abs(told - each.time), error) << each.position;
+    EXPECT_GE(told, std::exchange(before, told));
+  }
+}
+
 TEST(DriveRecord, TellsNewsAloneAfterItWasCleared) {
   RecordedDrive drive({lteCell(0, 850, 443), lteLevel(500, -125, -20)});
   drive.record.clear();
   EXPECT_TRUE(drive.record.isEmpty());
-  drive.drive.play({lteLevel(900, -100, -10)});
+  drive.drive.play({lteLevel(900, -100, -10), lteCell(1000, 5815, 271)});
   EXPECT_FALSE(drive.record.isEmpty());
-  const std::string json = drive.json();
-  for (const char* part : {R"("stretches":[],"series":{"lte.rsrp":[900,-100],"lte.rsrq":[900,-10]})",
-                           R"("cells":["PCI 443 B2 850"],"serving":[])", R"("events":[])"})
+  std::string json;
+  appendNewsJson(json, drive.record, drive.drive.insight);
+  for (const char* part : {R"({"stretches":[],"time_error":0,"series":{"lte.rsrp":[900,-100],"lte.rsrq":[900,-10]})",
+                           R"("cells":["PCI 271 B17 5815"],"serving":[1000,1])", R"("events":[[1000,)"})
     EXPECT_NE(json.find(part), std::string::npos) << part << " is not in\n" << json;
+  EXPECT_NE(drive.json().find(R"({"kpis":[{"name":"lte.rsrp")"), std::string::npos);
 }
 
 TEST(PrometheusText, TellsKnownKpisWithTheirCellAndCountsWhatHappened) {

@@ -77,6 +77,16 @@ TEST_F(LiveServerTest, AnswersEveryPath) {
     EXPECT_EQ(ask(unknown).status, 404) << unknown;
 }
 
+TEST_F(LiveServerTest, SharesAnAnswerUntilAnotherEventComes) {
+  for (const char* target : {"/api/series", "/api/summary", "/api/screens"}) {
+    const SharedText first = ask(target).body;
+    EXPECT_EQ(ask(target).body, first) << target;
+    drive_.play({lteLevel(700, -120, -20)});
+    EXPECT_NE(ask(target).body, first) << target;
+  }
+  EXPECT_EQ(ask("/charts.js").body, ask("/charts.js").body);
+}
+
 TEST_F(LiveServerTest, LetsNoTextOfAPayloadLeaveItsPlace) {
   std::string page;
   writeReport({std::string(kHostile), DriveRecord(kWholeDrive), drive_.insight, interface_.layout(), {}},

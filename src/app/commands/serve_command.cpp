@@ -15,19 +15,27 @@
 #include "system/run_loop.h"
 #include "system/timer.h"
 #include "toolkit/application.h"
+#include "web/http/listener.h"
 #include "web/live_server.h"
 
 namespace vesk {
 
 namespace {
 
-bool isLocal(const std::string& address) {
-  return address == "::1" || address.starts_with("127.");
+/// Where a browser on this machine finds a page that is served at `address`.
+std::string placeOf(const std::string& address, std::uint16_t port) {
+  std::string host = address;
+  if (address.find(':') != std::string::npos) host = address == "::" ? "[::1]" : "[" + address + "]";
+  if (address == "0.0.0.0") host = "127.0.0.1";
+  return "http://" + host + ":" + std::to_string(port);
 }
 
-std::string placeOf(const std::string& address, std::uint16_t port) {
-  const std::string host = address.find(':') == std::string::npos ? address : "[" + address + "]";
-  return "http://" + host + ":" + std::to_string(port);
+/// "10.0.0.21, 192.168.1.4".
+std::string listOf(const std::vector<std::string>& words) {
+  std::string list;
+  for (const std::string& word : words)
+    list.append(list.empty() ? "" : ", ").append(word);
+  return list;
 }
 
 /// One run of the program behind its page.
@@ -59,15 +67,18 @@ class Serving {
     // The connection outlives all that the service was made of here.
     service->shutDown();
     redaction_.tellLeftOut();
-    return outcome_;
+    return insight_.alerts() > 0 ? Outcome::ruleFired : outcome_;
   }
 
  private:
   void mainLoop(NavigationController& root) {
     if (const auto reason = whyNoMetricArrives(root)) return fail(*reason);
     std::string reason;
-    const std::unique_ptr<web::LiveServer> page = web::LiveServer::open(
-        options_.server, {insight_, veskInterface(), readingOfRow, [this] { return source_.state().text; }}, reason);
+    const std::unique_ptr<web::LiveServer> page =
+        web::LiveServer::open(options_.server,
+                              {insight_, veskInterface(), readingOfRow, [this] { return source_.state().text; },
+                               [](const std::string& remark) { tellUser("vesk: " + remark); }},
+                              reason);
     if (page == nullptr) return fail("vesk: " + reason);
     tellPlace(page->port());
     insight_.setStepHandler([&](const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
@@ -83,9 +94,11 @@ class Serving {
   void tellPlace(std::uint16_t port) {
     const std::string& address = options_.server.address;
     tellUser("vesk: serving " + placeOf(address, port) + "; Ctrl+C ends it");
-    if (!isLocal(address))
-      tellUser("vesk: whoever reaches " + address + " can read all that the handset tells, without a password" +
-               (options_.isRedacted ? "" : "; --redact leaves identities out"));
+    if (web::isLocal(address)) return;
+    const std::string addresses = listOf(web::reachableAddresses(address));
+    tellUser("vesk: everybody who reaches this machine" + (addresses.empty() ? "" : " at " + addresses) +
+             " can read the measurements, without a password" +
+             (options_.isRedacted ? "" : ", and the subscriber's identities; --redact leaves those out"));
   }
 
   void fail(const std::string& line) {

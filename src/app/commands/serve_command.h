@@ -21,7 +21,7 @@ struct ServeOptions {
 };
 
 /// Runs the program and serves its live page, also when a recording has ended. Where that is, is told on standard
-/// error.
+/// error. Once a rule has fired, that is the outcome.
 [[nodiscard]] Outcome runServe(const ServeOptions& options);
 
 }  // namespace vesk

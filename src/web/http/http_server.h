@@ -6,32 +6,16 @@
 #include <memory>
 #include <optional>
 #include <string>
-#include <string_view>
 #include <unordered_map>
 #include <vector>
 
 #include "system/clock.h"
 #include "system/file_descriptor.h"
 #include "web/http/request.h"
+#include "web/http/response.h"
+#include "web/http/waiting_bytes.h"
 
 namespace vesk::web {
-
-/// Bytes that several visitors are sent.
-using SharedText = std::shared_ptr<const std::string>;
-
-/// A visitor whose answer goes on for as long as he stays.
-using StreamId = std::uint64_t;
-
-struct Response {
-  int status = 200;
-  std::string_view type = "text/plain; charset=utf-8";
-  /// Of a stream: what it begins with. Null is empty.
-  SharedText body;
-  /// Not null: the answer is a stream, told here, once its beginning is on the way.
-  std::function<void(StreamId)> begin{};
-};
-
-[[nodiscard]] Response plainResponse(int status, std::string text);
 
 struct ServerOptions {
   std::string address = "127.0.0.1";
@@ -42,18 +26,29 @@ struct ServerOptions {
 };
 
 /// A web server for a page that is only read. It works on the main thread and never waits for anybody: whoever stops
-/// reading, or does not finish his request, is dropped. Visitors, requests and what waits for a visitor are bounded.
+/// reading, takes too long, or does not finish his request, is dropped. Visitors, requests and what waits for a visitor
+/// are bounded.
 class HttpServer {
  public:
   using Handler = std::function<Response(const Request&)>;
 
   static constexpr std::size_t kMostVisitors = 256;
+  /// Those beyond, who are told that there is no room for them; more are not told.
+  static constexpr std::size_t kMostRefused = 32;
   /// What may wait for a visitor beyond the beginning of his stream: bytes.
   static constexpr std::size_t kMostWaiting = std::size_t{4} << 20U;
-  /// What may wait for all of them, where a piece that several are sent counts once: bytes.
+  /// What may wait for all of them, where a piece that several are sent counts once: bytes. Beyond, those for whom most
+  /// waits are dropped.
   static constexpr std::size_t kMostWaitingInAll = std::size_t{64} << 20U;
+  /// While as much waits, nobody's request is carried out; the rest is for those who watch a stream.
+  static constexpr std::size_t kMostWaitingForMore = std::size_t{48} << 20U;
   /// How long a request may take to come, and a reader to take anything.
   static constexpr std::chrono::seconds kPatience{20};
+  /// How long something may wait for a reader, be it taken little by little.
+  static constexpr std::chrono::seconds kLongestWait{120};
+  /// How long one who was sent his last answer is heard out, so that he can read it; and how many bytes of his.
+  static constexpr std::chrono::seconds kFarewell{2};
+  static constexpr std::size_t kMostUnheard = std::size_t{64} << 10U;
 
   /// Null, with the reason, when the address cannot be listened on. `clock` must outlive the server.
   static std::unique_ptr<HttpServer> open(const ServerOptions& options, const Clock& clock, Handler handler,
@@ -64,15 +59,20 @@ class HttpServer {
 
   /// Readable when serve() has something to do.
   [[nodiscard]] int descriptor() const { return events_.get(); }
+  /// One answer for each visitor at most; who asks for more has his turn at the next call.
   void serve();
-  /// Drops those who have been waited for too long, and while too much waits, him for whom most does; to be called
-  /// every second or so.
-  void dropSlow();
+  /// To be called every second or so: drops those who have been waited for too long, and listens again to new ones
+  /// when there was nothing left to hold them with.
+  void tend();
 
   /// Sends more of a stream; nothing when its visitor has gone.
   void send(StreamId stream, const SharedText& piece);
+  /// Sends it to all streams that were sent nothing for as long.
+  void sendToQuiet(Clock::Duration quiet, const SharedText& piece);
   /// Told when a stream's visitor has gone.
   void setStreamEndHandler(std::function<void(StreamId)> handler) { onStreamEnd_ = std::move(handler); }
+  /// Told, once, why visitors cannot enter for a while.
+  void setRemarkHandler(std::function<void(const std::string&)> handler) { onRemark_ = std::move(handler); }
 
   [[nodiscard]] std::uint16_t port() const { return port_; }
   [[nodiscard]] std::size_t visitorCount() const { return visitors_.size(); }
@@ -89,24 +89,39 @@ class HttpServer {
     bool isStream = false;
     /// To be closed once all is sent.
     bool isLast = false;
-    bool isWatchedForRoom = false;
+    /// All is sent; what he says still is read and let go of.
+    bool isLeaving = false;
+    std::size_t unheard = 0;
+    /// More than the request that was answered has been received.
+    bool hasMore = false;
+    /// What the system is to tell of the socket; 0 before it was told.
+    std::uint32_t watchedFor = 0;
     Clock::Instant lastProgress;
+    /// Since when something has been waiting; while something is.
+    Clock::Instant waitingSince;
+    /// When he was sent a piece last.
+    Clock::Instant lastPiece;
   };
   using Visitors = std::unordered_map<StreamId, Visitor>;
 
   HttpServer(FileDescriptor listener, const Clock& clock, Handler handler, std::vector<std::string> names);
 
+  void listen(bool isListening);
   void acceptAll();
-  void watch(StreamId id, Visitor& visitor, bool forRoom, bool isNew);
+  void enter(FileDescriptor socket);
+  void watch(StreamId id, Visitor& visitor);
   void receive(StreamId id, Visitor& visitor);
+  void hearOut(StreamId id, Visitor& visitor);
   void answerNext(StreamId id, Visitor& visitor);
   void answer(StreamId id, Visitor& visitor, const Request& request);
+  /// Queues the last answer.
+  void refuse(Visitor& visitor, const Response& response);
   /// Sends what there is room for; false when the visitor is to be dropped.
   [[nodiscard]] bool flush(StreamId id, Visitor& visitor);
-  static void queue(Visitor& visitor, SharedText piece);
-  void dropIdle();
-  /// For whom most waits, while all that waits is too much; absent otherwise.
-  [[nodiscard]] std::optional<StreamId> heaviest() const;
+  void queue(Visitor& visitor, SharedText piece);
+  /// Drops those for whom most waits, while all that waits is too much.
+  void relieve();
+  [[nodiscard]] bool isWaitedForTooLong(const Visitor& visitor) const;
   void drop(StreamId id);
 
   FileDescriptor listener_;
@@ -115,10 +130,13 @@ class HttpServer {
   Handler handler_;
   std::vector<std::string> names_;
   std::uint16_t port_ = 0;
+  bool isListening_ = false;
   std::function<void(StreamId)> onStreamEnd_;
+  std::function<void(const std::string&)> onRemark_;
   /// 0 is the listener's.
   StreamId lastId_ = 0;
   Visitors visitors_;
+  WaitingBytes waiting_;
 };
 
 }  // namespace vesk::web

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <arpa/inet.h>
+#include <charconv>
 
 namespace vesk::web {
 
@@ -30,6 +31,12 @@ std::string_view trimmed(std::string_view text) {
   while (!text.empty() && isBlank(text.back()))
     text.remove_suffix(1);
   return text;
+}
+
+/// A zero byte or a line end of another system would be read in two ways.
+bool hasControl(std::string_view text) {
+  return std::any_of(text.begin(), text.end(),
+                     [](char c) { return (static_cast<unsigned char>(c) < ' ' && c != '\t') || c == '\x7f'; });
 }
 
 int hexDigit(char c) {
@@ -77,10 +84,25 @@ bool isAddress(const std::string& host) {
   return inet_pton(AF_INET, host.c_str(), &address) == 1;
 }
 
+bool isPort(std::string_view text) {
+  constexpr unsigned kLast = 65535;
+  unsigned number = 0;
+  const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+  // None is the usual one.
+  return text.empty() || (error == std::errc{} && end == text.data() + text.size() && number <= kLast);
+}
+
+/// Cuts the port off a host; false when what stands behind the colon is none.
+bool cutPort(std::string_view& host) {
+  const std::size_t colon = host.rfind(':');
+  if (colon == std::string_view::npos || host.ends_with(']')) return true;
+  const std::string_view port = host.substr(colon + 1);
+  host = host.substr(0, colon);
+  return isPort(port);
+}
+
 /// A browser that another site's name led here says that name: such a request is not ours.
 bool isOurs(std::string_view host, const std::vector<std::string>& names) {
-  if (const std::size_t port = host.rfind(':'); port != std::string_view::npos && !host.ends_with(']'))
-    host = host.substr(0, port);
   return equalIgnoringCase(host, "localhost") || isAddress(std::string(host)) ||
          std::any_of(names.begin(), names.end(),
                      [&](const std::string& name) { return equalIgnoringCase(host, name); });
@@ -90,22 +112,28 @@ bool isOurs(std::string_view host, const std::vector<std::string>& names) {
 struct Fields {
   std::optional<std::string_view> host;
   bool hasBody = false;
-  /// Another site's page asks, and not because its reader came here by a link.
+  /// Another page asks, be it one of the same machine.
   bool isForeign = false;
   bool isNavigation = false;
+  bool isDocument = false;
   bool closes = false;
   bool keeps = false;
   bool isSound = true;
+
+  /// Nobody asks but this page and its readers, who may come here by a link.
+  [[nodiscard]] bool isOurPages() const { return !isForeign || (isNavigation && isDocument); }
 
   void take(std::string_view name, std::string_view value) {
     if (equalIgnoringCase(name, "Host")) {
       if (host) isSound = false;
       host = value;
+      if (!cutPort(*host)) isSound = false;
     }
     if (equalIgnoringCase(name, "Transfer-Encoding")) hasBody = true;
     if (equalIgnoringCase(name, "Content-Length") && value != "0") hasBody = true;
-    if (equalIgnoringCase(name, "Sec-Fetch-Site")) isForeign = value == "cross-site";
+    if (equalIgnoringCase(name, "Sec-Fetch-Site") && value != "same-origin" && value != "none") isForeign = true;
     if (equalIgnoringCase(name, "Sec-Fetch-Mode")) isNavigation = value == "navigate";
+    if (equalIgnoringCase(name, "Sec-Fetch-Dest")) isDocument = value == "document";
     if (equalIgnoringCase(name, "Connection")) {
       closes = equalIgnoringCase(value, "close");
       keeps = equalIgnoringCase(value, "keep-alive");
@@ -118,9 +146,10 @@ Fields readFields(std::string_view lines) {
   while (!lines.empty()) {
     std::string_view value = cut(lines, kLineEnd);
     const bool hasColon = value.find(':') != std::string_view::npos;
+    const bool isText = !hasControl(value);
     const std::string_view name = cut(value, ":");
     const bool isName = hasColon && !name.empty() && name.find_first_of(" \t") == std::string_view::npos;
-    if (!isName) fields.isSound = false;
+    if (!isName || !isText) fields.isSound = false;
     fields.take(name, trimmed(value));
   }
   return fields;
@@ -128,13 +157,14 @@ Fields readFields(std::string_view lines) {
 
 int readRequest(std::string_view head, const std::vector<std::string>& names, Request& request) {
   std::string_view line = cut(head, kLineEnd);
+  if (hasControl(line)) return 400;
   const std::string_view method = cut(line, " ");
   const std::string_view target = cut(line, " ");
   if (line != "HTTP/1.1" && line != "HTTP/1.0") return line.starts_with("HTTP/") ? 505 : 400;
   const Fields fields = readFields(head);
   if (!fields.isSound || !readTarget(target, request)) return 400;
-  if (!fields.host || !isOurs(*fields.host, names)) return 403;
-  if (fields.isForeign && !fields.isNavigation) return 403;
+  if (!fields.host && line == "HTTP/1.1") return 400;
+  if (!fields.host || !isOurs(*fields.host, names) || !fields.isOurPages()) return 403;
   if (method != "GET" && method != "HEAD") return 405;
   if (fields.hasBody) return 413;
   request.isHead = method == "HEAD";

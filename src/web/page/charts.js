@@ -78,7 +78,8 @@ class Chart {
       element('div', {class: 'head'}, element('h3', {text: title}), legend), this.plot);
   }
 
-  draw() {
+  drawOnce() {
+    if (this.graph) return;
     this.rows = chartRows(this.charts.drive, this.names);
     this.graph = new Dygraph(this.plot, this.rows, {
       labels: ['position', ...this.names],
@@ -195,52 +196,74 @@ class Charts {
     this.window = null;
     this.isFollowing = false;
     this.moment = element('p', {id: 'moment', class: 'quiet', 'aria-live': 'polite'});
+    this.note = element('p', {class: 'quiet'});
     this.controls = element('div', {class: 'row', role: 'group', 'aria-label': 'What the charts show'},
       button('whole drive', () => this.showWhole()), trail ? button('now', () => this.showTrail(trail)) : '',
       button('+', () => this.zoom(0.5), {'aria-label': 'zoom in'}), button('−', () => this.zoom(2), {'aria-label': 'zoom out'}),
       button('◀', () => this.move(-0.5), {'aria-label': 'earlier'}), button('▶', () => this.move(0.5), {'aria-label': 'later'}),
       element('ul', {class: 'legend'}, ...[['change', 'cell change'], ['reestablished', 're-establishment'], ['drop', 'drop'], ['gap', 'gap in time']]
         .map(([name, text]) => {
-          const swatch = element('span', {class: 'swatch bar'});
+          const swatch = element('span', {class: `swatch bar ${name}`});
           swatch.style.color = `var(--${name})`;
           return element('li', {}, swatch, text);
         }), element('li', {text: 'foot of each chart: serving cell'})));
-    this.scheme = matchMedia('(prefers-color-scheme: dark)');
-    this.repaint = () => { for (const chart of this.charts) chart.graph.updateOptions(chart.looks()); };
-    this.scheme.addEventListener('change', this.repaint);
+    matchMedia('(prefers-color-scheme: dark)').addEventListener('change', () => this.repaint());
+    addEventListener('beforeprint', () => this.setPrinting(true));
+    addEventListener('afterprint', () => this.setPrinting(false));
   }
 
-  destroy() {
-    this.scheme.removeEventListener('change', this.repaint);
-    for (const chart of this.charts) chart.graph.destroy();
-    this.charts = [];
+  repaint() {
+    for (const chart of this.drawnCharts) chart.graph.updateOptions(chart.looks());
+  }
+
+  /** What is drawn does not follow the style sheet of paper by itself: neither its colours nor its width. */
+  setPrinting(isPrinting) {
+    document.documentElement.classList.toggle('printing', isPrinting);
+    for (const chart of this.charts) chart.drawOnce();
+    for (const chart of this.charts) chart.graph.resize();
+    this.repaint();
   }
 
   /** The series that have values; anew whenever another one has. */
   draw() {
+    const error = this.drive.time_error;
+    this.note.hidden = error === 0;
+    this.note.textContent = `There were more gaps than are kept: times in the charts may be off by ${duration(error)}.`;
     const groups = chartGroups.map((group) => [group, group.names.filter((name) => this.drive.series[name]?.length)])
       .filter(([, names]) => names.length > 0);
     const layout = JSON.stringify(groups.map(([, names]) => names));
     if (layout === this.layout) {
       const window = this.range();
       this.isFollowing = true;
-      for (const chart of this.charts) chart.update(window);
+      for (const chart of this.drawnCharts) chart.update(window);
       this.isFollowing = false;
       return;
     }
     this.layout = layout;
-    for (const chart of this.charts) chart.graph.destroy();
+    for (const chart of this.drawnCharts) chart.graph.destroy();
     this.charts = groups.map(([group, names]) => new Chart(this, group, names));
-    fill(this.section, this.controls, this.moment, ...this.charts.map((chart) => chart.frame),
+    fill(this.section, this.controls, this.moment, this.note, ...this.charts.map((chart) => chart.frame),
       ...(this.charts.length ? [] : [element('p', {class: 'quiet', text: 'No level or power was measured.'})]));
-    for (const chart of this.charts) chart.draw();
+    this.drawNext(this.charts);
+  }
+
+  get drawnCharts() {
+    return this.charts.filter((chart) => chart.graph);
+  }
+
+  /** One after the other, each in a picture of its own: the first shows while the others are still to be drawn. */
+  drawNext(charts) {
+    const next = charts.find((chart) => !chart.graph);
+    if (!next || charts !== this.charts) return;
+    next.drawOnce();
+    requestAnimationFrame(() => setTimeout(() => this.drawNext(charts)));
   }
 
   show(window) {
     this.window = window;
     const shown = this.range();
     this.isFollowing = true;
-    for (const chart of this.charts) chart.graph.updateOptions({dateWindow: shown});
+    for (const chart of this.drawnCharts) chart.graph.updateOptions({dateWindow: shown});
     this.isFollowing = false;
   }
 
@@ -254,7 +277,7 @@ class Charts {
 
   /** A double click unzooms a chart: then all of them show the whole drive. */
   zoomed() {
-    if (this.charts.some((chart) => chart.graph.isZoomed('x'))) return;
+    if (this.drawnCharts.some((chart) => chart.graph.isZoomed('x'))) return;
     this.showWhole();
   }
 
@@ -314,12 +337,12 @@ class Charts {
     this.pointed = position;
     const cell = this.drive.cellAt(position);
     this.moment.textContent = `${dateAndTime(Math.round(this.drive.timeAt(position)))} UTC${cell ? `, ${cell}` : ''}`;
-    for (const chart of this.charts) chart.pointAt(position);
+    for (const chart of this.drawnCharts) chart.pointAt(position);
   }
 
   /** The last value at or before a position while it is known; else null. */
   valueAt(name, position) {
-    const series = this.drive.series[name];
+    const series = this.drive.series[name] || [];
     let low = -1;
     let high = series.length / 2;
     while (high - low > 1) {

@@ -3,13 +3,14 @@
 // A drive as the program writes it. Positions are milliseconds of counted time, without the gaps between the stretches.
 
 class Drive {
-  /** Of everything that grows while the page is live, as many are kept. */
-  static mostPoints = 20000;
+  /** Of everything that grows while the page is live, as many numbers are wanted. */
+  static mostNumbers = 40000;
   static mostEvents = 5000;
 
   constructor(data) {
     Object.assign(this, data);
     this.kpiNamed = new Map(this.kpis.map((kpi) => [kpi.name, kpi]));
+    this.lengthAtFirst = this.length;
   }
 
   get end() {
@@ -18,19 +19,26 @@ class Drive {
 
   /** Adds what came since. */
   add(news) {
-    const append = (all, more, most) => {
-      for (const each of more) all.push(each);
-      if (all.length > most) all.splice(0, all.length - most);
-    };
+    const append = (all, more) => { for (const each of more) all.push(each); };
     this.now = news.now;
-    this.cells = news.cells;
-    append(this.stretches, news.stretches, Drive.mostPoints);
-    append(this.serving, news.serving, Drive.mostPoints);
-    append(this.events, news.events, Drive.mostEvents);
-    for (const [mark, positions] of Object.entries(news.marks)) append(this.marks[mark], positions, Drive.mostPoints);
-    for (const [name, points] of Object.entries(news.series)) {
-      append(this.series[name] = this.series[name] || [], points, Drive.mostPoints);
-    }
+    this.time_error = Math.max(this.time_error, news.time_error);
+    append(this.cells, news.cells);
+    append(this.stretches, news.stretches);
+    append(this.serving, news.serving);
+    append(this.events, news.events);
+    if (this.events.length > Drive.mostEvents) this.events.splice(0, this.events.length - Drive.mostEvents);
+    for (const [mark, positions] of Object.entries(news.marks)) append(this.marks[mark], positions);
+    for (const [name, points] of Object.entries(news.series)) append(this.series[name] = this.series[name] || [], points);
+  }
+
+  /** Of what has most numbers. */
+  get length() {
+    const all = [this.stretches, this.serving, ...Object.values(this.marks), ...Object.values(this.series)];
+    return Math.max(...all.map((each) => each.length));
+  }
+
+  get isTooLong() {
+    return this.length > Math.max(Drive.mostNumbers, 2 * this.lengthAtFirst);
   }
 
   /** The place in `stretches` of the one that a position lies in. */

@@ -46,23 +46,25 @@ class ScreenWalk {
   constructor(section, menu) {
     this.shown = element('div', {class: 'columns', 'aria-live': 'off'});
     this.buttons = [];
-    const folds = menu.map(({area, categories}, at) => element('details', {open: at === 1 ? '' : null},
+    const folds = menu.map(({area, categories}, at) => element('details', {class: 'menu', open: at === 1 ? '' : null},
       element('summary', {text: area}), element('div', {class: 'areas'}, ...categories.map((category) => {
         const made = button(category, () => this.open(area, category, made));
         this.buttons.push(made);
         return made;
       }))));
     this.title = element('h3');
-    fill(section, ...folds, this.title, this.shown);
+    this.note = element('p', {class: 'poor', role: 'status', hidden: '', text: 'not connected; what shows is old'});
+    fill(section, ...folds, this.title, this.note, this.shown);
   }
 
   open(area, category, chosen) {
-    this.source?.close();
+    this.connection?.close();
     for (const each of this.buttons) each.removeAttribute('aria-current');
     chosen.setAttribute('aria-current', 'true');
     this.title.textContent = `${area} › ${category}`;
-    this.source = new EventSource(`/live/screen?${new URLSearchParams({area, category})}`);
-    this.source.addEventListener('screen', (event) => this.shown.replaceChildren(...screenTables(JSON.parse(event.data))));
+    this.connection = new Connection(`/live/screen?${new URLSearchParams({area, category})}`,
+      {screen: (screen) => this.shown.replaceChildren(...screenTables(screen))},
+      (isConnected) => { this.note.hidden = isConnected; });
   }
 }
 
@@ -73,38 +75,47 @@ class LivePage {
 
   start() {
     document.title = 'Vesk, live';
-    const source = new EventSource('/live');
-    source.addEventListener('drive', (event) => this.begin(JSON.parse(event.data)));
-    source.addEventListener('news', (event) => this.take(JSON.parse(event.data)));
-    source.addEventListener('error', () => this.tell('connection lost; trying again'));
-    document.addEventListener('visibilitychange', () => this.show());
+    this.connection = new Connection('/live', {drive: (message) => this.begin(message), news: (message) => this.take(message)},
+      (isConnected) => this.tellConnected(isConnected));
     // While the mouse draws the frame of a zoom the charts hold still.
     document.addEventListener('pointerdown', () => { this.isHeld = true; });
     for (const end of ['pointerup', 'pointercancel']) document.addEventListener(end, () => { this.isHeld = false; });
     setInterval(() => this.askForSummary(), LivePage.summaryInterval);
-    fetch('/api/menu').then((answer) => answer.json()).then((menu) => new ScreenWalk(byId('screens'), menu));
+    fetched('/api/menu').then((menu) => new ScreenWalk(byId('screens'), menu));
   }
 
   tell(state) {
     byId('state').textContent = state;
   }
 
-  /** The whole drive: at the beginning, and whenever the connection was lost in between. */
+  tellConnected(isConnected) {
+    byId('state').classList.toggle('poor', !isConnected);
+    if (!isConnected) this.tell(this.drive ? 'not connected; what shows is old' : 'not connected');
+  }
+
+  /** The whole drive: at the beginning, and whenever it is connected again; what the reader had chosen stays. */
   begin({drive, state}) {
-    this.charts?.destroy();
-    this.drive = new Drive(drive);
-    this.charts = new Charts(byId('charts'), this.drive, LivePage.trail);
-    this.overview = new Overview(byId('now'), this.drive);
-    this.cells = new CellTable(byId('cells'), this.drive);
-    this.timeline = new TimelineList(byId('timeline'), this.drive, (position) => this.charts.showMoment(position));
-    this.summary = null;
     this.tell(state);
+    const earlier = this.drive;
+    this.drive = new Drive(drive);
+    if (!earlier) {
+      this.charts = new Charts(byId('charts'), this.drive, LivePage.trail);
+      this.overview = new Overview(byId('now'), this.drive);
+      this.cells = new CellTable(byId('cells'), this.drive);
+      this.timeline = new TimelineList(byId('timeline'), this.drive, (position) => this.charts.showMoment(position));
+    }
+    for (const part of [this.charts, this.overview, this.cells, this.timeline]) part.drive = this.drive;
+    // The program was started again, and its drive with it.
+    if (earlier && earlier.end > this.drive.end) this.charts.window = null;
+    this.summary = null;
     this.show();
     this.askForSummary();
   }
 
   take({drive, state}) {
     this.drive.add(drive);
+    // The program has all of it in fewer points.
+    if (this.drive.isTooLong) return void this.connection.connect();
     for (const [, , kind] of drive.events) {
       if (this.summary) this.summary.kinds[kind] = (this.summary.kinds[kind] || 0) + 1;
     }
@@ -122,9 +133,10 @@ class LivePage {
   async askForSummary() {
     if (document.hidden || !this.drive) return;
     const answer = await fetch('/api/summary').catch(() => null);
-    if (!answer?.ok) return;
+    const summary = answer?.ok ? await answer.json().catch(() => null) : null;
+    if (!summary) return;
     const isFirst = !this.summary;
-    this.summary = await answer.json();
+    this.summary = summary;
     showSummary(this.summary);
     this.cells.show(this.summary.cells);
     if (isFirst) this.timeline.show(this.summary.kinds, true);

@@ -15,6 +15,15 @@ function screenTables(screen) {
   });
 }
 
+function unfoldOnPaper() {
+  let opened = [];
+  addEventListener('beforeprint', () => {
+    opened = [...document.querySelectorAll('details:not([open])')];
+    for (const fold of opened) fold.open = true;
+  });
+  addEventListener('afterprint', () => { for (const fold of opened) fold.open = false; });
+}
+
 /** All screens of a report, folded. */
 function showScreens(screens) {
   const areas = new Map();
@@ -26,9 +35,12 @@ function showScreens(screens) {
     ...ofArea.map((screen) => {
       const fold = element('details', {}, element('summary', {text: screen.category}));
       // Tables that nobody opens cost nothing.
-      fold.addEventListener('toggle', () => {
+      const fill = () => {
         if (fold.children.length === 1) fold.append(element('div', {class: 'columns'}, ...screenTables(screen)));
-      });
+      };
+      fold.addEventListener('toggle', fill);
+      addEventListener('beforeprint', fill);
       return fold;
     }))));
+  unfoldOnPaper();
 }
