@@ -15,7 +15,11 @@ from browser import Browser
 HOSTILE = "<img src=x onerror=\"document.title='taken'\"><script>document.title='taken'</script>"
 AXIS = "return [...document.querySelectorAll('.plot')].map((plot) => [...plot.querySelectorAll('.dygraph-axis-label-x')].map((each) => each.textContent).join(' '))"
 INKED = """return [...document.querySelectorAll('.plot')].map((plot) => [...plot.querySelectorAll('canvas')].some((canvas) => {
-    const bytes = canvas.getContext('2d').getImageData(0, 0, canvas.width, canvas.height).data;
+    if (canvas.width * canvas.height === 0) return false;
+    // Read from a copy, for a canvas of the page that is read often is one that Chromium warns of.
+    const copy = new OffscreenCanvas(canvas.width, canvas.height).getContext('2d', { willReadFrequently: true });
+    copy.drawImage(canvas, 0, 0);
+    const bytes = copy.getImageData(0, 0, canvas.width, canvas.height).data;
     return new Set(new Uint32Array(bytes.buffer)).size > 3; }))"""
 VISITS = "return [...document.querySelectorAll('#cells tbody tr')].map((row) => Number(row.children[5].textContent))"
 CLICK = "const found = [...document.querySelectorAll(arguments[0])].find((each) => each.textContent.startsWith(arguments[1])); found.click(); return found.textContent"
