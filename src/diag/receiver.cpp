@@ -6,7 +6,7 @@ namespace vesk::diag {
 
 std::span<const Event> Receiver::take(const Packet& packet) {
   if (packet.log) return take(*packet.log);
-  if (sim_ && packet.sim != *sim_) {
+  if (isOfOther(packet.sim)) {
     counts_.noteOtherSim();
   } else {
     counts_.note(packet.kind);
@@ -15,7 +15,7 @@ std::span<const Event> Receiver::take(const Packet& packet) {
 }
 
 std::span<const Event> Receiver::take(const LogPacket& packet) {
-  if (sim_ && packet.sim != *sim_) {
+  if (isOfOther(packet.sim)) {
     counts_.noteOtherSim();
     return {};
   }

@@ -112,6 +112,7 @@ TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
        {"c: it ends within a packet, which is left out: was the program that wrote it ended?"}},
       {one + two, 2, {"c: it holds the SIMs 1 and 2, and all are taken; --sim N takes one"}},
       {one + two, 1, {}, 2},
+      {two + framed(bytesOf("98 01 00 00 02 00 00")), 1, {"c: 1 damaged packet was passed over"}, 2},
       {one + two, 0, {"c: no packet is of the SIM that --sim chooses"}, 3},
       {framed(bytesOf("9E 01")),
        0,

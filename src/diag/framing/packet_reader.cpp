@@ -65,7 +65,7 @@ std::optional<LogPacket> readLogPacket(Bytes bytes, std::uint32_t sim) {
 Packet readPacket(Bytes content) {
   std::uint32_t sim = 1;
   if (content[0] == kOfOneSim) {
-    if (content.size() <= kSimWrapperSize) return {PacketKind::damaged, sim, content};
+    if (content.size() <= kSimWrapperSize) return {PacketKind::damaged, std::nullopt, content};
     sim = simOf(readLittleEndian<std::uint32_t>(content, kSimOffset));
     content = content.subspan(kSimWrapperSize);
   }

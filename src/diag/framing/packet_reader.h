@@ -27,8 +27,8 @@ inline constexpr std::size_t kPacketKinds = 8;
 /// A frame's content, told apart; valid as long as that.
 struct Packet {
   PacketKind kind;
-  /// From 1.
-  std::uint32_t sim;
+  /// From 1; absent where what wraps the packets of one SIM is cut off.
+  std::optional<std::uint32_t> sim;
   /// Without what wraps the packets of one SIM; its first byte tells the kind.
   std::span<const std::uint8_t> content;
   /// There for a log packet.
