@@ -58,7 +58,7 @@ struct Import {
 
 Import import(const std::string& bytes, std::optional<std::uint32_t> sim = std::nullopt) {
   ByteInput input(fileWith(bytes), "c");
-  const CaptureForm form = tellContent(input) == Content::frames ? CaptureForm::frames : CaptureForm::packetList;
+  const CaptureForm form = captureFormOf(tellContent(input)).value();
   CaptureReader capture(std::move(input), form, sim);
   Import result;
   for (auto step = capture.next(); const auto* event = std::get_if<RecordedEvent>(&step); step = capture.next())
@@ -131,6 +131,7 @@ TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
 
 TEST(Capture, IsToldByItsContent) {
   const std::string frame = textOf(stateFrame(kTicks));
+  const Bytes unread = bytesOf("0E 00 01 F0 00 00 00 00 00 00 00 00 03 07");
   const std::string event = R"({"at": 1, "metric": 2, "payload": ""})";
   std::string noise;
   for (int piece = 0; piece < 31; ++piece)
@@ -144,6 +145,9 @@ TEST(Capture, IsToldByItsContent) {
       {noise + frame, Content::frames},
       {noise + "\x01\x7E" + frame, Content::unknown},
       {textOf(stateLog(kTicks, 0)), Content::packetList},
+      {textOf(unread + stateLog(kTicks, 0)), Content::packetList},
+      {textOf(unread + bytesOf("00 00")), Content::unknown},
+      {textOf(stateLog(kTicks, 0) + stateLog(~std::uint64_t{0}, 0)), Content::unknown},
       {event, Content::recording},
       {"\n at 12\n " + event, Content::recording},
       {"at 12\n", Content::text},
