@@ -1,6 +1,7 @@
 // The program itself, as a user runs it on a capture.
 
 #include "app/vesk_program.h"
+#include "diag/framing/frame.h"
 #include "support/bytes.h"
 
 namespace vesk {
@@ -12,6 +13,12 @@ const std::string kCellFrame = [] {
       "10 00 29 00 29 00 C2 B0 4C 6B 4E 4E 2A CA D3 00 03 B9 00 94 16 00 00 E4 5C 00 00 32 32 11 86 A4 02 08 54 11 00 "
       "00 00 36 01 03 9A 01 00 EE DC 7E");
   return std::string(bytes.begin(), bytes.end());
+}();
+/// The UMTS state 1 of SIM 2, framed.
+const std::string kFrameOfSim2 = [] {
+  Bytes frame;
+  diag::appendFrame(frame, bytesOf("98 01 00 00 02 00 00 00 10 00 0D 00 0D 00 25 41 4C 6B 4E 4E 2A CA D3 00 01"));
+  return std::string(frame.begin(), frame.end());
 }();
 const std::string kDamage = "\x01\x02\x7E";
 const std::string kCellRecording =
@@ -66,6 +73,24 @@ TEST(Capture, IsTakenWhereverARecordingIs) {
     EXPECT_EQ(taken.status, 0) << taken.error;
     onCapture.back() = "-";
     EXPECT_EQ(vesk(onCapture, kCellFrame).output, taken.output);
+  }
+}
+
+TEST(Capture, IsReadForTheSimThatIsChosen) {
+  const TemporaryFile both(kCellFrame + kFrameOfSim2);
+  const TemporaryFile second(kFrameOfSim2);
+  const TemporaryFile recording(kCellRecording);
+  const std::vector<std::vector<std::string>> commands = {
+      {"import"}, {"redact"}, {"decode"}, {"stores"}, {"timeline"}, {"--headless", "--speed", "max", "--replay"}};
+  for (const std::vector<std::string>& command : commands) {
+    const auto run = [&](const TemporaryFile& file, std::vector<std::string> arguments) {
+      arguments.insert(arguments.begin(), command.begin(), command.end());
+      arguments.insert(arguments.begin() + static_cast<std::ptrdiff_t>(command.size()), file.path());
+      return vesk(arguments);
+    };
+    EXPECT_NE(run(both, {}).error.find("it holds the SIMs 1 and 2, and all are taken"), std::string::npos);
+    EXPECT_EQ(run(both, {"--sim", "2"}).output, run(second, {}).output) << command[0];
+    EXPECT_NE(run(recording, {"--sim", "2"}).error.find(" is a recording"), std::string::npos) << command[0];
   }
 }
 

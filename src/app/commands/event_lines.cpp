@@ -24,7 +24,7 @@ class EventLines {
       : path_(input.path.value_or("-")),
         append_(std::move(append)),
         isRedacted_(input.isRedacted),
-        input_(path_, std::nullopt) {
+        input_(path_, input.sim) {
     input_.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();

@@ -57,7 +57,7 @@ class Importing {
     if (input.failure()) return fail(*input.failure());
     if (const char* reason = whyNotImported(content)) return fail(input.name() + ' ' + reason);
 
-    diag::CaptureReader capture(std::move(input), diag::captureFormOf(content).value(), options_.sim);
+    diag::CaptureReader capture(std::move(input), diag::captureFormOf(content).value(), options_.input.sim);
     capture.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();

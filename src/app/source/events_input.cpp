@@ -33,6 +33,8 @@ std::optional<std::string> EventsInput::open() {
   const Content content = diag::tellContent(input_);
   if (input_.failure()) return input_.failure();
   if (const char* reason = diag::whyUnreadable(content)) return input_.name() + ' ' + reason;
+  if (sim_ && content == Content::recording)
+    return input_.name() + " is a recording, which does not tell SIMs apart: leave out --sim, or give it the capture";
   if (const auto form = diag::captureFormOf(content)) {
     auto capture = std::make_unique<diag::CaptureReader>(std::move(input_), *form, sim_);
     capture_ = capture.get();

@@ -48,7 +48,7 @@ Outcome playRecording(const RecordingInput& input, const std::function<void(Navi
   if (input.path) {
     using Runs = corvik::RecordedService::Runs;
     const bool isWatchedPipe = beforePlaying && *input.path == "-";
-    auto opened = std::make_unique<EventsInput>(*input.path, std::nullopt);
+    auto opened = std::make_unique<EventsInput>(*input.path, input.sim);
     // What a pipe holds is waited for where it is played.
     if (const auto failure = isWatchedPipe ? std::nullopt : opened->open()) {
       fail("vesk: " + *failure);

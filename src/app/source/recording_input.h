@@ -1,14 +1,17 @@
 #pragma once
 
+#include <cstdint>
 #include <optional>
 #include <string>
 
 namespace vesk {
 
-/// Which recording a command reads, and how.
+/// Which recording or capture a command reads, and how.
 struct RecordingInput {
   /// "-" is standard input; absent for no events at all.
   std::optional<std::string> path;
+  /// Whose packets are taken of a capture; absent for those of all SIMs. A recording is not read with it.
+  std::optional<std::uint32_t> sim;
   /// Without identities.
   bool isRedacted = false;
 };
