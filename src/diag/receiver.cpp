@@ -20,7 +20,12 @@ std::span<const Event> Receiver::take(const LogPacket& packet) {
     return {};
   }
   const Translation translation = translator_->translate(packet);
-  counts_.noteLog(packet, versionOf(packet), translation.reading);
+  const std::optional<std::uint8_t> version = versionOf(packet);
+  counts_.noteLog(packet, version, translation.reading);
+  if (translation.reading != Reading::damaged) {
+    for (const Version::Subpacket& unread : unreadSubpacketsOf(packet))
+      counts_.noteUnreadSubpacket({packet.code, version, unread});
+  }
   return translation.events;
 }
 
