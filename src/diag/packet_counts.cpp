@@ -9,7 +9,6 @@ namespace vesk::diag {
 namespace {
 
 constexpr std::size_t kMostVarieties = 4096;
-constexpr std::size_t kMostSims = 4;
 
 }  // namespace
 
@@ -30,8 +29,7 @@ void Tally::note(Reading reading) {
 void PacketCounts::noteLog(const LogPacket& packet, std::optional<std::uint8_t> version, Reading reading) {
   logs_.note(reading);
   if (isBeforeClockIsSet(packet.milliseconds)) hasUnsetClock_ = true;
-  if (sims_.size() < kMostSims && std::find(sims_.begin(), sims_.end(), packet.sim) == sims_.end())
-    sims_.push_back(packet.sim);
+  noteSim(packet.sim);
   add({packet.code, version}, reading);
 }
 
@@ -49,6 +47,15 @@ std::uint64_t PacketCounts::passedOver() const {
                                 PacketKind::encryptedLog, PacketKind::unknown})
     count += of(kind);
   return count;
+}
+
+void PacketCounts::noteSim(std::uint32_t sim) {
+  if (std::find(sims_.begin(), sims_.end(), sim) != sims_.end()) return;
+  if (sims_.size() < kMostSims) {
+    sims_.push_back(sim);
+  } else {
+    hasMoreSims_ = true;
+  }
 }
 
 void PacketCounts::add(const PacketVariety& variety, Reading reading) {

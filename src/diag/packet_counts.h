@@ -60,12 +60,15 @@ class PacketCounts {
   /// Packets that hold nothing of ours, or that nobody can read.
   [[nodiscard]] std::uint64_t passedOver() const;
 
-  /// Which SIMs the log packets were of, in the order they came; no more than a handset has.
+  /// Which SIMs the log packets were of, in the order they came; no more than kMostSims.
   [[nodiscard]] const std::vector<std::uint32_t>& sims() const { return sims_; }
+  /// Whether there were more than that.
+  [[nodiscard]] bool hasMoreSims() const { return hasMoreSims_; }
   /// Whether a packet's time lies before 2000: no network had set the modem's clock.
   [[nodiscard]] bool hasUnsetClock() const { return hasUnsetClock_; }
 
  private:
+  void noteSim(std::uint32_t sim);
   void add(const PacketVariety& variety, Reading reading);
 
   Tally logs_;
@@ -75,6 +78,7 @@ class PacketCounts {
   std::uint64_t damagedFrames_ = 0;
   std::uint64_t ofOtherSims_ = 0;
   std::vector<std::uint32_t> sims_;
+  bool hasMoreSims_ = false;
   bool hasUnsetClock_ = false;
 };
 

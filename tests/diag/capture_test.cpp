@@ -94,6 +94,9 @@ TEST(Capture, GivesEventsTheTimeBetweenTheirPackets) {
 TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
   const Bytes one = stateFrame(kTicks);
   const Bytes two = ofSim(2, stateLog(kTicks, 1));
+  Bytes manySims;
+  for (std::uint8_t sim = 1; sim <= kMostSims + 1; ++sim)
+    manySims = manySims + ofSim(sim, stateLog(kTicks, 1));
   const struct {
     Bytes bytes;
     std::size_t events;
@@ -111,6 +114,10 @@ TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
        1,
        {"c: it ends within a packet, which is left out: was the program that wrote it ended?"}},
       {one + two, 2, {"c: it holds the SIMs 1 and 2, and all are taken; --sim N takes one"}},
+      {manySims,
+       kMostSims + 1,
+       {"c: it names more than 16 SIMs, as no handset does: what is known of one is forgotten for the next; --sim N "
+        "takes one"}},
       {one + two, 1, {}, 2},
       {two + framed(bytesOf("98 01 00 00 02 00 00")), 1, {"c: 1 damaged packet was passed over"}, 2},
       {one + two, 0, {"c: no packet is of the SIM that --sim chooses"}, 3},

@@ -3,6 +3,8 @@
 #include <cstdint>
 #include <optional>
 
+#include "diag/sim_remark.h"
+
 namespace vesk::diag {
 
 namespace {
@@ -10,15 +12,6 @@ namespace {
 /// "1 frame", "2 frames".
 std::string counted(std::uint64_t count, const std::string& what) {
   return std::to_string(count) + ' ' + what + (count == 1 ? "" : "s");
-}
-
-std::string listed(const std::vector<std::uint32_t>& sims) {
-  std::string text;
-  for (std::size_t index = 0; index < sims.size(); ++index) {
-    if (index > 0) text += index + 1 == sims.size() ? " and " : ", ";
-    text += std::to_string(sims[index]);
-  }
-  return text;
 }
 
 using Remark = std::optional<std::string>;
@@ -44,8 +37,7 @@ Remark onEncryption(const CaptureReader& capture) {
 Remark onSims(const CaptureReader& capture) {
   const PacketCounts& counts = capture.counts();
   if (counts.sims().empty() && counts.ofOtherSims() > 0) return "no packet is of the SIM that --sim chooses";
-  if (counts.sims().size() < 2) return std::nullopt;
-  return "it holds the SIMs " + listed(counts.sims()) + ", and all are taken; --sim N takes one";
+  return remarkOnSims(counts);
 }
 
 Remark onClock(const CaptureReader& capture) {
