@@ -1,6 +1,7 @@
 #include "diag/packet_counts.h"
 
 #include <algorithm>
+#include <numeric>
 
 #include "diag/modem_clock.h"
 
@@ -35,6 +36,11 @@ void PacketCounts::noteLog(const LogPacket& packet, std::optional<std::uint8_t> 
 
 void PacketCounts::note(PacketKind kind) {
   ++kinds_[static_cast<std::size_t>(kind)];
+}
+
+std::uint64_t PacketCounts::frames() const {
+  const std::uint64_t logs = logs_.read + logs_.passedOver + logs_.damaged;
+  return std::accumulate(kinds_.begin(), kinds_.end(), damagedFrames_ + ofOtherSims_ + logs);
 }
 
 std::uint64_t PacketCounts::damaged() const {

@@ -52,6 +52,8 @@ class PacketCounts {
   [[nodiscard]] const Tally& ofOtherVarieties() const { return ofOtherVarieties_; }
   [[nodiscard]] std::uint64_t of(PacketKind kind) const { return kinds_[static_cast<std::size_t>(kind)]; }
   [[nodiscard]] std::uint64_t damagedFrames() const { return damagedFrames_; }
+  /// Of a port or a capture with frames: all that came, sound or not.
+  [[nodiscard]] std::uint64_t frames() const;
   /// Of SIMs that were not chosen: not counted anywhere else.
   [[nodiscard]] std::uint64_t ofOtherSims() const { return ofOtherSims_; }
 

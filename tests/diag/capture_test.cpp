@@ -94,6 +94,9 @@ TEST(Capture, GivesEventsTheTimeBetweenTheirPackets) {
 TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
   const Bytes one = stateFrame(kTicks);
   const Bytes two = ofSim(2, stateLog(kTicks, 1));
+  Bytes nineDamaged;
+  for (int count = 0; count < 9; ++count)
+    nineDamaged = nineDamaged + bytesOf("01 02 7E");
   Bytes manySims;
   for (std::uint8_t sim = 1; sim <= kMostSims + 1; ++sim)
     manySims = manySims + ofSim(sim, stateLog(kTicks, 1));
@@ -106,6 +109,10 @@ TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
       {one + one, 2, {}},
       {bytesOf("01 02 7E") + one, 1, {"c: 1 damaged packet was passed over"}},
       {bytesOf("01 02 7E") + one + bytesOf("01 7E"), 1, {"c: 2 damaged packets were passed over"}},
+      {nineDamaged + one + bytesOf("01 7E"),
+       1,
+       {"c: 10 of 11 frames are damaged: did another program read the port meanwhile, as ModemManager does? Stop it, "
+        "and capture anew"}},
       {one + bytesOf("10 00"),
        1,
        {"c: it ends within a packet, which is left out: was the program that wrote it ended?"}},

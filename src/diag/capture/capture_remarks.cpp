@@ -1,9 +1,10 @@
 #include "diag/capture/capture_remarks.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <optional>
 
-#include "diag/sim_remark.h"
+#include "diag/count_remarks.h"
 
 namespace vesk::diag {
 
@@ -22,7 +23,14 @@ Remark onEnd(const CaptureReader& capture) {
 }
 
 Remark onDamage(const CaptureReader& capture) {
-  const std::uint64_t count = capture.counts().damaged() - (capture.isCutOff() ? 1 : 0);
+  const PacketCounts& counts = capture.counts();
+  const std::uint64_t cutOff = capture.isCutOff() ? 1 : 0;
+  // In a list of packets, what is cut off is no frame.
+  const std::uint64_t frames = counts.damagedFrames() - std::min(cutOff, counts.damagedFrames());
+  constexpr const char* kAdvice =
+      "did another program read the port meanwhile, as ModemManager does? Stop it, and capture anew";
+  if (const Remark remark = remarkOnFrames(frames, counts.frames(), kAdvice)) return remark;
+  const std::uint64_t count = counts.damaged() - cutOff;
   if (count == 0) return std::nullopt;
   return counted(count, "damaged packet") + (count == 1 ? " was" : " were") + " passed over";
 }

@@ -121,6 +121,8 @@ bool PortService::sendAndTell(Session& session, EventStream& events) {
   }
   for (const std::string& remark : session.takeRemarks())
     tell(port_.path() + ": " + remark, events);
+  for (const std::string& remark : remarks_.take(receiver_.counts()))
+    tell(port_.path() + ": " + remark, events);
   if (session.phase() == Session::Phase::watching) {
     if (state().phase == PortState::Phase::starting)
       SystemLog::write("%s: watching the logs of firmware %s", port_.path().c_str(), session.firmware().c_str());
