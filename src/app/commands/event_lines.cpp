@@ -44,7 +44,7 @@ class EventLines {
       readAll(input_);
     }
     progress_.hide();
-    if (events_ == 0 && hasBadLines_) tellIsNoRecording(path_);
+    if (events_ == 0 && hasBadLines_) tellUser("vesk: " + remarkOnNoRecording(path_));
     for (const std::string& remark : input_.remarks())
       tellUser(remark);
     redaction_.tellLeftOut();

@@ -86,7 +86,8 @@ Outcome playRecording(const RecordingInput& input, const std::function<void(Navi
       }
       loop.run();
       progress.hide();
-      if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*input.path);
+      if (const auto state = service->state(); state.events == 0 && state.badLines > 0)
+        tellUser("vesk: " + remarkOnNoRecording(*input.path));
       for (const std::string& remark : events->remarks())
         tellUser(remark);
     }

@@ -16,8 +16,8 @@ struct RecordingInput {
   bool isRedacted = false;
 };
 
-/// Tells the user, once the end is reached, that the file at `path` ("-" is standard input) is no recording: it had
-/// lines, and none was an event.
-void tellIsNoRecording(const std::string& path);
+/// What to tell the user, once the end is reached, of a file at `path` ("-" is standard input) that had lines, of which
+/// none was an event.
+[[nodiscard]] std::string remarkOnNoRecording(const std::string& path);
 
 }  // namespace vesk
