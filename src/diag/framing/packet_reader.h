@@ -35,6 +35,9 @@ struct Packet {
   std::optional<LogPacket> log{};
 };
 
+/// What a packet is that begins with that byte, as far as the byte tells.
+[[nodiscard]] PacketKind kindOf(std::uint8_t firstByte);
+
 /// Looks into the content of a sound frame, which is not empty.
 [[nodiscard]] Packet readPacket(std::span<const std::uint8_t> content);
 
