@@ -18,7 +18,7 @@ using enum EmmProc;
 using Emm = KCellularEmmContext;
 
 constexpr std::uint8_t kAreaElement = 0x13;
-constexpr std::uint8_t kIdentityElement = 0x23;
+constexpr std::uint8_t kMobileIdentityElement = 0x23;
 constexpr std::uint8_t kGutiElement = 0x50;
 constexpr std::uint8_t kCauseElement = 0x53;
 constexpr std::uint8_t kAreasElement = 0x54;
@@ -108,7 +108,7 @@ void addCombined(const Elements& elements, NasMessage& message) {
   mm.setUpdateStatus(MmUpdateStatus::STATUS_UPDATED);
   mm.setLai(locationArea(area->first<5>()));
   mm.setIsCombinedProc(true);
-  const auto identity = elements.find(kIdentityElement);
+  const auto identity = elements.find(kMobileIdentityElement);
   if (identity && identity->size() == 5) mm.setTmsi(bigEndian(identity->last(4)));
   message.events.add(mm);
 }
@@ -215,12 +215,12 @@ Reading readReallocation(NasMessage& message) {
   return Reading::read;
 }
 
-struct MessageType {
+struct EmmType {
   std::uint8_t type;
   Reading (*read)(NasMessage& message);
 };
 
-constexpr MessageType kTypes[] = {
+constexpr EmmType kEmmTypes[] = {
     {0x41, readAttachRequest},  {0x42, readAttachAccept},  {0x43, readAttachComplete}, {0x44, readReject},
     {0x45, readDetachRequest},  {0x48, readUpdateRequest}, {0x49, readUpdateAccept},   {0x4B, readReject},
     {0x4C, readServiceRequest}, {0x4E, readReject},        {0x50, readReallocation},
@@ -236,7 +236,7 @@ Reading readEmmMessage(ByteSpan bytes, SimState& sim, EventBatch& events) {
   if (protection == kServiceRequest) return readServiceRequest(message);
   if (protection != kPlain) return Reading::read;
   if (bytes.size() < 2) return Reading::damaged;
-  for (const MessageType& row : kTypes) {
+  for (const EmmType& row : kEmmTypes) {
     if (row.type == bytes[1]) return row.read(message);
   }
   return Reading::read;

@@ -187,13 +187,13 @@ Reading readGprsReject(NasMessage& message) {
 constexpr unsigned kMm = 5;
 constexpr unsigned kGmm = 8;
 
-struct MessageType {
+struct MmType {
   std::uint8_t protocol;
   std::uint8_t type;
   Reading (*read)(NasMessage& message);
 };
 
-constexpr MessageType kTypes[] = {
+constexpr MmType kMmTypes[] = {
     {kMm, 0x02, readLocationAccept},    {kMm, 0x04, readLocationReject}, {kGmm, 0x01, readGprsAttachRequest},
     {kGmm, 0x02, readGprsAttachAccept}, {kGmm, 0x04, readGprsReject},    {kGmm, 0x08, readRoutingRequest},
     {kGmm, 0x09, readRoutingAccept},    {kGmm, 0x0B, readGprsReject},
@@ -218,7 +218,7 @@ Reading readNasMessage(const LogPacket& packet, SimState& sim, EventBatch& event
   if (message.bytes.size() < 2) return Reading::read;
   const unsigned protocol = message.bytes[0] & 15U;
   const unsigned type = message.bytes[1] & (protocol == kMm ? kMmTypeBits : 0xFFU);
-  for (const MessageType& row : kTypes) {
+  for (const MmType& row : kMmTypes) {
     if (row.protocol == protocol && row.type == type) return row.read(message);
   }
   return Reading::read;

@@ -49,7 +49,7 @@ std::vector<std::uint16_t> wantedCodes() {
 constexpr const char* kNoAnswer =
     "no answer: not a diagnostic port; a modem has several ports, try the others (/dev/ttyUSB0, 1, 2, …)";
 constexpr const char* kNoSizes = "the modem answers, but not which logs it has; unplug it and plug it in again";
-constexpr const char* kLocked = "the modem's maker has locked its logs; another firmware or modem is needed";
+constexpr const char* kMakerLocked = "the modem's maker has locked its logs; another firmware or modem is needed";
 constexpr const char* kNoLogs = "the modem answers, but has none of the logs that are read";
 constexpr const char* kSilent =
     "no log for 10 s: is a SIM in, and airplane mode off? Else the logs are encrypted, or go to another program: stop "
@@ -148,7 +148,7 @@ void Session::refuse(const Answer& answer, Instant now) {
   const Request request = current_->request();
   if (answer.kind == Answer::Kind::locked && request != Request::firmware) isLocked_ = true;
   if (request == Request::logSizes) {
-    fail(isLocked_ ? kLocked : "the modem does not tell which logs it has" + inWords(answer.status), now);
+    fail(isLocked_ ? kMakerLocked : "the modem does not tell which logs it has" + inWords(answer.status), now);
   } else if (request == Request::logMask) {
     remarks_.push_back("the modem refuses its logs of " + std::string(nameOf(current_->equipment())) +
                        inWords(answer.status) + ": none will come; another firmware may give them");
@@ -178,7 +178,7 @@ void Session::addMasks(const std::vector<std::uint32_t>& sizes) {
 }
 
 void Session::startWatching(Instant now) {
-  if (masksInForce_ == 0) return fail(isLocked_ ? kLocked : kNoLogs, now);
+  if (masksInForce_ == 0) return fail(isLocked_ ? kMakerLocked : kNoLogs, now);
   phase_ = Phase::watching;
   noteLog(now);
 }
