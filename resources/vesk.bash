@@ -73,12 +73,12 @@ _vesk() {
   esac
 
   case $command in
-    decode | stores) options='--redact --log' ;;
-    redact) options='--log' ;;
-    show | summary | readings) options='--json --redact --log' ;;
-    timeline) options='--json --rule --rules --redact --log' ;;
-    series) options='--csv --redact --log' ;;
-    report) options='--output --redact --log' ;;
+    decode | stores) options='--sim --redact --log' ;;
+    redact) options='--sim --log' ;;
+    show | summary | readings) options='--json --sim --redact --log' ;;
+    timeline) options='--json --rule --rules --sim --redact --log' ;;
+    series) options='--csv --sim --redact --log' ;;
+    report) options='--output --sim --redact --log' ;;
     serve) options="--port --bind --host $sources --rule --rules --redact --seconds --log" ;;
     simulate) options='--seed --seconds --log' ;;
     import) options='--sim --count --layouts --redact --log' ;;

@@ -18,6 +18,7 @@ build     protobuf-compiler   protoc
 build     libprotobuf-dev     /usr/include/google/protobuf/message.h
 build     libprotoc-dev       /usr/include/google/protobuf/compiler/plugin.h
 test      libgtest-dev        /usr/include/gtest/gtest.h
+bench     libgtest-dev        /usr/include/gtest/gtest.h
 bench     libbenchmark-dev    /usr/include/benchmark/benchmark.h
 bench     libprotozero-dev    /usr/include/protozero/pbf_reader.hpp
 bench     valgrind            valgrind

@@ -212,7 +212,7 @@ class CommandLine {
 
   void addRedact() {
     CLI::App* redact = program_.add_subcommand("redact", "Print a recording without the subscriber's identities");
-    addFile(*redact, input_, "The recording; - or nothing for standard input");
+    addFile(*redact, input_, "A recording or capture; - or nothing for standard input");
     addLogOption(*redact, kDataLog);
     redact->footer(kRedactExamples);
     redact->final_callback([this] { command_ = [this] { return runRedact(input_); }; });
@@ -236,9 +236,8 @@ class CommandLine {
   void addImport() {
     CLI::App* command = program_.add_subcommand("import", "Print a capture of a diagnostic port as a recording");
     import_.input.path = "-";
-    addFile(*command, import_.input, "The capture; - or nothing for standard input");
+    addFile(*command, import_.input, "A capture; - or nothing for standard input");
     addRedactOption(*command, import_.input.isRedacted);
-    addSimOption(*command, import_.sim);
     command->add_flag("--count", import_.countsOnly, "Print a table of what the capture holds instead");
     command->add_flag("--layouts", import_.layoutsOnly, "Print a table of what can be read");
     addLogOption(*command, kDataLog);

@@ -21,6 +21,16 @@ bool parseSpeed(const std::string& text, std::optional<double>& speed) {
   return true;
 }
 
+/// Whose packets are taken.
+void addSimOption(CLI::App& command, std::optional<std::uint32_t>& sim) {
+  const auto reasonAgainst = [](const std::string& text) -> std::string {
+    return parseNumber<std::uint32_t>(text).value_or(0) > 0 ? "" : "expected a SIM's number, from 1, got " + text;
+  };
+  command.add_option("--sim", sim, "Take one SIM's packets only, from 1; refused for a recording")
+      ->type_name("N")
+      ->check(CLI::Validator(reasonAgainst, ""));
+}
+
 }  // namespace
 
 CLI::Validator secondsFrom(double least) {
@@ -32,15 +42,6 @@ CLI::Validator secondsFrom(double least) {
   return {reasonAgainst, ""};
 }
 
-void addSimOption(CLI::App& command, std::optional<std::uint32_t>& sim) {
-  const auto reasonAgainst = [](const std::string& text) -> std::string {
-    return parseNumber<std::uint32_t>(text).value_or(0) > 0 ? "" : "expected a SIM's number, from 1, got " + text;
-  };
-  command.add_option("--sim", sim, "Take one SIM's packets only, from 1: of a port or a capture")
-      ->type_name("N")
-      ->check(CLI::Validator(reasonAgainst, ""));
-}
-
 void addSourceOptions(CLI::App& command, SourceOptions& source) {
   CLI::Option* replay =
       command.add_option("--replay", source.replay, "Feed it a recording or a capture; - is stdin")->type_name("FILE");
@@ -48,6 +49,10 @@ void addSourceOptions(CLI::App& command, SourceOptions& source) {
                           ->type_name("PORT")
                           ->excludes(replay);
   addSimOption(command, source.sim);
+  command.parse_complete_callback([&source] {
+    if (source.sim && !source.port && !source.replay)
+      throw CLI::ValidationError("--sim", "goes with --diag or --replay: the simulated handset has one SIM");
+  });
   command.add_option("--record", source.record, "Keep what comes: of a port the capture, else a recording")
       ->type_name("FILE");
   command
@@ -85,17 +90,18 @@ void addDurationOption(CLI::App& command, std::optional<std::chrono::nanoseconds
 
 void addRecording(CLI::App& command, RecordingInput& input) {
   input.path = "-";
-  addFile(command, input, "The recording; - or nothing for standard input");
+  addFile(command, input, "A recording or capture; - or nothing for standard input");
   addRedactOption(command, input.isRedacted);
 }
 
 void addRecordingIfAny(CLI::App& command, RecordingInput& input) {
-  addFile(command, input, "The recording; - is standard input, nothing: no events yet");
+  addFile(command, input, "A recording or capture; - is stdin, nothing: no events yet");
   addRedactOption(command, input.isRedacted);
 }
 
 void addFile(CLI::App& command, RecordingInput& input, const std::string& description) {
   command.add_option("FILE", input.path, description)->type_name("");
+  addSimOption(command, input.sim);
 }
 
 void addRedactOption(CLI::App& command, bool& isRedacted) {

@@ -11,9 +11,6 @@
 /// Options that several commands have. What they are written to must outlive the command.
 namespace vesk {
 
-/// Whose packets are taken of a capture or a port.
-void addSimOption(CLI::App& command, std::optional<std::uint32_t>& sim);
-
 /// Where the events of a running program come from.
 void addSourceOptions(CLI::App& command, SourceOptions& source);
 /// How long it runs.

@@ -1,9 +1,13 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <span>
 
 namespace vesk::diag {
+
+/// A handset has a few SIMs. Of more, those that were heard of last are remembered.
+inline constexpr std::size_t kMostSims = 16;
 
 /// What a modem logs at one moment: the smallest thing that can be read by itself.
 struct LogPacket {

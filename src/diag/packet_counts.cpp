@@ -1,6 +1,7 @@
 #include "diag/packet_counts.h"
 
 #include <algorithm>
+#include <numeric>
 
 #include "diag/modem_clock.h"
 
@@ -8,14 +9,7 @@ namespace vesk::diag {
 
 namespace {
 
-constexpr std::size_t kMostCodes = 4096;
-constexpr std::size_t kMostSims = 4;
-
-constexpr std::uint32_t kNoVersion = 0x100;
-
-std::uint32_t keyOf(std::uint16_t code, std::optional<std::uint8_t> version) {
-  return std::uint32_t{code} << 16 | (version ? *version : kNoVersion);
-}
+constexpr std::size_t kMostVarieties = 4096;
 
 }  // namespace
 
@@ -36,35 +30,17 @@ void Tally::note(Reading reading) {
 void PacketCounts::noteLog(const LogPacket& packet, std::optional<std::uint8_t> version, Reading reading) {
   logs_.note(reading);
   if (isBeforeClockIsSet(packet.milliseconds)) hasUnsetClock_ = true;
-  if (sims_.size() < kMostSims && std::find(sims_.begin(), sims_.end(), packet.sim) == sims_.end())
-    sims_.push_back(packet.sim);
-  const std::uint32_t key = keyOf(packet.code, version);
-  const auto known = byCode_.find(key);
-  if (known != byCode_.end()) {
-    known->second.note(reading);
-  } else if (byCode_.size() < kMostCodes) {
-    byCode_[key].note(reading);
-  } else {
-    ofOtherCodes_.note(reading);
-  }
+  noteSim(packet.sim);
+  add({packet.code, version}, reading);
 }
 
 void PacketCounts::note(PacketKind kind) {
   ++kinds_[static_cast<std::size_t>(kind)];
 }
 
-std::vector<CodeTally> PacketCounts::byCode() const {
-  std::vector<CodeTally> rows;
-  for (const auto& [key, tally] : byCode_) {
-    const bool hasVersion = (key & kNoVersion) == 0;
-    rows.push_back({.code = static_cast<std::uint16_t>(key >> 16),
-                    .version = hasVersion ? std::optional(static_cast<std::uint8_t>(key)) : std::nullopt,
-                    .tally = tally});
-  }
-  std::sort(rows.begin(), rows.end(), [](const CodeTally& left, const CodeTally& right) {
-    return std::pair(left.code, left.version) < std::pair(right.code, right.version);
-  });
-  return rows;
+std::uint64_t PacketCounts::frames() const {
+  const std::uint64_t logs = logs_.read + logs_.passedOver + logs_.damaged;
+  return std::accumulate(kinds_.begin(), kinds_.end(), damagedFrames_ + ofOtherSims_ + logs);
 }
 
 std::uint64_t PacketCounts::damaged() const {
@@ -77,6 +53,26 @@ std::uint64_t PacketCounts::passedOver() const {
                                 PacketKind::encryptedLog, PacketKind::unknown})
     count += of(kind);
   return count;
+}
+
+void PacketCounts::noteSim(std::uint32_t sim) {
+  if (std::find(sims_.begin(), sims_.end(), sim) != sims_.end()) return;
+  if (sims_.size() < kMostSims) {
+    sims_.push_back(sim);
+  } else {
+    hasMoreSims_ = true;
+  }
+}
+
+void PacketCounts::add(const PacketVariety& variety, Reading reading) {
+  const auto known = byVariety_.find(variety);
+  if (known != byVariety_.end()) {
+    known->second.note(reading);
+  } else if (byVariety_.size() < kMostVarieties) {
+    byVariety_[variety].note(reading);
+  } else {
+    ofOtherVarieties_.note(reading);
+  }
 }
 
 }  // namespace vesk::diag

@@ -6,7 +6,7 @@ namespace vesk::diag {
 
 std::span<const Event> Receiver::take(const Packet& packet) {
   if (packet.log) return take(*packet.log);
-  if (sim_ && packet.sim != *sim_) {
+  if (isOfOther(packet.sim)) {
     counts_.noteOtherSim();
   } else {
     counts_.note(packet.kind);
@@ -15,12 +15,17 @@ std::span<const Event> Receiver::take(const Packet& packet) {
 }
 
 std::span<const Event> Receiver::take(const LogPacket& packet) {
-  if (sim_ && packet.sim != *sim_) {
+  if (isOfOther(packet.sim)) {
     counts_.noteOtherSim();
     return {};
   }
   const Translation translation = translator_->translate(packet);
-  counts_.noteLog(packet, versionOf(packet), translation.reading);
+  const std::optional<std::uint8_t> version = versionOf(packet);
+  counts_.noteLog(packet, version, translation.reading);
+  if (translation.reading != Reading::damaged) {
+    for (const Version::Subpacket& unread : unreadSubpacketsOf(packet))
+      counts_.noteUnreadSubpacket({packet.code, version, unread});
+  }
   return translation.events;
 }
 

@@ -33,6 +33,9 @@ class Receiver {
   [[nodiscard]] const PacketCounts& counts() const { return counts_; }
 
  private:
+  /// Whether a packet is of a SIM that is not wanted; one of no known SIM is not.
+  [[nodiscard]] bool isOfOther(std::optional<std::uint32_t> sim) const { return sim_ && sim && *sim != *sim_; }
+
   std::optional<std::uint32_t> sim_;
   std::optional<Translator> translator_{std::in_place};
   PacketCounts counts_;

@@ -46,8 +46,9 @@ TEST(CommandLine, AnswersMistakesWithWhatToTypeInstead) {
 
 TEST(CommandLine, TellsWhatARecordingLooksLikeWhenNoLineIsAnEvent) {
   const std::string hint =
-      "vesk: standard input is no recording: no line of it is an event, as this one is:\n"
-      "  {\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"1003\"}\n";
+      "vesk: standard input is no recording: no line of it is an event, as this one is: "
+      "{\"at\": 12.5, \"metric\": \"0x3C4E04\", \"payload\": \"1003\"}\n";
+  EXPECT_EQ(vesk({"--headless", "--replay", "-"}, "one\n").error, "standard input:1: no JSON object\n" + hint);
   for (const char* command : {"decode", "stores"}) {
     EXPECT_EQ(vesk({command, "-"}, "one\n").error, "standard input:1: no JSON object\n" + hint);
     EXPECT_EQ(vesk({command, "-"}, "").error, "");

@@ -58,7 +58,7 @@ struct Import {
 
 Import import(const std::string& bytes, std::optional<std::uint32_t> sim = std::nullopt) {
   ByteInput input(fileWith(bytes), "c");
-  const CaptureForm form = tellContent(input) == Content::frames ? CaptureForm::frames : CaptureForm::packetList;
+  const CaptureForm form = captureFormOf(tellContent(input)).value();
   CaptureReader capture(std::move(input), form, sim);
   Import result;
   for (auto step = capture.next(); const auto* event = std::get_if<RecordedEvent>(&step); step = capture.next())
@@ -94,6 +94,12 @@ TEST(Capture, GivesEventsTheTimeBetweenTheirPackets) {
 TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
   const Bytes one = stateFrame(kTicks);
   const Bytes two = ofSim(2, stateLog(kTicks, 1));
+  Bytes nineDamaged;
+  for (int count = 0; count < 9; ++count)
+    nineDamaged = nineDamaged + bytesOf("01 02 7E");
+  Bytes manySims;
+  for (std::uint8_t sim = 1; sim <= kMostSims + 1; ++sim)
+    manySims = manySims + ofSim(sim, stateLog(kTicks, 1));
   const struct {
     Bytes bytes;
     std::size_t events;
@@ -103,6 +109,10 @@ TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
       {one + one, 2, {}},
       {bytesOf("01 02 7E") + one, 1, {"c: 1 damaged packet was passed over"}},
       {bytesOf("01 02 7E") + one + bytesOf("01 7E"), 1, {"c: 2 damaged packets were passed over"}},
+      {nineDamaged + one + bytesOf("01 7E"),
+       1,
+       {"c: 10 of 11 frames are damaged: did another program read the port meanwhile, as ModemManager does? Stop it, "
+        "and capture anew"}},
       {one + bytesOf("10 00"),
        1,
        {"c: it ends within a packet, which is left out: was the program that wrote it ended?"}},
@@ -111,7 +121,12 @@ TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
        1,
        {"c: it ends within a packet, which is left out: was the program that wrote it ended?"}},
       {one + two, 2, {"c: it holds the SIMs 1 and 2, and all are taken; --sim N takes one"}},
+      {manySims,
+       kMostSims + 1,
+       {"c: it names more than 16 SIMs, as no handset does: what is known of one is forgotten for the next; --sim N "
+        "takes one"}},
       {one + two, 1, {}, 2},
+      {two + framed(bytesOf("98 01 00 00 02 00 00")), 1, {"c: 1 damaged packet was passed over"}, 2},
       {one + two, 0, {"c: no packet is of the SIM that --sim chooses"}, 3},
       {framed(bytesOf("9E 01")),
        0,
@@ -130,6 +145,7 @@ TEST(Capture, IsReadAsFarAsItIsWholeAndTellsWhatWasNot) {
 
 TEST(Capture, IsToldByItsContent) {
   const std::string frame = textOf(stateFrame(kTicks));
+  const Bytes unread = bytesOf("0E 00 01 F0 00 00 00 00 00 00 00 00 03 07");
   const std::string event = R"({"at": 1, "metric": 2, "payload": ""})";
   std::string noise;
   for (int piece = 0; piece < 31; ++piece)
@@ -143,6 +159,9 @@ TEST(Capture, IsToldByItsContent) {
       {noise + frame, Content::frames},
       {noise + "\x01\x7E" + frame, Content::unknown},
       {textOf(stateLog(kTicks, 0)), Content::packetList},
+      {textOf(unread + stateLog(kTicks, 0)), Content::packetList},
+      {textOf(unread + bytesOf("00 00")), Content::unknown},
+      {textOf(stateLog(kTicks, 0) + stateLog(~std::uint64_t{0}, 0)), Content::unknown},
       {event, Content::recording},
       {"\n at 12\n " + event, Content::recording},
       {"at 12\n", Content::text},

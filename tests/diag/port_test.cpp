@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <condition_variable>
 #include <gtest/gtest.h>
 #include <mutex>
@@ -138,6 +139,25 @@ TEST_F(PortServiceTest, TellsOfSilence) {
     passTime();
   client_.upTo("no log for 10 s");
   stop();
+}
+
+TEST_F(PortServiceTest, SaysOnceWhatIsWrongWithWhatComes) {
+  connect();
+  modem_.answerUntilItWatches();
+  for (int time = 0; time < 2; ++time) {
+    for (int count = 0; count < 10; ++count)
+      modem_.sendBytes(bytesOf("01 02 03 7E"));
+    modem_.send("98 01 00 00 02 00 00 00 " + kCell);
+    modem_.send("10 00 0D 00 0D 00 25 41 00 00 00 00 00 00 00 00 01");
+  }
+  stop();
+  client_.note("end");
+  const Texts noted = client_.upTo("end");
+  for (const std::string part :
+       {" frames are damaged: does another program", "the SIMs 2 and 1", "dates are of 1980"}) {
+    const auto holds = [&part](const std::string& text) { return text.find(part) != std::string::npos; };
+    EXPECT_EQ(std::count_if(noted.begin(), noted.end(), holds), 1) << part;
+  }
 }
 
 TEST(Port, TellsWhyItCannotBeOpened) {

@@ -15,7 +15,7 @@ TEST(Translator, EachSimHasItsOwnState) {
   EXPECT_EQ(told(translator, kMmState, "b0=0 b2=0", 2, 2), "MmContext{update_status: STATUS_UPDATED}");
   EXPECT_EQ(told(translator, kMmState, "b0=0 b2=1", 3, 1), service + ", update_status: STATUS_NOT_UPDATED}");
   // However many SIMs a broken capture names, only so many are remembered.
-  for (std::uint32_t sim = 3; sim < 3 + Translator::kMostSims - 1; ++sim)
+  for (std::uint32_t sim = 3; sim < 3 + kMostSims - 1; ++sim)
     EXPECT_EQ(told(translator, kMmState, "b0=0 b2=255", 4, sim), "MmContext{}");
   EXPECT_EQ(told(translator, kMmState, "b0=0 b2=255", 5, 1), service + ", update_status: STATUS_NOT_UPDATED}");
   EXPECT_EQ(told(translator, kMmState, "b0=0 b2=255", 5, 2), "MmContext{}");

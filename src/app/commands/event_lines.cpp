@@ -24,7 +24,7 @@ class EventLines {
       : path_(input.path.value_or("-")),
         append_(std::move(append)),
         isRedacted_(input.isRedacted),
-        input_(path_, std::nullopt) {
+        input_(path_, input.sim) {
     input_.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();
@@ -44,7 +44,7 @@ class EventLines {
       readAll(input_);
     }
     progress_.hide();
-    if (events_ == 0 && hasBadLines_) tellIsNoRecording(path_);
+    if (events_ == 0 && hasBadLines_) tellUser("vesk: " + remarkOnNoRecording(path_));
     for (const std::string& remark : input_.remarks())
       tellUser(remark);
     redaction_.tellLeftOut();

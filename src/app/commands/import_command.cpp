@@ -19,15 +19,13 @@ namespace vesk {
 
 namespace {
 
-using diag::CaptureForm;
 using diag::Content;
 
-/// What a file is that holds no capture, and what to do; null for one that may.
+/// What a file is that holds no capture, and what to do; null for a capture.
 const char* whyNotImported(Content content) {
   switch (content) {
     case Content::frames:
     case Content::packetList:
-    case Content::unknown:
       return nullptr;
     case Content::nothing:
       return "is empty";
@@ -35,6 +33,8 @@ const char* whyNotImported(Content content) {
       return "is a recording already";
     case Content::text:
       return "is text, and no capture of a diagnostic port";
+    case Content::unknown:
+      return "is no capture: it begins with neither frames nor log packets";
     case Content::networkCapture:
     case Content::archive:
       return diag::whyUnreadable(content);
@@ -57,16 +57,13 @@ class Importing {
     if (input.failure()) return fail(*input.failure());
     if (const char* reason = whyNotImported(content)) return fail(input.name() + ' ' + reason);
 
-    const CaptureForm form = content == Content::frames ? CaptureForm::frames : CaptureForm::packetList;
-    diag::CaptureReader capture(std::move(input), form, options_.sim);
+    diag::CaptureReader capture(std::move(input), diag::captureFormOf(content).value(), options_.input.sim);
     capture.setBeforeRead([this](int) {
       output_.flush();
       return !output_.hasFailed();
     });
     const std::optional<std::string> failure = writeEvents(capture);
     const diag::PacketCounts& counts = capture.counts();
-    const bool isCapture = content != Content::unknown || counts.logs().read > 0;
-    if (!isCapture) return fail(capture.name() + " is no capture: it begins with neither frames nor log packets");
     if (options_.countsOnly) writePacketTable(output_, counts);
     for (const std::string& remark : remarksOn(capture))
       tellUser(remark);

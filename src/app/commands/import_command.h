@@ -1,8 +1,5 @@
 #pragma once
 
-#include <cstdint>
-#include <optional>
-
 #include "app/output/outcome.h"
 #include "app/source/recording_input.h"
 
@@ -11,8 +8,6 @@ namespace vesk {
 struct ImportOptions {
   /// The capture.
   RecordingInput input;
-  /// Which SIM; absent for all.
-  std::optional<std::uint32_t> sim;
   /// A table of what the capture holds, instead of its events.
   bool countsOnly = false;
   /// A table of what can be read, and nothing is imported.

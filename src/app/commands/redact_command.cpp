@@ -5,7 +5,9 @@
 namespace vesk {
 
 Outcome runRedact(const RecordingInput& input) {
-  return writeEventLines({input.path, true}, [](std::string& out, const RecordedEvent& event) {
+  RecordingInput redacted = input;
+  redacted.isRedacted = true;
+  return writeEventLines(redacted, [](std::string& out, const RecordedEvent& event) {
     appendRecordedEvent(out, event);
     out.pop_back();
   });

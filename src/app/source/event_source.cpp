@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "app/source/events_input.h"
+#include "app/source/recording_input.h"
 #include "app/source/recording_service.h"
 #include "diag/framing/frame.h"
 #include "diag/port/port_service.h"
@@ -126,14 +127,15 @@ EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, S
   }
   auto service = std::make_shared<corvik::RecordedService>(std::move(opened), clock, options.playback);
   service->setBadLineHandler(std::move(handlers.badLine));
-  service->setEndHandler([&input, tell = std::move(handlers.remark),
+  corvik::RecordedService& recorded = *service;
+  service->setEndHandler([&recorded, &input, path = *options.replay, tell = std::move(handlers.remark),
                           ended = std::move(handlers.ended)](const std::optional<std::string>& failure) {
+    if (const auto state = recorded.state(); state.events == 0 && state.badLines > 0) tell(remarkOnNoRecording(path));
     for (const std::string& remark : input.remarks())
       tell(remark);
     ended(failure);
   });
   service->setSeekHandlers(std::move(handlers.seekBegun), std::move(handlers.seekEnded));
-  corvik::RecordedService& recorded = *service;
   return {std::move(service), [&recorded, &input] { return shown(recorded.state(), input.isLive()); }, std::nullopt,
           [&recorded] { return recorded.state().position; }, &recorded.player()};
 }

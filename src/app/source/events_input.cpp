@@ -12,7 +12,6 @@ namespace vesk {
 
 namespace {
 
-using diag::CaptureForm;
 using diag::Content;
 
 /// Bytes of a capture that are read twice without being felt.
@@ -34,9 +33,10 @@ std::optional<std::string> EventsInput::open() {
   const Content content = diag::tellContent(input_);
   if (input_.failure()) return input_.failure();
   if (const char* reason = diag::whyUnreadable(content)) return input_.name() + ' ' + reason;
-  if (content == Content::frames || content == Content::packetList) {
-    const CaptureForm form = content == Content::frames ? CaptureForm::frames : CaptureForm::packetList;
-    auto capture = std::make_unique<diag::CaptureReader>(std::move(input_), form, sim_);
+  if (sim_ && content == Content::recording)
+    return input_.name() + " is a recording, which does not tell SIMs apart: leave out --sim, or give it the capture";
+  if (const auto form = diag::captureFormOf(content)) {
+    auto capture = std::make_unique<diag::CaptureReader>(std::move(input_), *form, sim_);
     capture_ = capture.get();
     reader_ = std::move(capture);
   } else {

@@ -21,7 +21,7 @@ class CaptureReader;
 class EventsInput final : public TimedEvents {
  public:
   /// Over the file at `path`; "-" is standard input. `sim` is the one whose packets a capture is read for, absent for
-  /// all.
+  /// all; a recording is not read with it.
   EventsInput(const std::string& path, std::optional<std::uint32_t> sim);
   ~EventsInput() override;
   EventsInput(const EventsInput&) = delete;

@@ -48,7 +48,7 @@ Outcome playRecording(const RecordingInput& input, const std::function<void(Navi
   if (input.path) {
     using Runs = corvik::RecordedService::Runs;
     const bool isWatchedPipe = beforePlaying && *input.path == "-";
-    auto opened = std::make_unique<EventsInput>(*input.path, std::nullopt);
+    auto opened = std::make_unique<EventsInput>(*input.path, input.sim);
     // What a pipe holds is waited for where it is played.
     if (const auto failure = isWatchedPipe ? std::nullopt : opened->open()) {
       fail("vesk: " + *failure);
@@ -86,7 +86,8 @@ Outcome playRecording(const RecordingInput& input, const std::function<void(Navi
       }
       loop.run();
       progress.hide();
-      if (const auto state = service->state(); state.events == 0 && state.badLines > 0) tellIsNoRecording(*input.path);
+      if (const auto state = service->state(); state.events == 0 && state.badLines > 0)
+        tellUser("vesk: " + remarkOnNoRecording(*input.path));
       for (const std::string& remark : events->remarks())
         tellUser(remark);
     }

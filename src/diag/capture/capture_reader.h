@@ -9,6 +9,7 @@
 #include <variant>
 #include <vector>
 
+#include "diag/capture/content.h"
 #include "diag/framing/frame_reader.h"
 #include "diag/framing/packet_list_reader.h"
 #include "diag/modem_clock.h"
@@ -17,9 +18,6 @@
 #include "recording/timed_events.h"
 
 namespace vesk::diag {
-
-/// How the packets of a capture stand in it.
-enum class CaptureForm { frames, packetList };
 
 /// Reads a capture event by event, as the recording it becomes: a file, or a pipe while it is being written. Memory
 /// does not grow with the capture.

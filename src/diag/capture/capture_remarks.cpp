@@ -1,7 +1,10 @@
 #include "diag/capture/capture_remarks.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <optional>
+
+#include "diag/count_remarks.h"
 
 namespace vesk::diag {
 
@@ -12,15 +15,6 @@ std::string counted(std::uint64_t count, const std::string& what) {
   return std::to_string(count) + ' ' + what + (count == 1 ? "" : "s");
 }
 
-std::string listed(const std::vector<std::uint32_t>& sims) {
-  std::string text;
-  for (std::size_t index = 0; index < sims.size(); ++index) {
-    if (index > 0) text += index + 1 == sims.size() ? " and " : ", ";
-    text += std::to_string(sims[index]);
-  }
-  return text;
-}
-
 using Remark = std::optional<std::string>;
 
 Remark onEnd(const CaptureReader& capture) {
@@ -29,7 +23,14 @@ Remark onEnd(const CaptureReader& capture) {
 }
 
 Remark onDamage(const CaptureReader& capture) {
-  const std::uint64_t count = capture.counts().damaged() - (capture.isCutOff() ? 1 : 0);
+  const PacketCounts& counts = capture.counts();
+  const std::uint64_t cutOff = capture.isCutOff() ? 1 : 0;
+  // In a list of packets, what is cut off is no frame.
+  const std::uint64_t frames = counts.damagedFrames() - std::min(cutOff, counts.damagedFrames());
+  constexpr const char* kAdvice =
+      "did another program read the port meanwhile, as ModemManager does? Stop it, and capture anew";
+  if (const Remark remark = remarkOnFrames(frames, counts.frames(), kAdvice)) return remark;
+  const std::uint64_t count = counts.damaged() - cutOff;
   if (count == 0) return std::nullopt;
   return counted(count, "damaged packet") + (count == 1 ? " was" : " were") + " passed over";
 }
@@ -44,8 +45,7 @@ Remark onEncryption(const CaptureReader& capture) {
 Remark onSims(const CaptureReader& capture) {
   const PacketCounts& counts = capture.counts();
   if (counts.sims().empty() && counts.ofOtherSims() > 0) return "no packet is of the SIM that --sim chooses";
-  if (counts.sims().size() < 2) return std::nullopt;
-  return "it holds the SIMs " + listed(counts.sims()) + ", and all are taken; --sim N takes one";
+  return remarkOnSims(counts);
 }
 
 Remark onClock(const CaptureReader& capture) {

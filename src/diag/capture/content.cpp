@@ -1,7 +1,6 @@
 #include "diag/capture/content.h"
 
 #include <algorithm>
-#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <optional>
@@ -9,8 +8,8 @@
 #include <string_view>
 
 #include "diag/framing/frame_reader.h"
-#include "diag/framing/packet_reader.h"
-#include "diag/little_endian.h"
+#include "diag/framing/packet_list_reader.h"
+#include "diag/translation/log_kind.h"
 
 namespace vesk::diag {
 
@@ -45,8 +44,10 @@ constexpr Beginning kBeginnings[] = {
     {"BZh", Content::archive},
 };
 
-/// The equipment that logs: 1X and common, WCDMA, GSM, UMTS NAS, LTE and NR.
-constexpr std::array<unsigned, 5> kEquipment = {0x1, 0x4, 0x5, 0x7, 0xB};
+/// Of as many packets without frames, each must be one.
+constexpr int kPacketsToTry = 32;
+/// 2100: no modem's clock says more. In milliseconds since 1970.
+constexpr std::uint64_t kLatestTime = 4'102'444'800'000;
 
 std::string_view asText(Bytes bytes) {
   return {reinterpret_cast<const char*>(bytes.data()), bytes.size()};
@@ -76,9 +77,20 @@ bool isText(Bytes bytes) {
   });
 }
 
+/// Nothing marks a packet: any bytes may be one, but hardly several that follow each other. One that stands alone must
+/// be of a code that is read.
 bool mayBePacketList(Bytes bytes) {
-  const std::optional<LogPacket> first = readLogPacket(bytes, 1);
-  return first && std::find(kEquipment.begin(), kEquipment.end(), first->code >> 12) != kEquipment.end();
+  PacketListReader list;
+  list.take(bytes);
+  int count = 0;
+  bool isFirstRead = false;
+  for (; count < kPacketsToTry; ++count) {
+    const std::optional<LogPacket> packet = list.next();
+    if (!packet) break;
+    if (packet->milliseconds >= kLatestTime) return false;
+    if (count == 0) isFirstRead = findLogKind(packet->code) != nullptr;
+  }
+  return count > 1 || isFirstRead;
 }
 
 Content tellWithoutFrames(Bytes bytes) {
@@ -124,10 +136,17 @@ const char* whyUnreadable(Content content) {
     case Content::packetList:
     case Content::recording:
     case Content::text:
-    case Content::unknown:
       return nullptr;
+    case Content::unknown:
+      return "is neither a recording nor a capture: it begins with no line of JSON, no frame and no log packet";
   }
   return nullptr;
+}
+
+std::optional<CaptureForm> captureFormOf(Content content) {
+  if (content == Content::frames) return CaptureForm::frames;
+  if (content == Content::packetList) return CaptureForm::packetList;
+  return std::nullopt;
 }
 
 }  // namespace vesk::diag

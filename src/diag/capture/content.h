@@ -1,5 +1,7 @@
 #pragma once
 
+#include <optional>
+
 #include "recording/byte_input.h"
 
 namespace vesk::diag {
@@ -21,9 +23,15 @@ enum class Content {
   unknown,
 };
 
+/// How the packets of a capture stand in it.
+enum class CaptureForm { frames, packetList };
+
 /// Looks as far ahead in `input`, of which nothing was taken yet, as it needs to, a MiB at most, and takes nothing. A
 /// pipe is waited for. Frames are found also behind what is none, as where a capture begins within one.
 [[nodiscard]] Content tellContent(ByteInput& input);
+
+/// None for what is no capture.
+[[nodiscard]] std::optional<CaptureForm> captureFormOf(Content content);
 
 /// What a file is that holds neither a capture nor a recording, and what to do: "is an archive, …". Null for one that
 /// may.

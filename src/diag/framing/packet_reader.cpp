@@ -62,14 +62,18 @@ std::optional<LogPacket> readLogPacket(Bytes bytes, std::uint32_t sim) {
                    .body = bytes.subspan(kLogHeaderSize, length - kLogHeaderSize)};
 }
 
+PacketKind kindOf(std::uint8_t firstByte) {
+  return kKinds[firstByte];
+}
+
 Packet readPacket(Bytes content) {
   std::uint32_t sim = 1;
   if (content[0] == kOfOneSim) {
-    if (content.size() <= kSimWrapperSize) return {PacketKind::damaged, sim, content};
+    if (content.size() <= kSimWrapperSize) return {PacketKind::damaged, std::nullopt, content};
     sim = simOf(readLittleEndian<std::uint32_t>(content, kSimOffset));
     content = content.subspan(kSimWrapperSize);
   }
-  const PacketKind kind = kKinds[content[0]];
+  const PacketKind kind = kindOf(content[0]);
   if (kind != PacketKind::log) return {kind, sim, content};
   if (content.size() < kBeforeLength) return {PacketKind::damaged, sim, content};
   const std::optional<LogPacket> log = readLogPacket(content.subspan(kBeforeLength), sim);

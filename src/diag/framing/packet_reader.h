@@ -27,13 +27,16 @@ inline constexpr std::size_t kPacketKinds = 8;
 /// A frame's content, told apart; valid as long as that.
 struct Packet {
   PacketKind kind;
-  /// From 1.
-  std::uint32_t sim;
+  /// From 1; absent where what wraps the packets of one SIM is cut off.
+  std::optional<std::uint32_t> sim;
   /// Without what wraps the packets of one SIM; its first byte tells the kind.
   std::span<const std::uint8_t> content;
   /// There for a log packet.
   std::optional<LogPacket> log{};
 };
+
+/// What a packet is that begins with that byte, as far as the byte tells.
+[[nodiscard]] PacketKind kindOf(std::uint8_t firstByte);
 
 /// Looks into the content of a sound frame, which is not empty.
 [[nodiscard]] Packet readPacket(std::span<const std::uint8_t> content);

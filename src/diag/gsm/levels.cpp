@@ -4,7 +4,6 @@
 #include "diag/layout/byte_reader.h"
 #include "diag/layout/values.h"
 #include "diag/translation/event_batch.h"
-#include "diag/translation/sim_state.h"
 
 namespace vesk::diag {
 
@@ -41,30 +40,6 @@ void addServingLevel(std::int32_t dbm, std::optional<std::uint32_t> arfcn, Event
 }
 
 }  // namespace
-
-Reading readGsmServingCell(const LogPacket& packet, SimState& sim, EventBatch& events) {
-  ByteReader body(packet.body);
-  const std::uint32_t arfcn = body.get(kArfcn);
-  const std::uint32_t bcc = body.byte(2) & 7U;
-  const std::uint32_t ncc = body.byte(3) & 7U;
-  const std::uint32_t cellId = body.get(h(4));
-  const ByteSpan plmn = body.part(6, 3);
-  const std::uint32_t lac = body.bigEndian(9, 2);
-  if (body.isCutOff()) return Reading::damaged;
-
-  const PlmnDigits network = plmnDigits(plmn.first<3>());
-  sim.gsmCell = {network.mcc, network.mnc, lac, cellId, arfcn, 8 * ncc + bcc};
-  KCellularGsmScellInfo info;
-  info.setMcc(network.mcc);
-  info.setMnc(network.mnc);
-  info.setNumMncDigits(network.mncDigits);
-  info.setLac(lac);
-  info.setCellId(cellId);
-  info.setArfcn(arfcn);
-  info.setBsic(sim.gsmCell->bsic);
-  events.add(info);
-  return Reading::read;
-}
 
 Reading readGsmServingLevel(const LogPacket& packet, SimState& /*sim*/, EventBatch& events) {
   ByteReader body(packet.body);

@@ -9,13 +9,13 @@ namespace {
 
 enum Channel : std::uint8_t { dcch = 0, bcch = 1, sacch = 4 };
 
-struct MessageType {
+struct RrType {
   Channel channel;
   std::uint8_t type;
   Reading (*read)(ByteSpan message, SimState& sim, EventBatch& events);
 };
 
-constexpr MessageType kTypes[] = {
+constexpr RrType kRrTypes[] = {
     {bcch, 0x00, readSystemInformation13},
     {bcch, 0x1B, readSystemInformation3},
     {dcch, 0x15, readGsmMeasurementReport},
@@ -39,7 +39,7 @@ Reading readGsmRrMessage(const LogPacket& packet, SimState& sim, EventBatch& eve
   const std::uint8_t type = isOfRadioResources ? message.byte(start + 1) : std::uint8_t{0};
   if (message.isCutOff()) return Reading::damaged;
   if (!isOfRadioResources) return Reading::read;
-  for (const MessageType& row : kTypes) {
+  for (const RrType& row : kRrTypes) {
     if (row.channel == channel && row.type == type) return row.read(bytes, sim, events);
   }
   return Reading::read;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <optional>
 
+#include "diag/gsm/serving_cell.h"
 #include "diag/layout/bit_reader.h"
 #include "diag/layout/values.h"
 #include "diag/translation/event_batch.h"
@@ -35,30 +36,6 @@ class RestOctets {
  private:
   BitReader bits_;
 };
-
-/// Who the cell is.
-struct CellIdentity {
-  PlmnDigits network;
-  std::uint32_t lac;
-  std::uint32_t cellId;
-};
-
-void addServingCell(const CellIdentity& identity, const std::optional<GsmCell>& lastCell, EventBatch& events) {
-  const PlmnDigits& network = identity.network;
-  KCellularGsmScellInfo info;
-  info.setMcc(network.mcc);
-  info.setMnc(network.mnc);
-  info.setNumMncDigits(network.mncDigits);
-  info.setLac(identity.lac);
-  info.setCellId(identity.cellId);
-  const bool isLastCell = lastCell && lastCell->mcc == network.mcc && lastCell->mnc == network.mnc &&
-                          lastCell->lac == identity.lac && lastCell->cellId == identity.cellId;
-  if (isLastCell) {
-    info.setArfcn(lastCell->arfcn);
-    info.setBsic(lastCell->bsic);
-  }
-  events.add(info);
-}
 
 void setFromRestOctets(KCellularGsmIdleConfig& config, RestOctets rest) {
   const bool hasReselection = rest.isNextHigh();
@@ -105,8 +82,8 @@ Reading readSystemInformation3(ByteSpan message, SimState& sim, EventBatch& even
   constexpr std::size_t kSize = 23;
   if (message.size() < kSize) return Reading::damaged;
   ByteReader m(message);
-  const CellIdentity identity{plmnDigits(message.subspan<5, 3>()), m.bigEndian(8, 2), m.bigEndian(3, 2)};
-  addServingCell(identity, sim.gsmCell, events);
+  const GsmCellIdentity identity{plmnDigits(message.subspan<5, 3>()), m.bigEndian(8, 2), m.bigEndian(3, 2)};
+  addGsmServingCell(identity, sim.gsmCell, events);
 
   const std::uint32_t accessClasses = m.bigEndian(17, 2);
   KCellularGsmIdleConfig config;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <compare>
 #include <cstddef>
 #include <cstdint>
 #include <optional>
@@ -26,6 +27,7 @@ struct Version {
   struct Subpacket {
     std::uint8_t id;
     std::uint8_t version;
+    auto operator<=>(const Subpacket&) const = default;
   };
   std::optional<Subpacket> subpacket;
   Proof proof;

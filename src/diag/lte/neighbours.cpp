@@ -14,7 +14,7 @@ using namespace metrics;
 using namespace notation;
 using enum Proof;
 
-struct Layout {
+struct NeighbourLayout {
   std::uint8_t version;
   Proof proof;
   Field earfcn;
@@ -27,22 +27,22 @@ struct Layout {
 
 // clang-format off
 //                                    EARFCN number       cells    PCI            RSRP            RSRQ
-constexpr Layout kFiltered[] = {
+constexpr NeighbourLayout kFiltered[] = {
     {4, checked,                      w(8),  b(24),       28, 12,  h(0),          h(2),           h(6)},
     {3, byTheBook,                    h(8),  b(22),       24, 12,  h(0),          h(2),           h(6)},
 };
-constexpr Layout kIdle[] = {
+constexpr NeighbourLayout kIdle[] = {
     {5, sample,                       w(4),  w(8, 6, 26), 12, 32,  w(0, 0, 9),    w(0, 20, 12),   w(8, 12, 10)},
     {4, sample,                       h(4),  h(6, 6, 10),  8, 32,  w(0, 0, 9),    w(0, 20, 12),   w(8, 12, 10)},
 };
 // Of subpackets; those that ask for the measurements have other numbers.
 constexpr std::uint8_t kConnectedSubpacket = 31;
-constexpr Layout kConnectedMeasured[] = {
+constexpr NeighbourLayout kConnectedMeasured[] = {
     {4, checked,                      w(0),  h(4, 0, 6),   8, 52,  w(0, 0, 10),   w(12, 0, 12),   w(20, 10, 10)},
     {3, byTheBook,                    h(0),  h(2, 0, 6),   4, 52,  w(0, 0, 10),   w(12, 0, 12),   w(20, 10, 10)},
 };
 constexpr std::uint8_t kIdleSubpacket = 27;
-constexpr Layout kIdleMeasured[] = {
+constexpr NeighbourLayout kIdleMeasured[] = {
     {4, byTheBook,                    w(0),  h(4, 0, 6),   8, 52,  w(0, 0, 10),   w(12, 0, 12),   w(20, 10, 10)},
     {2, byTheBook,                    h(0),  h(2, 0, 6),   4, 52,  w(0, 0, 10),   w(12, 0, 12),   w(20, 10, 10)},
 };
@@ -54,7 +54,7 @@ constexpr auto kConnectedMeasuredVersions = subpacketVersionsOf(kConnectedSubpac
 constexpr auto kIdleMeasuredVersions = subpacketVersionsOf(kIdleSubpacket, kIdleMeasured);
 
 /// False when the list is cut off.
-bool addCells(const Layout& layout, ByteSpan bytes, KCellularLteNbrEutraCellMeas& report) {
+bool addCells(const NeighbourLayout& layout, ByteSpan bytes, KCellularLteNbrEutraCellMeas& report) {
   ByteReader header(bytes);
   const std::uint32_t earfcn = header.get(layout.earfcn);
   const std::uint32_t count = header.get(layout.count);
@@ -69,8 +69,8 @@ void addReport(KCellularLteNbrEutraCellMeas& report, EventBatch& events) {
 }
 
 template <std::size_t Count>
-Reading readList(const Layout (&layouts)[Count], const LogPacket& packet, EventBatch& events) {
-  const Layout* layout = findLayout(layouts, packet.body[0]);
+Reading readList(const NeighbourLayout (&layouts)[Count], const LogPacket& packet, EventBatch& events) {
+  const NeighbourLayout* layout = findLayout(layouts, packet.body[0]);
   if (layout == nullptr) return Reading::passedOver;
   KCellularLteNbrEutraCellMeas report;
   if (!addCells(*layout, packet.body, report)) return Reading::damaged;
@@ -80,10 +80,11 @@ Reading readList(const Layout (&layouts)[Count], const LogPacket& packet, EventB
 
 /// The cells of all subpackets make one report.
 template <std::size_t Count>
-Reading readMeasured(std::uint8_t id, const Layout (&layouts)[Count], const LogPacket& packet, EventBatch& events) {
+Reading readMeasured(std::uint8_t id, const NeighbourLayout (&layouts)[Count], const LogPacket& packet,
+                     EventBatch& events) {
   KCellularLteNbrEutraCellMeas report;
   const Reading reading = readSubpackets(packet, [&](const Subpacket& subpacket) {
-    const Layout* layout = subpacket.id == id ? findLayout(layouts, subpacket.version) : nullptr;
+    const NeighbourLayout* layout = subpacket.id == id ? findLayout(layouts, subpacket.version) : nullptr;
     if (layout == nullptr) return Reading::passedOver;
     return addCells(*layout, subpacket.content, report) ? Reading::read : Reading::damaged;
   });

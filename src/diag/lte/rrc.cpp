@@ -20,7 +20,7 @@ using enum Proof;
 using enum LteRrcState;
 using enum LteRrcCause;
 
-struct Layout {
+struct RrcLayout {
   std::uint8_t version;
   Proof proof;
   Field pci;
@@ -35,7 +35,7 @@ struct Layout {
 };
 
 // clang-format off
-constexpr Layout kLayouts[] = {
+constexpr RrcLayout kRrcLayouts[] = {
     //              PCI   channel length  DL-CCCH message
     {2,  byTheBook, h(4), b(10),  h(11),   5,     13},
     {3,  byTheBook, h(4), b(10),  h(11),   5,     13},
@@ -61,7 +61,7 @@ constexpr Layout kLayouts[] = {
     {31, byTheBook, h(6), b(14),  h(19),   8,     24, b(23)},
 };
 // clang-format on
-constexpr auto kVersions = versionsOf(kLayouts);
+constexpr auto kRrcVersions = versionsOf(kRrcLayouts);
 
 /// A message of one of the channels, and what it may change.
 struct RrcMessage {
@@ -168,11 +168,11 @@ constexpr Reading (*kReadChannel[])(RrcMessage&) = {
 }  // namespace
 
 Versions lteRrcMessageVersions() {
-  return kVersions;
+  return kRrcVersions;
 }
 
 Reading readLteRrcMessage(const LogPacket& packet, SimState& sim, EventBatch& events) {
-  const Layout* layout = findLayout(kLayouts, packet.body[0]);
+  const RrcLayout* layout = findLayout(kRrcLayouts, packet.body[0]);
   if (layout == nullptr) return Reading::passedOver;
 
   ByteReader body(packet.body);

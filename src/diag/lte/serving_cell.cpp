@@ -11,7 +11,7 @@ using namespace metrics;
 using namespace notation;
 using enum Proof;
 
-struct Layout {
+struct CellLayout {
   std::uint8_t version;
   Proof proof;
   Field pci;
@@ -22,22 +22,22 @@ struct Layout {
 };
 
 // clang-format off
-constexpr Layout kLayouts[] = {
+constexpr CellLayout kCellLayouts[] = {
     //             PCI   EARFCN      resource blocks cell   TAC    band   MCC    MNC: digits, number
     {3, checked,   h(1), w(3), w(7), b(11), b(12),   w(13), h(17), w(19), h(23), b(25), h(26)},
     {2, byTheBook, h(1), h(3), h(5), b(7),  b(8),    w(9),  h(13), w(15), h(19), b(21), h(22)},
 };
 // clang-format on
-constexpr auto kVersions = versionsOf(kLayouts);
+constexpr auto kCellVersions = versionsOf(kCellLayouts);
 
 }  // namespace
 
 Versions lteServingCellVersions() {
-  return kVersions;
+  return kCellVersions;
 }
 
 Reading readLteServingCell(const LogPacket& packet, SimState& /*sim*/, EventBatch& events) {
-  const Layout* layout = findLayout(kLayouts, packet.body[0]);
+  const CellLayout* layout = findLayout(kCellLayouts, packet.body[0]);
   if (layout == nullptr) return Reading::passedOver;
 
   ByteReader body(packet.body);

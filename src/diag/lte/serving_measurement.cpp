@@ -32,7 +32,7 @@ struct LevelFields {
   Field rssiOfAll;
 };
 
-struct Layout {
+struct MeasurementLayout {
   std::uint8_t version;
   Proof proof;
   std::uint8_t firstCell;
@@ -56,7 +56,7 @@ constexpr LevelFields kLevels40{
                              {w(16, 10, 12), w(20, 12, 12)},   w(32, 12, 12),   640,   {w(40, 0, 10), w(40, 20, 10)}, w(48, 0, 10),  w(60, 0, 11)};
 
 constexpr std::uint8_t kSubpacket = 25;
-constexpr Layout kLayouts[] = {
+constexpr MeasurementLayout kMeasurementLayouts[] = {
     //              cells: from, size, lead, number  serving                      SNR of 0, 1
     {18, checked,    4,  68, 0, std::nullopt,        h(0, 12, 1), &kLevels18,    {{w(64, 0, 9), w(64, 9, 9)}}},
     {19, checked,    8,  68, 0, std::nullopt,        h(0, 12, 1), &kLevels18,    {{w(64, 0, 9), w(64, 9, 9)}}},
@@ -67,7 +67,7 @@ constexpr Layout kLayouts[] = {
     {60, sample,     8, 148, 8, h(4),                h(0, 15, 1), &kLevels40,   std::nullopt},
 };
 // clang-format on
-constexpr auto kVersions = subpacketVersionsOf(kSubpacket, kLayouts);
+constexpr auto kMeasurementVersions = subpacketVersionsOf(kSubpacket, kMeasurementLayouts);
 constexpr Field kPci = h(0, 0, 9);
 constexpr Field kServingIndex = h(0, 9, 3);
 
@@ -81,7 +81,7 @@ struct Cell {
   std::uint32_t rsrpOfAll, rsrqOfAll, rssiOfAll;
 };
 
-Cell readCell(const Layout& layout, std::uint32_t earfcn, ByteReader cell) {
+Cell readCell(const MeasurementLayout& layout, std::uint32_t earfcn, ByteReader cell) {
   ByteReader bytes(cell.rest(layout.lead));
   const LevelFields& levels = *layout.levels;
   const auto both = [&bytes](const ChainFields& fields) {
@@ -147,7 +147,8 @@ void addSecondaryCell(const Cell& cell, EventBatch& events) {
 }
 
 Reading readCells(const Subpacket& subpacket, EventBatch& events) {
-  const Layout* layout = subpacket.id == kSubpacket ? findLayout(kLayouts, subpacket.version) : nullptr;
+  const MeasurementLayout* layout =
+      subpacket.id == kSubpacket ? findLayout(kMeasurementLayouts, subpacket.version) : nullptr;
   if (layout == nullptr) return Reading::passedOver;
 
   ByteReader header(subpacket.content);
@@ -172,25 +173,25 @@ Reading readCells(const Subpacket& subpacket, EventBatch& events) {
   return Reading::read;
 }
 
-struct IdleLayout {
+struct IdleMeasurementLayout {
   std::uint8_t version;
   Proof proof;
   Field pci, rsrp, rsrq;
 };
 
 // clang-format off
-constexpr IdleLayout kIdleLayouts[] = {
+constexpr IdleMeasurementLayout kIdleMeasurementLayouts[] = {
     //           PCI         RSRP          RSRQ
     {4, sample,  h(6, 0, 9), w(8, 0, 12),  w(16, 0, 10)},
     {5, checked, h(8, 0, 9), w(12, 0, 12), w(20, 0, 10)},
 };
 // clang-format on
-constexpr auto kIdleVersions = versionsOf(kIdleLayouts);
+constexpr auto kIdleMeasurementVersions = versionsOf(kIdleMeasurementLayouts);
 
 }  // namespace
 
 Versions lteServingMeasurementVersions() {
-  return kVersions;
+  return kMeasurementVersions;
 }
 
 Reading readLteServingMeasurement(const LogPacket& packet, SimState& /*sim*/, EventBatch& events) {
@@ -198,11 +199,11 @@ Reading readLteServingMeasurement(const LogPacket& packet, SimState& /*sim*/, Ev
 }
 
 Versions lteIdleServingMeasurementVersions() {
-  return kIdleVersions;
+  return kIdleMeasurementVersions;
 }
 
 Reading readLteIdleServingMeasurement(const LogPacket& packet, SimState& /*sim*/, EventBatch& events) {
-  const IdleLayout* layout = findLayout(kIdleLayouts, packet.body[0]);
+  const IdleMeasurementLayout* layout = findLayout(kIdleMeasurementLayouts, packet.body[0]);
   if (layout == nullptr) return Reading::passedOver;
 
   ByteReader body(packet.body);

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <iterator>
 
+#include "diag/translation/event_batch.h"
+
 namespace vesk::diag {
 
 using namespace metrics;
@@ -50,14 +52,17 @@ std::optional<std::uint32_t> temporaryIdentity(ByteSpan element) {
   return bigEndian(element.last(4));
 }
 
-KCellularMmCommonInfo equivalentNetworks(ByteSpan element) {
+void addEquivalentNetworks(const Elements& elements, EventBatch& events) {
+  constexpr std::uint8_t kNetworksElement = 0x4A;
+  const auto networks = elements.find(kNetworksElement);
+  if (!networks) return;
   KCellularMmCommonInfo info;
-  for (; element.size() >= 3; element = element.subspan(3)) {
+  for (ByteSpan rest = *networks; rest.size() >= 3; rest = rest.subspan(3)) {
     auto plmn = makeMessage<Plmn>();
-    plmn->setEncodedPlmn(Data::copy(element.first(3)));
+    plmn->setEncodedPlmn(Data::copy(rest.first(3)));
     info.addEplmnList(std::move(plmn));
   }
-  return info;
+  events.add(info);
 }
 
 std::optional<TrackingAreas> readTrackingAreas(ByteSpan bytes) {

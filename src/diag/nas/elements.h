@@ -11,6 +11,16 @@
 /// The pieces that messages of the NAS protocols are made of.
 namespace vesk::diag {
 
+class EventBatch;
+struct SimState;
+
+/// A plain message, and what it changes.
+struct NasMessage {
+  ByteSpan bytes;
+  SimState& sim;
+  EventBatch& events;
+};
+
 /// An element whose value has a size of its own, and so no length byte.
 struct FixedElement {
   std::uint8_t id;
@@ -46,8 +56,8 @@ class Elements {
 [[nodiscard]] std::shared_ptr<metrics::KCellularLocationAreaId> locationArea(std::span<const std::uint8_t, 5> bytes);
 /// The temporary identity of a mobile identity element: none when it has not 5 bytes, or is of another type.
 [[nodiscard]] std::optional<std::uint32_t> temporaryIdentity(ByteSpan element);
-/// The equivalent networks; a rest of fewer than 3 bytes is dropped.
-[[nodiscard]] metrics::KCellularMmCommonInfo equivalentNetworks(ByteSpan element);
+/// Adds what an accept says of equivalent networks, if anything; a rest of fewer than 3 bytes is dropped.
+void addEquivalentNetworks(const Elements& elements, EventBatch& events);
 
 /// Reads a list of tracking areas; none when it is cut off.
 struct TrackingAreas {
@@ -57,5 +67,18 @@ struct TrackingAreas {
 
 /// The causes of a reject that forbid the network, its area or the phone: trying again there is of no use.
 [[nodiscard]] bool forbidsRegistration(std::uint8_t packetServiceCause);
+
+/// Sets the cause of a reject, which is its third byte, and the status `forbidden` where the cause `forbids` to try
+/// again, else `refused`. False, and nothing is set, when the message is cut off.
+template <class Cause, class Context, class Status>
+[[nodiscard]] bool setReject(ByteSpan message, bool (*forbids)(std::uint8_t cause), Status forbidden, Status refused,
+                             Context& context) {
+  ByteReader reader(message);
+  const std::uint8_t cause = reader.byte(2);
+  if (reader.isCutOff()) return false;
+  context.setRejectCause(static_cast<Cause>(cause));
+  context.setUpdateStatus(forbids(cause) ? forbidden : refused);
+  return true;
+}
 
 }  // namespace vesk::diag

@@ -18,20 +18,12 @@ using enum EmmProc;
 using Emm = KCellularEmmContext;
 
 constexpr std::uint8_t kAreaElement = 0x13;
-constexpr std::uint8_t kIdentityElement = 0x23;
-constexpr std::uint8_t kNetworksElement = 0x4A;
+constexpr std::uint8_t kMobileIdentityElement = 0x23;
 constexpr std::uint8_t kGutiElement = 0x50;
 constexpr std::uint8_t kCauseElement = 0x53;
 constexpr std::uint8_t kAreasElement = 0x54;
 constexpr std::uint8_t kTimerElement = 0x5A;
 constexpr std::uint8_t kFeaturesElement = 0x64;
-
-/// A plain message, and what it changes.
-struct EmmMessage {
-  ByteSpan bytes;
-  SimState& sim;
-  EventBatch& events;
-};
 
 void setProcedure(Emm& emm, const std::optional<EmmProc>& procedure) {
   setOrRemove(emm, &Emm::setRegProc, &Emm::setHasRegProc, procedure);
@@ -52,13 +44,13 @@ void setGuti(Emm& emm, ByteSpan identity) {
   emm.setGuti(std::move(guti));
 }
 
-void addBearers(EmmMessage& message) {
+void addBearers(NasMessage& message) {
   auto report = message.sim.bearers.report();
   message.events.add(report);
 }
 
 /// Requests differ in what the last three bits of their third byte mean.
-Reading readRequest(EmmMessage& message, std::optional<EmmProc> (*procedureOf)(unsigned type)) {
+Reading readRequest(NasMessage& message, std::optional<EmmProc> (*procedureOf)(unsigned type)) {
   ByteReader reader(message.bytes);
   const unsigned type = reader.byte(2) & 7U;
   if (reader.isCutOff()) return Reading::damaged;
@@ -94,35 +86,35 @@ std::optional<EmmProc> updateOf(unsigned type) {
   }
 }
 
-Reading readAttachRequest(EmmMessage& message) {
+Reading readAttachRequest(NasMessage& message) {
   return readRequest(message, attachOf);
 }
 
-Reading readUpdateRequest(EmmMessage& message) {
+Reading readUpdateRequest(NasMessage& message) {
   return readRequest(message, updateOf);
 }
 
-Reading readServiceRequest(EmmMessage& message) {
+Reading readServiceRequest(NasMessage& message) {
   message.sim.emm.setRegProc(EMM_PROC_SERV_REQ);
   message.events.add(message.sim.emm);
   return Reading::read;
 }
 
 /// The accept of a combined procedure registers with UMTS and GSM too.
-void addCombined(const Elements& elements, EmmMessage& message) {
+void addCombined(const Elements& elements, NasMessage& message) {
   const auto area = elements.find(kAreaElement);
   if (!area) return;
   KCellularMmContext& mm = message.sim.mm;
   mm.setUpdateStatus(MmUpdateStatus::STATUS_UPDATED);
   mm.setLai(locationArea(area->first<5>()));
   mm.setIsCombinedProc(true);
-  const auto identity = elements.find(kIdentityElement);
+  const auto identity = elements.find(kMobileIdentityElement);
   if (identity && identity->size() == 5) mm.setTmsi(bigEndian(identity->last(4)));
   message.events.add(mm);
 }
 
 /// What attach and update accepts have in common, once all of them is known to be sound.
-void applyAccept(const Elements& elements, bool isCombined, EmmMessage& message) {
+void applyAccept(const Elements& elements, bool isCombined, NasMessage& message) {
   Emm& emm = message.sim.emm;
   if (const auto identity = elements.find(kGutiElement)) setGuti(emm, *identity);
   const auto features = elements.find(kFeaturesElement);
@@ -138,13 +130,10 @@ void applyAccept(const Elements& elements, bool isCombined, EmmMessage& message)
   message.events.add(emm);
 
   if (isCombined) addCombined(elements, message);
-  if (const auto networks = elements.find(kNetworksElement)) {
-    auto info = equivalentNetworks(*networks);
-    message.events.add(info);
-  }
+  addEquivalentNetworks(elements, message.events);
 }
 
-Reading readAttachAccept(EmmMessage& message) {
+Reading readAttachAccept(NasMessage& message) {
   constexpr unsigned kCombined = 2;
   ByteReader reader(message.bytes);
   const unsigned result = reader.byte(2) & 7U;
@@ -167,7 +156,7 @@ Reading readAttachAccept(EmmMessage& message) {
   return Reading::read;
 }
 
-Reading readUpdateAccept(EmmMessage& message) {
+Reading readUpdateAccept(NasMessage& message) {
   constexpr unsigned kCombined = 1;
   constexpr unsigned kCombinedWithInternetVoice = 5;
   ByteReader reader(message.bytes);
@@ -186,20 +175,18 @@ Reading readUpdateAccept(EmmMessage& message) {
   return Reading::read;
 }
 
-Reading readReject(EmmMessage& message) {
-  ByteReader reader(message.bytes);
-  const std::uint8_t cause = reader.byte(2);
-  if (reader.isCutOff()) return Reading::damaged;
+Reading readReject(NasMessage& message) {
+  using enum EpsUpdateStatus;
   Emm& emm = message.sim.emm;
-  emm.setRejectCause(static_cast<EmmCause>(cause));
-  emm.setUpdateStatus(forbidsRegistration(cause) ? EpsUpdateStatus::EPS_STATUS_ROAMING_NOT_ALLOWED
-                                                 : EpsUpdateStatus::EPS_STATUS_NOT_UPDATED);
+  if (!setReject<EmmCause>(message.bytes, forbidsRegistration, EPS_STATUS_ROAMING_NOT_ALLOWED, EPS_STATUS_NOT_UPDATED,
+                           emm))
+    return Reading::damaged;
   emm.setRegProc(EMM_PROC_NO_PROC);
   message.events.add(emm);
   return Reading::read;
 }
 
-Reading readDetachRequest(EmmMessage& message) {
+Reading readDetachRequest(NasMessage& message) {
   message.sim.emm.setRegStatus(RegStatus::KREG_STATUS_SERVICE_DETACHED);
   message.events.add(message.sim.emm);
   message.sim.bearers.reset();
@@ -207,7 +194,7 @@ Reading readDetachRequest(EmmMessage& message) {
   return Reading::read;
 }
 
-Reading readAttachComplete(EmmMessage& message) {
+Reading readAttachComplete(NasMessage& message) {
   ByteReader reader(message.bytes);
   const auto bearerMessage = readEsmMessage(reader.part(4, reader.bigEndian(2, 2)));
   if (reader.isCutOff() || !bearerMessage) return Reading::damaged;
@@ -215,7 +202,7 @@ Reading readAttachComplete(EmmMessage& message) {
   return Reading::read;
 }
 
-Reading readReallocation(EmmMessage& message) {
+Reading readReallocation(NasMessage& message) {
   ByteReader reader(message.bytes);
   const std::size_t size = reader.byte(2);
   const ByteSpan identity = reader.part(3, size);
@@ -228,12 +215,12 @@ Reading readReallocation(EmmMessage& message) {
   return Reading::read;
 }
 
-struct MessageType {
+struct EmmType {
   std::uint8_t type;
-  Reading (*read)(EmmMessage& message);
+  Reading (*read)(NasMessage& message);
 };
 
-constexpr MessageType kTypes[] = {
+constexpr EmmType kEmmTypes[] = {
     {0x41, readAttachRequest},  {0x42, readAttachAccept},  {0x43, readAttachComplete}, {0x44, readReject},
     {0x45, readDetachRequest},  {0x48, readUpdateRequest}, {0x49, readUpdateAccept},   {0x4B, readReject},
     {0x4C, readServiceRequest}, {0x4E, readReject},        {0x50, readReallocation},
@@ -244,12 +231,12 @@ constexpr MessageType kTypes[] = {
 Reading readEmmMessage(ByteSpan bytes, SimState& sim, EventBatch& events) {
   constexpr unsigned kPlain = 0;
   constexpr unsigned kServiceRequest = 12;
-  EmmMessage message{bytes, sim, events};
+  NasMessage message{bytes, sim, events};
   const unsigned protection = bytes[0] >> 4;
   if (protection == kServiceRequest) return readServiceRequest(message);
   if (protection != kPlain) return Reading::read;
   if (bytes.size() < 2) return Reading::damaged;
-  for (const MessageType& row : kTypes) {
+  for (const EmmType& row : kEmmTypes) {
     if (row.type == bytes[1]) return row.read(message);
   }
   return Reading::read;

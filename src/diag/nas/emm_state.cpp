@@ -13,7 +13,7 @@ using namespace metrics;
 using namespace notation;
 using enum RegStatus;
 
-constexpr std::uint8_t kVersion = 2;
+constexpr std::uint8_t kEmmStateVersion = 2;
 constexpr std::size_t kSize = 19;
 constexpr std::uint8_t kGutiType = 6;
 
@@ -38,7 +38,7 @@ constexpr StatusOfState kStatuses[] = {
 
 Reading readEmmState(const LogPacket& packet, SimState& sim, EventBatch& events) {
   ByteReader body(packet.body);
-  if (body.byte(0) != kVersion) return Reading::passedOver;
+  if (body.byte(0) != kEmmStateVersion) return Reading::passedOver;
   if (packet.body.size() < kSize) return Reading::damaged;
 
   setWhenKnown(sim.emm, &KCellularEmmContext::setRegStatus, statusOf(kStatuses, body.byte(1), body.get(h(2))));

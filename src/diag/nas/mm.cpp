@@ -20,8 +20,6 @@ using enum RegStatus;
 using enum NasMmRegProc;
 using Gmm = KCellularGmmContext;
 
-constexpr std::uint8_t kNetworksElement = 0x4A;
-
 constexpr StatusOfState kMmStatuses[] = {
     {19, 8, KREG_STATUS_NORMAL_SERVICE},
     {19, 7, KREG_STATUS_NORMAL_SERVICE},
@@ -73,20 +71,6 @@ Reading readState(const LogPacket& packet, std::span<const StatusOfState> status
   return Reading::read;
 }
 
-void addNetworks(const Elements& elements, EventBatch& events) {
-  if (const auto networks = elements.find(kNetworksElement)) {
-    auto info = equivalentNetworks(*networks);
-    events.add(info);
-  }
-}
-
-/// A message, and what it changes.
-struct NasMessage {
-  ByteSpan bytes;
-  SimState& sim;
-  EventBatch& events;
-};
-
 Reading readLocationAccept(NasMessage& message) {
   constexpr std::uint8_t kIdentityElement = 0x17;
   ByteReader reader(message.bytes);
@@ -109,19 +93,20 @@ Reading readLocationAccept(NasMessage& message) {
   mm.setHasRejectCause(false);
   setWhenKnown(mm, &KCellularMmContext::setTmsi, tmsi);
   message.events.add(mm);
-  addNetworks(Elements(rest, kEpsElements), message.events);
+  addEquivalentNetworks(Elements(rest, kEpsElements), message.events);
   return Reading::read;
 }
 
-Reading readLocationReject(NasMessage& message) {
+bool forbidsLocation(std::uint8_t cause) {
   static constexpr std::uint8_t kForbidding[] = {2, 3, 6, 11, 12, 13, 15};
-  ByteReader reader(message.bytes);
-  const std::uint8_t cause = reader.byte(2);
-  if (reader.isCutOff()) return Reading::damaged;
-  const bool isForbidden = std::find(std::begin(kForbidding), std::end(kForbidding), cause) != std::end(kForbidding);
+  return std::find(std::begin(kForbidding), std::end(kForbidding), cause) != std::end(kForbidding);
+}
+
+Reading readLocationReject(NasMessage& message) {
+  using enum MmUpdateStatus;
   KCellularMmContext& mm = message.sim.mm;
-  mm.setRejectCause(static_cast<NasMmRejectCause>(cause));
-  mm.setUpdateStatus(isForbidden ? MmUpdateStatus::STATUS_ROAMING_NOT_ALLOWED : MmUpdateStatus::STATUS_NOT_UPDATED);
+  if (!setReject<NasMmRejectCause>(message.bytes, forbidsLocation, STATUS_ROAMING_NOT_ALLOWED, STATUS_NOT_UPDATED, mm))
+    return Reading::damaged;
   message.events.add(mm);
   return Reading::read;
 }
@@ -176,7 +161,7 @@ Reading readGprsAccept(std::size_t areaAt, NasMessage& message) {
   if (const auto identity = elements.find(kIdentityElement))
     setWhenKnown(gmm, &Gmm::setPTmsi, temporaryIdentity(*identity));
   message.events.add(gmm);
-  addNetworks(elements, message.events);
+  addEquivalentNetworks(elements, message.events);
   return Reading::read;
 }
 
@@ -189,13 +174,11 @@ Reading readRoutingAccept(NasMessage& message) {
 }
 
 Reading readGprsReject(NasMessage& message) {
-  ByteReader reader(message.bytes);
-  const std::uint8_t cause = reader.byte(2);
-  if (reader.isCutOff()) return Reading::damaged;
+  using enum GprsUpdateStatus;
   Gmm& gmm = message.sim.gmm;
-  gmm.setRejectCause(static_cast<NasMmRejectCause>(cause));
-  gmm.setUpdateStatus(forbidsRegistration(cause) ? GprsUpdateStatus::GPRS_STATUS_ROAMING_NOT_ALLOWED
-                                                 : GprsUpdateStatus::GPRS_STATUS_NOT_UPDATED);
+  if (!setReject<NasMmRejectCause>(message.bytes, forbidsRegistration, GPRS_STATUS_ROAMING_NOT_ALLOWED,
+                                   GPRS_STATUS_NOT_UPDATED, gmm))
+    return Reading::damaged;
   gmm.setRegProc(KNAS_MM_REG_PROC_PROC_NONE);
   message.events.add(gmm);
   return Reading::read;
@@ -204,13 +187,13 @@ Reading readGprsReject(NasMessage& message) {
 constexpr unsigned kMm = 5;
 constexpr unsigned kGmm = 8;
 
-struct MessageType {
+struct MmType {
   std::uint8_t protocol;
   std::uint8_t type;
   Reading (*read)(NasMessage& message);
 };
 
-constexpr MessageType kTypes[] = {
+constexpr MmType kMmTypes[] = {
     {kMm, 0x02, readLocationAccept},    {kMm, 0x04, readLocationReject}, {kGmm, 0x01, readGprsAttachRequest},
     {kGmm, 0x02, readGprsAttachAccept}, {kGmm, 0x04, readGprsReject},    {kGmm, 0x08, readRoutingRequest},
     {kGmm, 0x09, readRoutingAccept},    {kGmm, 0x0B, readGprsReject},
@@ -235,7 +218,7 @@ Reading readNasMessage(const LogPacket& packet, SimState& sim, EventBatch& event
   if (message.bytes.size() < 2) return Reading::read;
   const unsigned protocol = message.bytes[0] & 15U;
   const unsigned type = message.bytes[1] & (protocol == kMm ? kMmTypeBits : 0xFFU);
-  for (const MessageType& row : kTypes) {
+  for (const MmType& row : kMmTypes) {
     if (row.protocol == protocol && row.type == type) return row.read(message);
   }
   return Reading::read;

@@ -1,10 +1,10 @@
 #include "diag/port/command.h"
 
 #include <algorithm>
-#include <array>
 #include <utility>
 
 #include "diag/framing/frame.h"
+#include "diag/framing/packet_reader.h"
 #include "diag/little_endian.h"
 
 namespace vesk::diag {
@@ -27,7 +27,6 @@ constexpr std::uint32_t kMostItems = 0x1000;
 constexpr std::size_t kFirmwareTextOffset = 12;
 
 /// A byte that refuses stands before the refused command.
-constexpr std::array<std::uint8_t, 6> kRefusals = {0x13, 0x14, 0x15, 0x18, 0x42, 0x47};
 constexpr std::uint8_t kUnknownCommand = 0x13;
 constexpr std::uint8_t kLocked = 0x47;
 
@@ -65,7 +64,7 @@ void appendWord(std::vector<std::uint8_t>& out, std::uint32_t word) {
 }
 
 bool isRefusal(Bytes content) {
-  return std::find(kRefusals.begin(), kRefusals.end(), content[0]) != kRefusals.end();
+  return kindOf(content[0]) == PacketKind::refusal;
 }
 
 /// What can be shown of the text that ends with the first byte 0.

@@ -16,7 +16,7 @@ using namespace std::chrono_literals;
 
 namespace {
 
-constexpr std::size_t kAtOnce = std::size_t{64} << 10;
+constexpr std::size_t kReadAtOnce = std::size_t{64} << 10;
 /// Between two looks whether the port has come back.
 constexpr auto kLookAgain = 1s;
 /// A modem that was just plugged in takes a while to answer.
@@ -26,7 +26,7 @@ constexpr auto kBetweenLogsOfState = 60s;
 }  // namespace
 
 PortService::PortService(Port port, std::optional<std::uint32_t> sim, const Clock& clock)
-    : clock_(clock), port_(std::move(port)), receiver_(sim), buffer_(kAtOnce) {}
+    : clock_(clock), port_(std::move(port)), receiver_(sim), buffer_(kReadAtOnce) {}
 
 PortState PortService::state() const {
   const Clock::Instant now = clock_.now();
@@ -120,6 +120,8 @@ bool PortService::sendAndTell(Session& session, EventStream& events) {
     if (!port_.send(*command)) return false;
   }
   for (const std::string& remark : session.takeRemarks())
+    tell(port_.path() + ": " + remark, events);
+  for (const std::string& remark : remarks_.take(receiver_.counts()))
     tell(port_.path() + ": " + remark, events);
   if (session.phase() == Session::Phase::watching) {
     if (state().phase == PortState::Phase::starting)

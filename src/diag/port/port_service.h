@@ -14,6 +14,7 @@
 #include "diag/framing/frame_reader.h"
 #include "diag/port/event_queue.h"
 #include "diag/port/port.h"
+#include "diag/port/port_remarks.h"
 #include "diag/port/session.h"
 #include "diag/receiver.h"
 #include "system/clock.h"
@@ -101,6 +102,7 @@ class PortService final : public ::corvik::Service {
 
   Port port_;
   Receiver receiver_;
+  PortRemarks remarks_;
   std::vector<std::uint8_t> buffer_;
   std::string failure_;
   bool hasWatched_ = false;

@@ -49,10 +49,11 @@ std::vector<std::uint16_t> wantedCodes() {
 constexpr const char* kNoAnswer =
     "no answer: not a diagnostic port; a modem has several ports, try the others (/dev/ttyUSB0, 1, 2, …)";
 constexpr const char* kNoSizes = "the modem answers, but not which logs it has; unplug it and plug it in again";
-constexpr const char* kLocked = "the modem's maker has locked its logs; another firmware or modem is needed";
+constexpr const char* kMakerLocked = "the modem's maker has locked its logs; another firmware or modem is needed";
 constexpr const char* kNoLogs = "the modem answers, but has none of the logs that are read";
 constexpr const char* kSilent =
-    "no log for 10 s: no SIM, airplane mode, or the logs are encrypted or go to another program";
+    "no log for 10 s: is a SIM in, and airplane mode off? Else the logs are encrypted, or go to another program: stop "
+    "it";
 constexpr const char* kEncrypted = "the modem encrypts its logs, and they cannot be read; another firmware is needed";
 
 std::string inWords(std::uint32_t status) {
@@ -147,10 +148,10 @@ void Session::refuse(const Answer& answer, Instant now) {
   const Request request = current_->request();
   if (answer.kind == Answer::Kind::locked && request != Request::firmware) isLocked_ = true;
   if (request == Request::logSizes) {
-    fail(isLocked_ ? kLocked : "the modem does not tell which logs it has" + inWords(answer.status), now);
+    fail(isLocked_ ? kMakerLocked : "the modem does not tell which logs it has" + inWords(answer.status), now);
   } else if (request == Request::logMask) {
     remarks_.push_back("the modem refuses its logs of " + std::string(nameOf(current_->equipment())) +
-                       inWords(answer.status) + ": none will come");
+                       inWords(answer.status) + ": none will come; another firmware may give them");
   }
 }
 
@@ -159,7 +160,8 @@ void Session::takeUnanswered(Instant now) {
   if (phase_ == Phase::starting && request == Request::version) return fail(kNoAnswer, now);
   if (phase_ == Phase::starting && request == Request::logSizes) return fail(kNoSizes, now);
   if (request == Request::logMask)
-    remarks_.push_back("no answer when asked for logs of " + std::string(nameOf(current_->equipment())));
+    remarks_.push_back("no answer when asked for logs of " + std::string(nameOf(current_->equipment())) +
+                       ": if none come, unplug the modem and plug it in again");
   goOn(now);
 }
 
@@ -176,7 +178,7 @@ void Session::addMasks(const std::vector<std::uint32_t>& sizes) {
 }
 
 void Session::startWatching(Instant now) {
-  if (masksInForce_ == 0) return fail(isLocked_ ? kLocked : kNoLogs, now);
+  if (masksInForce_ == 0) return fail(isLocked_ ? kMakerLocked : kNoLogs, now);
   phase_ = Phase::watching;
   noteLog(now);
 }

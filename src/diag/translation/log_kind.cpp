@@ -5,6 +5,7 @@
 
 #include "diag/gsm/gsm_logs.h"
 #include "diag/lte/lte_logs.h"
+#include "diag/lte/subpackets.h"
 #include "diag/nas/nas_logs.h"
 #include "diag/umts/umts_logs.h"
 
@@ -67,6 +68,21 @@ std::optional<std::uint8_t> versionOf(const LogPacket& packet) {
   if (place == none || packet.body.empty()) return std::nullopt;
   const std::uint8_t first = packet.body.front();
   return place == firstByte ? first : static_cast<std::uint8_t>(first >> 6);
+}
+
+std::vector<Version::Subpacket> unreadSubpacketsOf(const LogPacket& packet) {
+  const LogKind* kind = findLogKind(packet.code);
+  const Versions read = kind == nullptr ? Versions{} : kind->versions();
+  if (read.empty() || !read.front().subpacket) return {};
+  std::vector<Version::Subpacket> unread;
+  const Reading reading = readSubpackets(packet, [&](const Subpacket& each) {
+    const Version::Subpacket found{each.id, each.version};
+    const bool isRead =
+        std::any_of(read.begin(), read.end(), [&found](const Version& version) { return version.subpacket == found; });
+    if (!isRead) unread.push_back(found);
+    return Reading::passedOver;
+  });
+  return reading == Reading::damaged ? std::vector<Version::Subpacket>{} : unread;
 }
 
 }  // namespace vesk::diag

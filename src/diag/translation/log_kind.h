@@ -4,6 +4,7 @@
 #include <optional>
 #include <span>
 #include <string_view>
+#include <vector>
 
 #include "diag/layout/version.h"
 #include "diag/packet.h"
@@ -39,5 +40,9 @@ struct LogKind {
 /// The version that a packet says. The packets of a code that is not read are taken to begin with their version, as
 /// most do. Absent for a packet that says none.
 [[nodiscard]] std::optional<std::uint8_t> versionOf(const LogPacket& packet);
+
+/// The subpackets of a packet that are not read, in their order. None where its code is not known to be made of any, or
+/// they are damaged.
+[[nodiscard]] std::vector<Version::Subpacket> unreadSubpacketsOf(const LogPacket& packet);
 
 }  // namespace vesk::diag

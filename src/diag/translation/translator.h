@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <span>
@@ -25,9 +24,6 @@ class Translator {
  public:
   [[nodiscard]] Translation translate(const LogPacket& packet);
 
-  /// A modem has a few SIMs. Of more, those that were heard of last are remembered.
-  static constexpr std::size_t kMostSims = 16;
-
  private:
   [[nodiscard]] SimState& stateOf(std::uint32_t sim);
 
@@ -35,7 +31,7 @@ class Translator {
     std::uint32_t number;
     std::unique_ptr<SimState> state;
   };
-  /// The one that was heard of last comes first.
+  /// No more than kMostSims; the one that was heard of last comes first.
   std::vector<Sim> sims_;
   EventBatch batch_;
 };
