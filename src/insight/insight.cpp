@@ -35,6 +35,7 @@ void Insight::take(const TakenEvent& event, const Stores& stores, std::uint64_t 
     ++counts_.untimed;
     return;
   }
+  later_ = 0;
   if (passing->passed > 0) summary_.pass(passing->passed, before, timeline_);
   events_.clear();
   const Moment moment{time(), number};

@@ -26,16 +26,21 @@ struct Happening {
 class Present {
  public:
   /// The drive's time: milliseconds since 1970-01-01 00:00:00 UTC; absent before the first event with a time.
-  [[nodiscard]] std::optional<std::int64_t> now() const { return clock_.now(); }
+  [[nodiscard]] std::optional<std::int64_t> now() const {
+    return clock_.now() ? std::optional(*clock_.now() + later_) : std::nullopt;
+  }
+  /// Looks at it so many milliseconds after the last event, until the next one comes: for whoever knows that time
+  /// passes while none comes.
+  void setLater(std::int64_t later) { later_ = later; }
   [[nodiscard]] const DriveClock& clock() const { return clock_; }
   [[nodiscard]] const EventCounts& counts() const { return counts_; }
 
   /// What is known now: technology, serving cell, area, connection, registration, carriers, bearers, C-DRX.
   [[nodiscard]] const Timeline& timeline() const { return timeline_; }
   /// The value of a KPI while it is known, and its age in milliseconds.
-  [[nodiscard]] std::optional<double> value(Kpi kpi) const { return timeline_.kpis().at(kpi, time()); }
-  [[nodiscard]] std::optional<std::int64_t> age(Kpi kpi) const { return timeline_.kpis().age(kpi, time()); }
-  [[nodiscard]] std::vector<HeardCell> cellsHeard() const { return heard_.cells(timeline_, time()); }
+  [[nodiscard]] std::optional<double> value(Kpi kpi) const { return timeline_.kpis().at(kpi, seen()); }
+  [[nodiscard]] std::optional<std::int64_t> age(Kpi kpi) const { return timeline_.kpis().age(kpi, seen()); }
+  [[nodiscard]] std::vector<HeardCell> cellsHeard() const { return heard_.cells(timeline_, seen()); }
 
   [[nodiscard]] const ServingDetails& servingDetails() const { return details_; }
 
@@ -46,6 +51,7 @@ class Present {
   [[nodiscard]] const Trend& trend() const { return trend_; }
 
  protected:
+  /// Of the last event.
   [[nodiscard]] std::int64_t time() const { return clock_.now().value_or(0); }
   void keep(const std::vector<TimelineEvent>& events);
 
@@ -55,9 +61,12 @@ class Present {
   ServingDetails details_;
   HeardCells heard_;
   Trend trend_;
+  std::int64_t later_ = 0;
 
  private:
   static constexpr std::size_t kMostHappenings = 2000;
+
+  [[nodiscard]] std::int64_t seen() const { return time() + later_; }
 
   std::deque<Happening> happenings_;
   std::uint64_t happenedBefore_ = 0;

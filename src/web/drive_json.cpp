@@ -75,7 +75,7 @@ void writeCourse(JsonWriter& json, const std::vector<MeasuredPoint>& points) {
 void writeSeries(JsonWriter& json, const DriveRecord& record) {
   JsonObject series(json);
   for (const KpiDescription& each : insight::kKpis) {
-    const auto& points = record.course(each.kpi);
+    const std::vector<MeasuredPoint> points = record.course(each.kpi);
     if (points.empty()) continue;
     series.plainKey(each.name);
     writeCourse(json, points);
@@ -174,6 +174,8 @@ void writeDrive(JsonWriter& json, JsonObject& drive, const DriveRecord& record, 
                  [&](const std::string& cell) { json.write(std::string_view(cell)); });
   drive.plainKey("serving");
   writeServing(json, record);
+  drive.plainKey("serving_width");
+  json.write(record.servingWidth());
   drive.plainKey("marks");
   writeMarks(json, record);
   drive.plainKey("events");

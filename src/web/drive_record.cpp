@@ -32,9 +32,9 @@ void MeasuredPoint::absorb(const MeasuredPoint& later) {
 DriveRecord::DriveRecord(const RecordLimits& limits)
     : limits_(limits),
       stretches_(limits.stretches),
-      courses_(insight::kKpiCount, Thinned<MeasuredPoint>(limits.points)),
-      serving_(limits.points),
-      marks_(kMarkCount, Thinned<MarkPoint>(limits.points)) {}
+      courses_(insight::kKpiCount, Thinned<MeasuredPoint>(limits.points, limits.whole)),
+      serving_(limits.changes, limits.whole),
+      marks_(kMarkCount, Thinned<MarkPoint>(limits.changes, limits.whole)) {}
 
 void DriveRecord::take(const insight::Insight& insight, const insight::Report& report,
                        const std::vector<insight::TimelineEvent>& events) {

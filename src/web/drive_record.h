@@ -49,14 +49,18 @@ inline constexpr std::size_t kMarkCount = 4;
 
 /// How much of a drive is kept.
 struct RecordLimits {
-  /// Of each KPI, of the serving cells and of each mark: as many as a wide screen has pixels.
+  /// Of each KPI: as many as a wide screen has pixels.
   std::size_t points;
+  /// Of serving cells, and of each mark.
+  std::size_t changes;
   /// Of each kind of event. The last are kept.
   std::size_t eventsOfKind;
   std::size_t stretches = 10'000;
+  /// Of how long a time before the last event all points are kept: milliseconds.
+  std::int64_t whole = 0;
 };
 
-inline constexpr RecordLimits kWholeDrive{4096, 2000};
+inline constexpr RecordLimits kWholeDrive{.points = 4096, .changes = 32'768, .eventsOfKind = 2000};
 
 /// What a page shows of a drive, or of a part of it: the course of the KPIs, the serving cells, marks and events. Its
 /// memory is bounded. Positions are milliseconds of counted time, times are milliseconds since 1970-01-01 00:00:00 UTC.
@@ -80,14 +84,16 @@ class DriveRecord {
   [[nodiscard]] bool isEmpty() const { return !hasTaken_; }
 
   [[nodiscard]] const Stretches& stretches() const { return stretches_; }
-  [[nodiscard]] const std::vector<MeasuredPoint>& course(insight::Kpi kpi) const {
+  [[nodiscard]] std::vector<MeasuredPoint> course(insight::Kpi kpi) const {
     return courses_[insight::indexOf(kpi)].points();
   }
-  [[nodiscard]] const std::vector<ServingPoint>& serving() const { return serving_.points(); }
+  [[nodiscard]] std::vector<ServingPoint> serving() const { return serving_.points(); }
+  /// Of cells that served one after the other within so many milliseconds only the last is told.
+  [[nodiscard]] std::int64_t servingWidth() const { return serving_.width(); }
   [[nodiscard]] const std::vector<std::string>& cells() const { return cells_; }
   /// Where in cells() those begin that served for the first time since it was made or cleared.
   [[nodiscard]] std::size_t firstNewCell() const { return firstNewCell_; }
-  [[nodiscard]] const std::vector<MarkPoint>& marks(Mark mark) const {
+  [[nodiscard]] std::vector<MarkPoint> marks(Mark mark) const {
     return marks_[static_cast<std::size_t>(mark)].points();
   }
   /// In the order in which they happened.

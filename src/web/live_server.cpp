@@ -14,8 +14,9 @@ namespace {
 
 constexpr std::chrono::milliseconds kNewsInterval{500};
 /// What a chart can show of half a second; and of a burst of events, what a person can read of it.
-constexpr RecordLimits kNews{32, 50};
-constexpr RecordLimits kLiveDrive{4096, 200};
+constexpr RecordLimits kNews{.points = 32, .changes = 32, .eventsOfKind = 50};
+/// Twice what the page shows at first is whole.
+constexpr RecordLimits kLiveDrive{.points = 4096, .changes = 8192, .eventsOfKind = 200, .whole = 600'000};
 
 /// A connection that says nothing for long is cut on its way, and nobody notices when its visitor is gone.
 constexpr std::chrono::seconds kLongestSilence{15};
@@ -111,6 +112,7 @@ void LiveServer::start(std::unique_ptr<HttpServer> server) {
 }
 
 void LiveServer::take(const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
+  lastEvent_ = RunLoop::main().clock().now();
   whole_.take(sources_.insight, report, events);
   news_.take(sources_.insight, report, events);
 }
@@ -134,7 +136,8 @@ std::string LiveServer::screenMessage(const ScreenWalk& walk) const {
 /// Those who have come since the last news have seen them: they were sent the whole drive.
 void LiveServer::sendNews() {
   std::string state = sources_.state();
-  const bool isNothingNew = news_.isEmpty() && state == lastState_;
+  const std::int64_t second = secondOfDrive();
+  const bool isNothingNew = news_.isEmpty() && state == lastState_ && second == lastSecond_;
   if (!watchers_.empty() && !isNothingNew) {
     const SharedText message = shared(driveMessage("news", news_, appendNewsJson));
     const std::vector<StreamId> watchers(watchers_.begin(), watchers_.end());
@@ -142,6 +145,7 @@ void LiveServer::sendNews() {
       server_->send(watcher, message);
   }
   lastState_ = std::move(state);
+  lastSecond_ = second;
   news_.clear();
   beginning_.reset();
 }
@@ -179,10 +183,12 @@ Response LiveServer::answer(const Request& request) {
 template <class Write>
 Response LiveServer::kept(const Request& request, Write write) {
   Kept& kept = kept_[request.path];
-  if (const std::uint64_t events = sources_.insight.counts().all; kept.text == nullptr || kept.events != events) {
+  const std::uint64_t events = sources_.insight.counts().all;
+  const std::int64_t second = secondOfDrive();
+  if (kept.text == nullptr || kept.events != events || kept.second != second) {
     std::string text;
     write(text);
-    kept = {events, shared(std::move(text))};
+    kept = {events, second, shared(std::move(text))};
   }
   return {.type = kJson, .body = kept.text};
 }
@@ -247,8 +253,16 @@ Response LiveServer::summary(const Request& request) {
 }
 
 Response LiveServer::metrics(const Request& /*request*/) {
+  std::optional<std::chrono::milliseconds> quiet;
+  if (lastEvent_) {
+    quiet = std::chrono::duration_cast<std::chrono::milliseconds>(RunLoop::main().clock().now() - *lastEvent_);
+  }
   return {.type = "text/plain; version=0.0.4; charset=utf-8",
-          .body = shared(prometheusText(sources_.insight, server_ == nullptr ? 0 : server_->visitorCount()))};
+          .body = shared(prometheusText(sources_.insight, quiet, server_ == nullptr ? 0 : server_->visitorCount()))};
+}
+
+std::int64_t LiveServer::secondOfDrive() const {
+  return sources_.insight.now().value_or(0) / 1000;
 }
 
 }  // namespace vesk::web

@@ -54,9 +54,10 @@ class LiveServer {
     bool isChanged = false;
   };
 
-  /// An answer that stays the same until another event has come.
+  /// An answer that stays the same until another event has come, or what is known is a second older.
   struct Kept {
     std::uint64_t events = 0;
+    std::int64_t second = 0;
     SharedText text;
   };
 
@@ -67,8 +68,10 @@ class LiveServer {
   using AppendDrive = void (*)(std::string& out, const DriveRecord& record, const insight::Insight& insight);
   [[nodiscard]] std::string driveMessage(std::string_view event, const DriveRecord& record, AppendDrive append) const;
   [[nodiscard]] std::string screenMessage(const ScreenWalk& walk) const;
+  /// The time of the drive, as far as it makes a difference to what is told.
+  [[nodiscard]] std::int64_t secondOfDrive() const;
 
-  /// What `write` appends to a text, written once for all who ask until another event has come.
+  /// What `write` appends to a text, written once for all who ask as long as it stays the same.
   template <class Write>
   [[nodiscard]] Response kept(const Request& request, Write write);
   [[nodiscard]] Response beginDrive(const Request& request);
@@ -87,6 +90,8 @@ class LiveServer {
   /// What came since the visitors were told last.
   DriveRecord news_;
   std::string lastState_;
+  std::int64_t lastSecond_ = 0;
+  std::optional<Clock::Instant> lastEvent_;
   std::unique_ptr<HttpServer> server_;
   /// Those who watch the drive.
   std::set<StreamId> watchers_;

@@ -72,6 +72,10 @@ Labels cellLabels(const std::optional<insight::ServingCell>& cell) {
 }
 
 void writeNow(PrometheusWriter& out, const insight::Insight& insight) {
+  out.family("vesk_cells_heard", "gauge", "How many cells were heard in the last half minute.");
+  out.sample({}, static_cast<std::uint64_t>(insight.cellsHeard().size()));
+  out.family("vesk_no_service", "gauge", "1 while there is no service.");
+  out.sample({}, insight.timeline().registrations().noServiceSince() ? 1.0 : 0.0);
   const auto& cell = insight.timeline().mobility().cell();
   for (const insight::KpiDescription& each : insight::kKpis) {
     const auto value = insight.value(each.kpi);
@@ -82,10 +86,6 @@ void writeNow(PrometheusWriter& out, const insight::Insight& insight) {
   }
   out.family("vesk_serving_cell_info", "gauge", "1 for the cell that serves.");
   if (cell) out.sample(cellLabels(cell), 1.0);
-  out.family("vesk_cells_heard", "gauge", "How many cells were heard in the last half minute.");
-  out.sample({}, static_cast<std::uint64_t>(insight.cellsHeard().size()));
-  out.family("vesk_no_service", "gauge", "1 while there is no service.");
-  out.sample({}, insight.timeline().registrations().noServiceSince() ? 1.0 : 0.0);
 }
 
 void writeEventCounters(PrometheusWriter& out, const insight::Insight& insight) {
@@ -104,12 +104,19 @@ void writeEventCounters(PrometheusWriter& out, const insight::Insight& insight) 
     out.sample({{"technology", std::string(nameOf(each))}}, static_cast<double>(insight.summary().time(each)) / 1000);
 }
 
-/// One counter of connections, by technology and cause.
-void writeCauses(PrometheusWriter& out, const insight::Insight& insight, std::string_view name, std::string_view help,
+/// One counter of connections by technology, and one by cause too. The first is there from the start, so that its first
+/// step is seen.
+void writeCauses(PrometheusWriter& out, const insight::Insight& insight, const std::string& name, std::string_view help,
                  insight::CauseCounts insight::ConnectionCounts::*causes) {
-  out.family(name, "counter", help);
+  const insight::Connections& connections = insight.timeline().connections();
+  const std::string total = name + "_total";
+  out.family(total, "counter", help);
   for (const insight::Technology technology : insight::kTechnologies)
-    for (const auto& [cause, count] : (insight.timeline().connections().counts(technology).*causes).byCause())
+    out.sample({{"technology", std::string(nameOf(technology))}}, (connections.counts(technology).*causes).total());
+  const std::string byCause = name + "_by_cause_total";
+  out.family(byCause, "counter", help);
+  for (const insight::Technology technology : insight::kTechnologies)
+    for (const auto& [cause, count] : (connections.counts(technology).*causes).byCause())
       out.sample({{"technology", std::string(nameOf(technology))}, {"cause", cause}}, count);
 }
 
@@ -125,19 +132,23 @@ void writeConnections(PrometheusWriter& out, const insight::Insight& insight) {
     for (const insight::Technology each : insight::kTechnologies)
       out.sample({{"technology", std::string(nameOf(each))}}, insight.timeline().connections().counts(each).*count);
   }
-  writeCauses(out, insight, "vesk_connections_dropped_total", "Connections that were lost.",
-              &ConnectionCounts::dropped);
-  writeCauses(out, insight, "vesk_connections_failed_total", "Connections that did not come about.",
+  writeCauses(out, insight, "vesk_connections_dropped", "Connections that were lost.", &ConnectionCounts::dropped);
+  writeCauses(out, insight, "vesk_connections_failed", "Connections that did not come about.",
               &ConnectionCounts::failed);
-  writeCauses(out, insight, "vesk_reestablishments_total", "Re-establishments attempted.",
+  writeCauses(out, insight, "vesk_reestablishments", "Re-establishments attempted.",
               &ConnectionCounts::reestablishments);
 }
 
 }  // namespace
 
-std::string prometheusText(const insight::Insight& insight, std::size_t visitors) {
+std::string prometheusText(const insight::Insight& insight, const std::optional<std::chrono::milliseconds>& quiet,
+                           std::size_t visitors) {
   PrometheusWriter out;
-  writeNow(out, insight);
+  if (quiet) {
+    out.family("vesk_quiet_seconds", "gauge", "How long ago the last metric event came.");
+    out.sample({}, static_cast<double>(quiet->count()) / 1000);
+    if (*quiet <= kLongestQuiet) writeNow(out, insight);
+  }
   writeEventCounters(out, insight);
   writeConnections(out, insight);
   out.family("vesk_visitors", "gauge", "Who is connected to the page.");

@@ -2,31 +2,49 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <deque>
 #include <vector>
 
 namespace vesk::web {
 
 /// The points of a course over a drive's counted time, in a bounded number: when there would be too many, those beside
-/// each other become one. A Point has a `position` in milliseconds, which never falls, and absorb(later).
+/// each other become one; the latest stay as they are. A Point has a `position` in milliseconds, which never falls, and
+/// absorb(later).
 template <class Point>
 class Thinned {
  public:
-  /// `most` is at least 1.
-  explicit Thinned(std::size_t most) : most_(most) {}
+  /// `most` is at least 1, of those before and of the latest, which are those of the last `whole` milliseconds.
+  explicit Thinned(std::size_t most, std::int64_t whole = 0) : most_(most), whole_(whole) {}
 
   void add(const Point& point) {
+    latest_.push_back(point);
+    while (!latest_.empty() && (latest_.size() > most_ || point.position - latest_.front().position >= whole_)) {
+      thin(latest_.front());
+      latest_.pop_front();
+    }
+  }
+  void clear() {
+    points_.clear();
+    latest_.clear();
+    width_ = 1;
+  }
+
+  [[nodiscard]] std::vector<Point> points() const {
+    std::vector<Point> all = points_;
+    all.insert(all.end(), latest_.begin(), latest_.end());
+    return all;
+  }
+  [[nodiscard]] bool isEmpty() const { return points_.empty() && latest_.empty(); }
+  /// Of the intervals in which there is one point at most: milliseconds.
+  [[nodiscard]] std::int64_t width() const { return width_; }
+
+ private:
+  void thin(const Point& point) {
     if (!joins(points_, point)) points_.push_back(point);
     while (points_.size() > most_)
       widen();
   }
-  void clear() {
-    points_.clear();
-    width_ = 1;
-  }
 
-  [[nodiscard]] const std::vector<Point>& points() const { return points_; }
-
- private:
   /// Whether the point lies so close behind the last one that it became a part of it.
   bool joins(std::vector<Point>& points, const Point& point) const {
     if (points.empty() || points.back().position / width_ != point.position / width_) return false;
@@ -43,9 +61,10 @@ class Thinned {
   }
 
   std::size_t most_;
-  /// Of the intervals in which there is one point at most: milliseconds.
+  std::int64_t whole_;
   std::int64_t width_ = 1;
   std::vector<Point> points_;
+  std::deque<Point> latest_;
 };
 
 }  // namespace vesk::web

@@ -42,10 +42,11 @@ std::vector<DriveEvent> levels(std::int64_t count) {
 }
 
 TEST(DriveRecord, KeepsEveryExtremeInABoundedNumberOfPoints) {
-  const RecordedDrive drive(levels(5000), {64, 100});
-  const auto& course = drive.record.course(Kpi::lteRsrp);
-  EXPECT_LE(course.size(), 64U);
-  EXPECT_GT(course.size(), 16U);
+  const RecordedDrive drive(levels(5000), {.points = 64, .changes = 64, .eventsOfKind = 100, .whole = 2000});
+  const auto course = drive.record.course(Kpi::lteRsrp);
+  EXPECT_LE(course.size(), 64U + 20U);
+  EXPECT_GT(course.size(), 16U + 20U);
+  EXPECT_EQ(course[course.size() - 20].position, 498'000) << "the latest stay as they are";
   double least = 0;
   std::int64_t leastAt = 0;
   for (std::size_t at = 0; at < course.size(); ++at) {
@@ -61,7 +62,7 @@ TEST(DriveRecord, KeepsTheLastEventsOfEachKindInTheirOrder) {
   std::vector<DriveEvent> events{lteRrc(0, KLTE_RRC_STATE_IDLE)};
   for (std::uint32_t at = 1; at <= 40; ++at)
     events.push_back(lteCell(at * 1000, 5815, at));
-  const RecordedDrive drive(events, {4096, 10});
+  const RecordedDrive drive(events, {.points = 4096, .changes = 64, .eventsOfKind = 10});
   std::string kinds;
   for (const DriveRecord::Event* each : drive.record.events())
     kinds += std::string(nameOf(each->event.kind)) + " ";
@@ -95,7 +96,7 @@ TEST(DriveRecord, KeepsTimesRightInABoundedNumberOfStretches) {
   const RecordedDrive whole(events);
   EXPECT_EQ(whole.record.stretches().begins().size(), 1000U);
   EXPECT_EQ(whole.record.stretches().error(), 0);
-  const RecordedDrive drive(events, {4096, 100, 64});
+  const RecordedDrive drive(events, {.points = 4096, .changes = 64, .eventsOfKind = 100, .stretches = 64});
   const auto& kept = drive.record.stretches().begins();
   EXPECT_LE(kept.size(), 64U);
   EXPECT_GT(kept.size(), 16U);
@@ -120,8 +121,9 @@ TEST(DriveRecord, TellsNewsAloneAfterItWasCleared) {
   EXPECT_FALSE(drive.record.isEmpty());
   std::string json;
   appendNewsJson(json, drive.record, drive.drive.insight);
-  for (const char* part : {R"({"stretches":[],"time_error":0,"series":{"lte.rsrp":[900,-100],"lte.rsrq":[900,-10]})",
-                           R"("cells":["PCI 271 B17 5815"],"serving":[1000,1])", R"("events":[[1000,)"})
+  for (const char* part :
+       {R"({"stretches":[],"time_error":0,"series":{"lte.rsrp":[900,-100],"lte.rsrq":[900,-10]})",
+        R"("cells":["PCI 271 B17 5815"],"serving":[1000,1],"serving_width":1)", R"("events":[[1000,)"})
     EXPECT_NE(json.find(part), std::string::npos) << part << " is not in\n" << json;
   EXPECT_NE(drive.json().find(R"({"kpis":[{"name":"lte.rsrp")"), std::string::npos);
 }
@@ -129,15 +131,20 @@ TEST(DriveRecord, TellsNewsAloneAfterItWasCleared) {
 TEST(PrometheusText, TellsKnownKpisWithTheirCellAndCountsWhatHappened) {
   const RecordedDrive drive({lteCell(0, 850, 443, 49929738), lteRrc(0, KLTE_RRC_STATE_CONNECTED),
                              lteLevel(500, -125, -20), lteRrc(1300, KLTE_RRC_STATE_IDLE, KLTE_RRC_CAUSE_REL_T310_EXP)});
-  const std::string text = prometheusText(drive.drive.insight, 3);
+  const std::string text = prometheusText(drive.drive.insight, std::chrono::milliseconds(1500), 3);
   for (const char* line :
        {"# TYPE vesk_lte_rsrp_dbm gauge\n"
         "vesk_lte_rsrp_dbm{technology=\"LTE\",channel=\"850\",code=\"443\",cell_id=\"49929738\"} -125\n",
         "\nvesk_metric_events_total{fate=\"stored\"} 4\n", "\nvesk_timeline_events_total{kind=\"drop\"} 1\n",
-        "\nvesk_connections_dropped_total{technology=\"LTE\",cause=\"REL_T310_EXP\"} 1\n",
-        "\nvesk_counted_seconds_total{technology=\"LTE\"} 1.3\n", "\nvesk_visitors 3\n"})
+        "\nvesk_connections_dropped_total{technology=\"LTE\"} 1\n",
+        "\nvesk_connections_dropped_total{technology=\"UMTS\"} 0\n",
+        "\nvesk_connections_dropped_by_cause_total{technology=\"LTE\",cause=\"REL_T310_EXP\"} 1\n",
+        "\nvesk_quiet_seconds 1.5\n", "\nvesk_counted_seconds_total{technology=\"LTE\"} 1.3\n", "\nvesk_visitors 3\n"})
     EXPECT_NE(text.find(line), std::string::npos) << line << " is not in\n" << text;
   EXPECT_EQ(text.find("umts_rscp"), std::string::npos) << "what is unknown has no sample";
+  const std::string quiet = prometheusText(drive.drive.insight, std::chrono::milliseconds(30'001), 3);
+  EXPECT_EQ(quiet.find("lte_rsrp"), std::string::npos) << "what was said long ago has no sample";
+  EXPECT_NE(quiet.find("\nvesk_quiet_seconds 30"), std::string::npos);
 }
 
 }  // namespace

@@ -12,6 +12,8 @@ namespace {
 
 std::string titleOf(const RecordingInput& input) {
   if (input.path == "-") return "standard input";
+  // A capture is often called after the subscriber.
+  if (input.isRedacted) return "redacted recording";
   return input.path->substr(input.path->rfind('/') + 1);
 }
 

@@ -91,6 +91,8 @@ class Run {
     if (isJudging_) judgeRules();
     root_ = &root;
     if (!isHeadless_) openTerminal(application, root);
+    std::optional<Timer> aging;
+    if (!isHeadless_) aging.emplace(loop_, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { growOlder(); });
     if (isJudging_ || !isHeadless_) insight_.observeEventsOf(*MetricValidator::shared());
     const std::optional<std::string> reason = whyNoMetricArrives(root);
     if (reason) tell(*reason);
@@ -112,6 +114,13 @@ class Run {
     if (isOnTheWay_) return;
     OutputLines::print({"Alert:", alert});
     if (terminal_ != nullptr) terminal_->tell("Alert: " + alert, true);
+  }
+
+  /// What is known grows old while no event comes, too.
+  void growOlder() {
+    if (isOnTheWay_ || moment_.sinceLastEvent() == 0) return;
+    insight_.setLater(moment_.sinceLastEvent());
+    terminal_->setNeedsDisplay();
   }
 
   void openTerminal(Application& application, NavigationController& root) {

@@ -6,6 +6,7 @@
 
 #include "app/commands/row_readings.h"
 #include "app/program/app_delegate.h"
+#include "app/program/drive_time.h"
 #include "app/program/stop_signals.h"
 #include "app/program/vesk_interface.h"
 #include "app/source/play_recording.h"
@@ -82,9 +83,14 @@ class Serving {
     if (page == nullptr) return fail("vesk: " + reason);
     tellPlace(page->port());
     insight_.setStepHandler([&](const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
+      time_.take(insight_.clock().now(), clock_.now());
       page->take(report, events);
     });
     insight_.observeEventsOf(*MetricValidator::shared());
+    // What is known grows old while no event comes, too.
+    const Timer aging(loop_, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] {
+      insight_.setLater(time_.passedSince(insight_.clock().now(), clock_.now(), source_.state().pace));
+    });
     std::optional<Timer> end;
     if (options_.duration) end.emplace(loop_, *options_.duration, RunLoopMode::defaultMode, [this] { loop_.stop(); });
     loop_.run();
@@ -114,6 +120,7 @@ class Serving {
   Redaction redaction_;
   EventSource source_;
   insight::Insight insight_;
+  DriveTime time_;
   AppDelegate delegate_;
 };
 

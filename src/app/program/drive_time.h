@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <chrono>
 #include <cstdint>
 #include <optional>
@@ -34,6 +35,11 @@ class DriveTime {
     if (!at_) return {};
     const std::chrono::duration<double, std::milli> passed = (now - *at_) * pace;
     return {last_ + std::chrono::duration_cast<std::chrono::milliseconds>(passed), pace};
+  }
+
+  /// What has passed since `time`, the drive's own: milliseconds.
+  [[nodiscard]] std::int64_t passedSince(std::optional<std::int64_t> time, Clock::Instant now, double pace) const {
+    return time ? std::max<std::int64_t>(at(now, pace).time.count() - *time, 0) : 0;
   }
 
  private:

@@ -39,6 +39,10 @@ class ShownMoment {
 
   [[nodiscard]] std::optional<Arrivals> arrivals(std::string_view area, std::string_view category) const;
   [[nodiscard]] DriveMoment time() const;
+  /// What has passed of the drive since its last event, held or not: milliseconds.
+  [[nodiscard]] std::int64_t sinceLastEvent() const {
+    return time_.passedSince(drive_.clock().now(), clock_.now(), pace_());
+  }
   /// "2018-01-20 21:53:05 UTC"; empty for a drive without dates.
   [[nodiscard]] std::string date() const;
   /// What the handset is on in place of the technology that a category is of; empty while it is on that, and for what

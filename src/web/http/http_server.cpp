@@ -206,8 +206,9 @@ void HttpServer::send(StreamId stream, const SharedText& piece) {
   if (found == visitors_.end()) return;
   Visitor& visitor = found->second;
   const std::size_t beginning = visitor.pieces.empty() ? 0 : visitor.pieces.front()->size();
+  // A piece that alone is larger is sent to one for whom nothing else waits.
+  const bool isTooMuch = visitor.waiting > 0 && visitor.waiting + piece->size() > kMostWaiting + beginning;
   queue(visitor, piece);
-  const bool isTooMuch = visitor.waiting > kMostWaiting + beginning;
   if (isTooMuch || !flush(stream, visitor)) drop(stream);
   relieve();
 }
