@@ -1,7 +1,15 @@
 # Every target of the project is made by one of these two functions, so that warnings, the include root and the
 # link line (what the code may include and call) are stated the same way everywhere.
 
+# What users run lies at another address at each start, guards its buffers, and cannot have its tables overwritten that
+# the loader has filled.
+add_library(vesk_hardening INTERFACE)
+target_compile_options(vesk_hardening INTERFACE
+  "$<$<CONFIG:Release>:-fPIE;-fstack-protector-strong;-U_FORTIFY_SOURCE;-D_FORTIFY_SOURCE=2>")
+target_link_options(vesk_hardening INTERFACE "$<$<CONFIG:Release>:LINKER:-z,relro,-z,now>")
+
 add_library(vesk_options INTERFACE)
+target_link_libraries(vesk_options INTERFACE vesk_hardening)
 target_compile_options(vesk_options INTERFACE -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror)
 target_include_directories(vesk_options INTERFACE ${CMAKE_SOURCE_DIR}/src)
 
