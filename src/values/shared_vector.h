@@ -56,10 +56,7 @@ class SharedVector {
   T& emplace(Parts&&... parts) {
     const std::size_t count = size();
     if (block_ == nullptr || count == block_->capacity || !isOnlyOwner()) [[unlikely]] {
-      // Made first: the parts may be of this very sequence.
-      T item{std::forward<Parts>(parts)...};
-      reallocate(std::max<std::size_t>({kLeastCapacity, count + 1, count * 2}));
-      return *place(count, std::move(item));
+      return *emplaceInNewBlock(std::forward<Parts>(parts)...);
     }
     return *place(count, std::forward<Parts>(parts)...);
   }
@@ -103,6 +100,16 @@ class SharedVector {
     T* item = new (block_->items() + index) T{std::forward<Parts>(parts)...};
     ++block_->size;
     return item;
+  }
+
+  /// Not a part of emplace(): with an item on its stack, every call of that would set up and check a stack guard.
+  template <class... Parts>
+  [[gnu::noinline]] T* emplaceInNewBlock(Parts&&... parts) {
+    const std::size_t count = size();
+    // Made first: the parts may be of this very sequence.
+    T item{std::forward<Parts>(parts)...};
+    reallocate(std::max<std::size_t>({kLeastCapacity, count + 1, count * 2}));
+    return place(count, std::move(item));
   }
 
   void reallocate(std::size_t capacity) {
