@@ -19,15 +19,13 @@ function(vesk_layer name)
   cmake_parse_arguments(LAYER "" "" "SOURCES;SHOWS;SEES;USES" ${ARGN})
   add_library(${name} STATIC ${LAYER_SOURCES})
   target_link_libraries(${name} PUBLIC vesk_options ${LAYER_SHOWS} PRIVATE ${LAYER_SEES} ${LAYER_USES})
-  set_target_properties(${name} PROPERTIES
-    UNITY_BUILD ${VESK_UNITY}
-    UNITY_BUILD_BATCH_SIZE 0
-    CXX_CLANG_TIDY "${VESK_TIDY_COMMAND}")
+  set_target_properties(${name} PROPERTIES UNITY_BUILD ${VESK_UNITY} UNITY_BUILD_BATCH_SIZE 0)
 endfunction()
 
 # vesk_program(NAME SOURCES ... [SEES ...] [USES ...]): an executable in bin/.
 function(vesk_program name)
   cmake_parse_arguments(PROGRAM "" "" "SOURCES;SEES;USES" ${ARGN})
   add_executable(${name} ${PROGRAM_SOURCES})
+  set_target_properties(${name} PROPERTIES UNITY_BUILD ${VESK_UNITY} UNITY_BUILD_BATCH_SIZE 0)
   target_link_libraries(${name} PRIVATE vesk_options ${PROGRAM_SEES} ${PROGRAM_USES})
 endfunction()
