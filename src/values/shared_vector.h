@@ -102,7 +102,8 @@ class SharedVector {
     return item;
   }
 
-  /// Not a part of emplace(): with an item on its stack, every call of that would set up and check a stack guard.
+  /// Not a part of emplace(): with an item on its stack, every call of that would set up and check a stack guard, 3 %
+  /// of the instructions of `vesk stores`.
   template <class... Parts>
   [[gnu::noinline]] T* emplaceInNewBlock(Parts&&... parts) {
     const std::size_t count = size();
@@ -129,6 +130,8 @@ class SharedVector {
 
   void release() noexcept {
     if (block_ == nullptr) return;
+    // The only owner need not pay for a locked decrement, which takes 1.5 % of the time of `vesk decode` and `vesk
+    // stores`: nobody else can take a count any more.
     if (isOnlyOwner() || block_->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
       std::destroy_n(block_->items(), block_->size);
       const std::size_t capacity = block_->capacity;
