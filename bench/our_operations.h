@@ -27,7 +27,7 @@ constexpr OurOperations ourOperations() {
       .write =
           [](const ProtoCodable& message, ProtoWriter& writer) {
             writer.clear();
-            static_cast<const Message&>(message).Message::writeTo(writer);
+            static_cast<const Message&>(message).writeTo(writer);
             return Data::copy(writer.written());
           },
   };

@@ -8,10 +8,11 @@ function(vesk_link_statically program)
   if(NOT CMAKE_BUILD_TYPE STREQUAL "Release")
     return()
   endif()
-  # The linker is told, not the compiler: with -static, that leaves out the sorted table of functions, and the first
-  # exception, which every --help and every mistake on the command line is, waits for it to be made.
-  set(options -Wl,-static -static-libgcc -no-pie)
+  # Not -static: that leaves out the sorted table of functions, and the first exception, which every --help and every
+  # mistake on the command line is, waits for it to be made.
+  set(options -static-pie)
   cmake_push_check_state(RESET)
+  set(CMAKE_REQUIRED_FLAGS -fPIE)
   set(CMAKE_REQUIRED_LINK_OPTIONS ${options})
   set(CMAKE_REQUIRED_LIBRARIES tinfo)
   check_cxx_source_compiles("#include <string>\nint main(int, char** argv) { return std::string(*argv).empty(); }"
@@ -20,6 +21,7 @@ function(vesk_link_statically program)
   if(VESK_LINKS_STATICALLY)
     target_link_options(${program} PRIVATE ${options})
   else()
+    target_link_options(${program} PRIVATE -pie)
     message(STATUS "No archives of all libraries: ${program} is linked with the shared ones and starts slower")
   endif()
 endfunction()

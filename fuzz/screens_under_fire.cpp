@@ -152,7 +152,7 @@ class Fire {
 
   void resize() {
     constexpr std::array kSizes{Size{1, 1}, Size{500, 200}, Size{0, 0}, Size{500, 1}, Size{1, 200}, Size{80, 24}};
-    const std::size_t choice = static_cast<std::size_t>(pick(2 * kSizes.size()));
+    const auto choice = static_cast<std::size_t>(pick(2 * kSizes.size()));
     terminal_.resize(choice < kSizes.size() ? kSizes[choice] : Size{1 + pick(200), 1 + pick(60)});
     ++resizes_;
   }

@@ -33,8 +33,8 @@ bool RecordFile::append(std::string_view piece) {
     if (count < 0 && errno == EINTR) continue;
     if (count < 0) {
       failure_ = path_ + ": " + std::strerror(errno);
-      // What was written of the piece; a pipe has no way back.
-      static_cast<void>(ftruncate(descriptor_.get(), size_));
+      // What was written of the piece goes; a pipe, which has no way back, is no file to be left whole.
+      if (ftruncate(descriptor_.get(), size_) != 0 && errno != EINVAL) *failure_ += "; its end is not whole";
       return false;
     }
     left.remove_prefix(static_cast<std::size_t>(count));

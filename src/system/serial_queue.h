@@ -40,13 +40,11 @@ class SerialQueue {
   [[nodiscard]] bool waitUntilFewerThan(std::size_t count, const std::stop_token& stop);
 
  private:
-  static constexpr std::size_t kCacheLine = 64;
-
   /// Takes what waits when the last batch is done. Whether there is a task to run.
   [[nodiscard]] bool hasNext();
 
   /// Guards what lies below it, up to the batch.
-  alignas(kCacheLine) std::mutex waitingLock_;
+  std::mutex waitingLock_;
   std::vector<Task> waiting_;
   std::condition_variable_any posted_;
   std::condition_variable_any taken_;
@@ -57,7 +55,7 @@ class SerialQueue {
   std::atomic<bool> isSuspended_ = false;
 
   /// The runner's own: the tasks under way, and how many of them have begun.
-  alignas(kCacheLine) std::vector<Task> batch_;
+  std::vector<Task> batch_;
   std::size_t next_ = 0;
 };
 

@@ -38,14 +38,18 @@ class JsonWriter {
   void write(const Dictionary& dictionary);
   void write(const Value& value);
 
-  /// The same of a text that holds nothing to be escaped, such as an identifier.
-  void writePlain(std::string_view name) {
-    if (name.size() + 2 > gathered_.size()) return write(name);
-    char* const place = roomFor(name.size() + 2);
-    place[0] = '"';
-    std::copy_n(name.data(), name.size(), place + 1);
-    place[name.size() + 1] = '"';
-    size_ += name.size() + 2;
+  static constexpr std::size_t kLongestPlainKey = 256;
+  /// A separator, a name and a colon. The name is no longer than that and holds nothing to be escaped, as an
+  /// identifier.
+  void putPlainKey(char separator, std::string_view name) {
+    const std::size_t size = name.size() + 4;
+    char* const place = roomFor(size);
+    place[0] = separator;
+    place[1] = '"';
+    std::copy_n(name.data(), name.size(), place + 2);
+    place[size - 2] = '"';
+    place[size - 1] = ':';
+    size_ += size;
   }
 
   /// A character of JSON's own.
@@ -93,11 +97,11 @@ class JsonObject {
     json_.write(name);
     json_.put(':');
   }
-  /// The same under a name as writePlain() takes it.
+  /// The same under a name that holds nothing to be escaped.
   void plainKey(std::string_view name) {
-    separate();
-    json_.writePlain(name);
-    json_.put(':');
+    if (name.size() > JsonWriter::kLongestPlainKey) return key(name);
+    json_.putPlainKey(separator_, name);
+    separator_ = ',';
   }
   void end() {
     if (separator_ == '{') json_.put('{');

@@ -19,9 +19,7 @@ SharedBytes SharedBytes::copy(std::string_view bytes) {
 
 void SharedBytes::release() noexcept {
   Block* const released = block();
-  // The only owner need not pay for a locked decrement: nobody else can take a count any more.
-  if (released->owners.load(std::memory_order_acquire) == 1 ||
-      released->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
+  if (released->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
     const std::size_t size = sizeof(Block) + released->size;
     released->~Block();
     RecycledMemory::release(released, size);

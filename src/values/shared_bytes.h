@@ -55,7 +55,8 @@ class SharedBytes {
   }
 
  private:
-  /// Whether a block is immortal is known without a look at it.
+  /// Whether a block is immortal is known without a look at it. With literals counted as all else is, `vesk decode`
+  /// takes 8 % more time and `vesk stores` 5 %.
   static constexpr std::uintptr_t kImmortalBit = 1;
   static_assert(alignof(Block) > kImmortalBit);
 

@@ -56,10 +56,7 @@ class SharedVector {
   T& emplace(Parts&&... parts) {
     const std::size_t count = size();
     if (block_ == nullptr || count == block_->capacity || !isOnlyOwner()) [[unlikely]] {
-      // Made first: the parts may be of this very sequence.
-      T item{std::forward<Parts>(parts)...};
-      reallocate(std::max<std::size_t>({kLeastCapacity, count + 1, count * 2}));
-      return *place(count, std::move(item));
+      return *emplaceInNewBlock(std::forward<Parts>(parts)...);
     }
     return *place(count, std::forward<Parts>(parts)...);
   }
@@ -105,6 +102,17 @@ class SharedVector {
     return item;
   }
 
+  /// Not a part of emplace(): with an item on its stack, every call of that would set up and check a stack guard, 3 %
+  /// of the instructions of `vesk stores`.
+  template <class... Parts>
+  [[gnu::noinline]] T* emplaceInNewBlock(Parts&&... parts) {
+    const std::size_t count = size();
+    // Made first: the parts may be of this very sequence.
+    T item{std::forward<Parts>(parts)...};
+    reallocate(std::max<std::size_t>({kLeastCapacity, count + 1, count * 2}));
+    return place(count, std::move(item));
+  }
+
   void reallocate(std::size_t capacity) {
     void* storage = RecycledMemory::allocate(Block::bytesFor(capacity));
     auto* block = new (storage) Block(capacity);
@@ -122,6 +130,8 @@ class SharedVector {
 
   void release() noexcept {
     if (block_ == nullptr) return;
+    // The only owner need not pay for a locked decrement, which takes 1.5 % of the time of `vesk decode` and `vesk
+    // stores`: nobody else can take a count any more.
     if (isOnlyOwner() || block_->owners.fetch_sub(1, std::memory_order_acq_rel) == 1) {
       std::destroy_n(block_->items(), block_->size);
       const std::size_t capacity = block_->capacity;

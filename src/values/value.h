@@ -67,10 +67,10 @@ class Dictionary {
   void reserve(std::size_t capacity);
   /// Replaces the value in its place, or adds the entry at the end.
   void set(Text key, Value value);
-  /// Adds an entry under a key that the dictionary does not hold yet, without looking; `value` is a value, or
+  /// Adds an entry under a key, a Text, that the dictionary does not hold yet, without looking; `value` is a value, or
   /// whatever makes one.
-  template <class Held>
-  void append(Text key, Held&& value);
+  template <class Key, class Held>
+  void append(Key&& key, Held&& value);
   /// Takes the entry out, if there is one.
   void erase(const Text& key);
   void clear() { entries_.clear(); }
@@ -162,9 +162,9 @@ inline const Dictionary::Entry* Dictionary::end() const {
 inline void Dictionary::reserve(std::size_t capacity) {
   entries_.reserve(capacity);
 }
-template <class Held>
-void Dictionary::append(Text key, Held&& value) {
-  entries_.emplace(std::move(key), std::forward<Held>(value));
+template <class Key, class Held>
+void Dictionary::append(Key&& key, Held&& value) {
+  entries_.emplace(std::forward<Key>(key), std::forward<Held>(value));
 }
 
 }  // namespace vesk

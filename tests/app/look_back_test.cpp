@@ -74,7 +74,7 @@ TEST(LookBack, LeavesWhatPlayingUpToThereLeaves) {
   for (const handset::HandsetEvent& each : events) {
     if (each.kind == handset::HandsetEvent::Kind::trigger) continue;
     appendRecordedEvent(recording, {static_cast<double>(each.atMs) / 1000, each.id, each.payload.bytes()});
-    if (each.atMs > 1000 * kSeconds) continue;
+    if (each.atMs > std::int64_t{kSeconds} * 1000) continue;
     ++count;
     straight.intake->validateMetric(*corvik::makeMetricEvent(each.id, each.payload.bytes()).ordinary());
   }

@@ -14,12 +14,11 @@ namespace vesk::diag {
 namespace {
 
 using namespace std::chrono_literals;
-using Phase = PortState::Phase;
 using Texts = std::vector<std::string>;
 
-const std::string kMasksOff = "73 00 00 00 00 00 00 00";
+const std::string kNoMasks = "73 00 00 00 00 00 00 00";
 /// An LTE cell, which gives two events.
-const std::string kCell =
+const std::string kCellPacket =
     "10 00 29 00 29 00 C2 B0 4C 6B 4E 4E 2A CA D3 00 03 B9 00 94 16 00 00 E4 5C 00 00 32 32 11 86 A4 02 08 54 11 00 00 "
     "00 36 01 03 9A 01 00";
 
@@ -73,8 +72,8 @@ class PortServiceTest : public testing::Test {
   /// The service stops in a thread of its own, for it waits for the modem.
   void stop() {
     std::jthread stopping([this] { service_->disconnect(client_); });
-    EXPECT_EQ(modem_.next(), kMasksOff);
-    modem_.send(kMasksOff + " 00 00 00 00");
+    EXPECT_EQ(modem_.next(), kNoMasks);
+    modem_.send(kNoMasks + " 00 00 00 00");
   }
   /// Lets the time pass that the service waits, and no more.
   void passTime() { clock_.advance(clock_.waitForSleeper()); }
@@ -90,24 +89,24 @@ TEST_F(PortServiceTest, RaisesWhatTheModemLogsAndEndsItsLogs) {
   modem_.answerUntilItWatches();
   modem_.sendBytes(bytesOf("01 02 03 7E"));
   modem_.send("92 01");
-  modem_.send(kCell);
+  modem_.send(kCellPacket);
   const std::string cell = std::to_string(K_LTE_SCELL_INFO);
   const std::string carriers = std::to_string(K_LTE_COMPCARR_INFO);
   Texts noted = client_.upTo(carriers);
   std::erase(noted, "frame");
   EXPECT_EQ(Texts(noted.end() - 2, noted.end()), (Texts{cell, carriers}));
   const PortState state = service_->state();
-  EXPECT_EQ(state.phase, Phase::watching);
+  EXPECT_EQ(state.phase, PortState::Phase::watching);
   EXPECT_EQ(state.damaged, 1U);
   EXPECT_EQ(state.dropped, 0U);
   stop();
-  EXPECT_EQ(service_->state().phase, Phase::ended);
+  EXPECT_EQ(service_->state().phase, PortState::Phase::ended);
 }
 
 TEST_F(PortServiceTest, WaitsForAnUnpluggedModemAndSetsItsMasksAnew) {
   connect();
   modem_.answerUntilItWatches();
-  modem_.send(kCell);
+  modem_.send(kCellPacket);
   client_.upTo(std::to_string(K_LTE_COMPCARR_INFO));
   modem_.unplug();
   client_.upTo("was unplugged");
@@ -116,7 +115,7 @@ TEST_F(PortServiceTest, WaitsForAnUnpluggedModemAndSetsItsMasksAnew) {
   passTime();
   client_.upTo("is back");
   modem_.answerUntilItWatches();
-  modem_.send(kCell);
+  modem_.send(kCellPacket);
   client_.upTo(std::to_string(K_LTE_COMPCARR_INFO));
   stop();
 }
@@ -135,7 +134,7 @@ TEST_F(PortServiceTest, TellsThatNothingAnswers) {
 TEST_F(PortServiceTest, TellsOfSilence) {
   connect();
   modem_.answerUntilItWatches();
-  while (service_->state().phase != Phase::silent)
+  while (service_->state().phase != PortState::Phase::silent)
     passTime();
   client_.upTo("no log for 10 s");
   stop();
@@ -147,7 +146,7 @@ TEST_F(PortServiceTest, SaysOnceWhatIsWrongWithWhatComes) {
   for (int time = 0; time < 2; ++time) {
     for (int count = 0; count < 10; ++count)
       modem_.sendBytes(bytesOf("01 02 03 7E"));
-    modem_.send("98 01 00 00 02 00 00 00 " + kCell);
+    modem_.send("98 01 00 00 02 00 00 00 " + kCellPacket);
     modem_.send("10 00 0D 00 0D 00 25 41 00 00 00 00 00 00 00 00 01");
   }
   stop();

@@ -8,17 +8,17 @@
 namespace vesk::diag {
 
 TEST(Translator, EachSimHasItsOwnState) {
-  constexpr std::uint16_t kMmState = 0x7131;
+  constexpr std::uint16_t kState = 0x7131;
   const std::string service = "MmContext{reg_status: KREG_STATUS_NORMAL_SERVICE";
   Translator translator;
-  EXPECT_EQ(told(translator, kMmState, "b0=19 b1=8 b2=255", 1, 1), service + "}");
-  EXPECT_EQ(told(translator, kMmState, "b0=0 b2=0", 2, 2), "MmContext{update_status: STATUS_UPDATED}");
-  EXPECT_EQ(told(translator, kMmState, "b0=0 b2=1", 3, 1), service + ", update_status: STATUS_NOT_UPDATED}");
+  EXPECT_EQ(told(translator, kState, "b0=19 b1=8 b2=255", 1, 1), service + "}");
+  EXPECT_EQ(told(translator, kState, "b0=0 b2=0", 2, 2), "MmContext{update_status: STATUS_UPDATED}");
+  EXPECT_EQ(told(translator, kState, "b0=0 b2=1", 3, 1), service + ", update_status: STATUS_NOT_UPDATED}");
   // However many SIMs a broken capture names, only so many are remembered.
   for (std::uint32_t sim = 3; sim < 3 + kMostSims - 1; ++sim)
-    EXPECT_EQ(told(translator, kMmState, "b0=0 b2=255", 4, sim), "MmContext{}");
-  EXPECT_EQ(told(translator, kMmState, "b0=0 b2=255", 5, 1), service + ", update_status: STATUS_NOT_UPDATED}");
-  EXPECT_EQ(told(translator, kMmState, "b0=0 b2=255", 5, 2), "MmContext{}");
+    EXPECT_EQ(told(translator, kState, "b0=0 b2=255", 4, sim), "MmContext{}");
+  EXPECT_EQ(told(translator, kState, "b0=0 b2=255", 5, 1), service + ", update_status: STATUS_NOT_UPDATED}");
+  EXPECT_EQ(told(translator, kState, "b0=0 b2=255", 5, 2), "MmContext{}");
 }
 
 TEST(Translator, KindsAreFoundByTheirCodes) {

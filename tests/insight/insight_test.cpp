@@ -150,7 +150,8 @@ TEST(Summary, IsBoundedHoweverManyCellsAreVisited) {
   Drive drive;
   drive.insight.setStepHandler(nullptr);
   for (std::uint32_t index = 0; index < 5000; ++index)
-    drive.play({lteCell(index * 1000, 5815, index % 504, index), lteLevel(index * 1000, -90)});
+    drive.play(
+        {lteCell(std::int64_t{index} * 1000, 5815, index % 504, index), lteLevel(std::int64_t{index} * 1000, -90)});
   EXPECT_EQ(drive.insight.summary().cells().count(), 4096);
   EXPECT_EQ(drive.insight.happenings().size(), 2000);
   EXPECT_EQ(drive.insight.trend().points(Kpi::lteRsrp).size(), 3600);

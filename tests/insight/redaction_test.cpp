@@ -3,12 +3,14 @@
 #include <gtest/gtest.h>
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "messages/registry/metric_classes.h"
 #include "messages/registry/metric_of_message.h"
+#include "support/metric_events.h"
 
 namespace vesk::insight {
 
@@ -18,13 +20,7 @@ using namespace metrics;
 
 using Bytes = std::vector<std::uint8_t>;
 
-Bytes encoded(const ProtoCodable& message) {
-  ProtoWriter writer;
-  message.writeTo(writer);
-  return {writer.written().begin(), writer.written().end()};
-}
-
-Bytes redacted(std::int64_t metricId, const Bytes& payload) {
+Bytes redacted(std::int64_t metricId, std::span<const std::uint8_t> payload) {
   const std::optional<Data> data = redactedPayload(metricId, payload);
   if (!data) return {};
   EXPECT_EQ(redactedPayload(metricId, data->bytes()), data) << "again";
@@ -36,18 +32,18 @@ template <class MetricMessage>
 std::string redactedFields(const MetricMessage& message) {
   std::string fields;
   EXPECT_TRUE(findMetricClass(kMetricId<MetricMessage>)
-                  ->appendJson(fields, redacted(kMetricId<MetricMessage>, encoded(message))));
+                  ->appendJson(fields, redacted(kMetricId<MetricMessage>, encoded(message).bytes())));
   return fields;
 }
 
-Data bytes(Bytes content) {
+Data dataOf(Bytes content) {
   return Data::copy(content);
 }
 
 TEST(Redaction, MasksWhatNamesTheSubscriberAndNothingElse) {
   KCellularMmCommonInfo common;
   common.setTimestamp(7);
-  common.setImsi(bytes({1, 2, 3}));
+  common.setImsi(dataOf({1, 2, 3}));
   EXPECT_EQ(redactedFields(common), R"({"timestamp":7,"imsi":"0x000000"})");
 
   KCellularEmmContext emm;
@@ -71,9 +67,9 @@ TEST(Redaction, MasksWhatNamesTheSubscriberAndNothingElse) {
   auto bearer = std::make_shared<BearerContext>();
   bearer->setNsapi(5);
   bearer->setApn("corp.Internet"_text);
-  bearer->setPdpAddr(bytes({10, 0, 0, 1}));
-  bearer->setPrimaryDnsAddr(bytes({8}));
-  bearer->setSecondaryDnsAddr(bytes({}));
+  bearer->setPdpAddr(dataOf({10, 0, 0, 1}));
+  bearer->setPrimaryDnsAddr(dataOf({8}));
+  bearer->setSecondaryDnsAddr(dataOf({}));
   bearers.addBearerContexts(bearer);
   bearers.addBearerContexts(std::make_shared<BearerContext>());
   EXPECT_EQ(redactedFields(bearers),
@@ -90,7 +86,7 @@ TEST(Redaction, MasksWhatNamesTheSubscriberAndNothingElse) {
        {std::optional(0x6F07U), std::optional(0x6FADU), std::optional(0x1234U), std::optional<std::uint32_t>()}) {
     auto file = std::make_shared<ElementaryFile>();
     if (identifier) file->setEfId(*identifier);
-    file->setContent(bytes({9, 9}));
+    file->setContent(dataOf({9, 9}));
     files.addEfList(file);
   }
   EXPECT_EQ(redactedFields(files),
@@ -113,7 +109,8 @@ TEST(Redaction, MasksTheLabelsOfAnAccessPointThatMayTellWhoseItIs) {
 TEST(Redaction, DropsUnknownFieldsAndWhatNobodyKnows) {
   KCellularLteRrcState state;
   state.setState(LteRrcState::KLTE_RRC_STATE_CONNECTED);
-  const Bytes known = encoded(state);
+  const Data payload = encoded(state);
+  const Bytes known(payload.bytes().begin(), payload.bytes().end());
   Bytes withIdentity = known;
   // Field 100, text.
   const Bytes unknownField{0xA2, 0x06, 0x03, '2', '6', '0'};

@@ -14,6 +14,8 @@ namespace vesk::insight {
 
 namespace {
 
+using Bytes = std::vector<std::uint8_t>;
+
 TEST(TextForms, NumbersAreRoundedToTwoDecimalsWithoutTrailingZeros) {
   for (const auto& [number, text] : {std::pair{-96.0, "-96"},
                                      {-12.5, "-12.5"},
@@ -66,7 +68,6 @@ TEST(Plmn, ComesFromNumbersOrThreeBytes) {
   EXPECT_FALSE(ofNumbers(999, 1000, 3));
   EXPECT_FALSE(ofNumbers(true, 1, 2));
 
-  using Bytes = std::vector<std::uint8_t>;
   for (const auto& [bytes, text] : {std::pair{Bytes{0x64, 0xF0, 0x00}, std::optional<std::string>("460-00")},
                                     {{0x13, 0x00, 0x14}, "310-410"},
                                     {{0x64, 0xF0}, std::nullopt},

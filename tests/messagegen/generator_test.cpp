@@ -110,7 +110,9 @@ TEST(Generator, RefusesWhatItCannotGenerate) {
   };
   for (const auto& [line, column, message] : cases) {
     const std::string row = line.find('\n') == std::string::npos ? "2" : "3";
-    EXPECT_EQ(errorOf(line), "a.proto:" + row + ":" + column + ": " + message) << line;
+    EXPECT_EQ(errorOf(line),
+              std::string("a.proto:").append(row).append(":").append(column).append(": ").append(message))
+        << line;
   }
   EXPECT_EQ(errorOf("message M { optional bool read_fields = 1; repeated int32 a = 2 [packed = true]; }"), "");
 }

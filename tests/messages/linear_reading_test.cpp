@@ -96,7 +96,7 @@ INSTANTIATE_TEST_SUITE_P(Kinds, LinearReading, testing::ValuesIn(kShapes),
 
 TEST_P(LinearReading, CostsFourTimesAsMuchForFourTimesTheBytes) {
   const Bytes small = GetParam().payload(1000);
-  const Bytes large = GetParam().payload(4 * 1000);
+  const Bytes large = GetParam().payload(4000);
   // The first use of a class makes what lasts as long as the program.
   use(small);
   const Cost ofSmall = costOf([&] { use(small); });

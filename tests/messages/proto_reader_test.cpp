@@ -109,7 +109,7 @@ TEST(ProtoReader, SkipsAFieldOfEveryWireType) {
     unsigned wireType;
     std::string input;
     bool skipped;
-    std::uint64_t pos = 0;
+    unsigned pos = 0;
   };
   const std::string deepestGroup = repeated(99, "0B") + repeated(100, "0C");
   const Case cases[] = {

@@ -16,7 +16,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-Capabilities readable() {
+Capabilities capabilities() {
   Capabilities terminal;
   terminal.moveTo = "<%p2%d,%p1%d>";
   terminal.clear = "<clear>";
@@ -34,7 +34,7 @@ class TerminalTest : public testing::Test {
 
   void open() {
     terminal_ =
-        std::make_unique<Terminal>(interface_.stack(), clock_, surroundings_, tty_.openForProgram(), readable());
+        std::make_unique<Terminal>(interface_.stack(), clock_, surroundings_, tty_.openForProgram(), capabilities());
   }
   void serveWhenReadable() {
     ASSERT_TRUE(waitUntilReadable(terminal_->descriptor()));

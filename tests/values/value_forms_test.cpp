@@ -10,13 +10,13 @@ namespace {
 
 using namespace std::string_view_literals;
 
-struct Row {
+struct FormsRow {
   Value value;
   std::string_view text;
   std::string_view json;
 };
 
-void expectForms(std::initializer_list<Row> rows) {
+void expectForms(std::initializer_list<FormsRow> rows) {
   for (const auto& [value, text, expectedJson] : rows) {
     std::string json;
     appendJson(json, value);

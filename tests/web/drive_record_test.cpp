@@ -61,7 +61,7 @@ TEST(DriveRecord, KeepsEveryExtremeInABoundedNumberOfPoints) {
 TEST(DriveRecord, KeepsTheLastEventsOfEachKindInTheirOrder) {
   std::vector<DriveEvent> events{lteRrc(0, KLTE_RRC_STATE_IDLE)};
   for (std::uint32_t at = 1; at <= 40; ++at)
-    events.push_back(lteCell(at * 1000, 5815, at));
+    events.push_back(lteCell(std::int64_t{at} * 1000, 5815, at));
   const RecordedDrive drive(events, {.points = 4096, .changes = 64, .eventsOfKind = 10});
   std::string kinds;
   for (const DriveRecord::Event* each : drive.record.events())
@@ -133,8 +133,9 @@ TEST(PrometheusText, TellsKnownKpisWithTheirCellAndCountsWhatHappened) {
                              lteLevel(500, -125, -20), lteRrc(1300, KLTE_RRC_STATE_IDLE, KLTE_RRC_CAUSE_REL_T310_EXP)});
   const std::string text = prometheusText(drive.drive.insight, std::chrono::milliseconds(1500), 3);
   for (const char* line :
-       {"# TYPE vesk_lte_rsrp_dbm gauge\n"
-        "vesk_lte_rsrp_dbm{technology=\"LTE\",channel=\"850\",code=\"443\",cell_id=\"49929738\"} -125\n",
+       {R"(# TYPE vesk_lte_rsrp_dbm gauge
+vesk_lte_rsrp_dbm{technology="LTE",channel="850",code="443",cell_id="49929738"} -125
+)",
         "\nvesk_metric_events_total{fate=\"stored\"} 4\n", "\nvesk_timeline_events_total{kind=\"drop\"} 1\n",
         "\nvesk_connections_dropped_total{technology=\"LTE\"} 1\n",
         "\nvesk_connections_dropped_total{technology=\"UMTS\"} 0\n",

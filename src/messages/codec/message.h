@@ -184,7 +184,7 @@ class DictionaryFields {
   explicit DictionaryFields(std::size_t count) { dictionary_.reserve(count); }
 
   template <class Held>
-  void append(Text key, const Held& value) {
+  void append(Text&& key, const Held& value) {
     dictionary_.append(std::move(key), formOf(value));
   }
   [[nodiscard]] Dictionary take() { return std::move(dictionary_); }
