@@ -63,6 +63,17 @@ def check_zoom(browser):
     browser.wait(lambda: browser.run(AXIS) == whole, "the whole drive again")
 
 
+def check_known(browser):
+    """Where a line is drawn there is a value, also on a drive so long that its points lie a minute apart."""
+    script = """const {drive} = JSON.parse(byId('report').textContent);
+        Object.assign(drive, {stretches: [0, 0], series: {'lte.rsrp': [0, -90, 65000, -91]}, now: {position: arguments[0]}});
+        drive.marks.technology = [];
+        const long = new Drive(drive);
+        return [!chartRows(long, ['lte.rsrp']).some((row) => Number.isNaN(row[1])), long.valueAt('lte.rsrp', 64999) === -90]"""
+    for end, known in ((100000, False), (100000000, True)):
+        demand((seen := browser.run(script, end)) == [known, known], f"of {end} ms: line and value {seen}, not {known}")
+
+
 def check_cells(browser):
     for order in (sorted, lambda numbers: sorted(numbers, reverse=True)):
         browser.run(CLICK, "#cells th button", "visits")
@@ -157,6 +168,7 @@ def check_report(browser, vesk, scratch, pictures):
     browser.open(page.as_uri())
     browser.wait(lambda: (inked := browser.run(INKED)) and all(inked), "charts with lines")
     check_zoom(browser)
+    check_known(browser)
     check_cells(browser)
     check_timeline(browser)
     check_keyboard(browser)

@@ -25,25 +25,18 @@ function cellColor(cell) {
   return `hsl(${(cell * 137.5) % 360} 48% 52%)`;
 }
 
-/** How long a value is known when no other follows. */
-const knownFor = 30000;
-
 /**
  * The rows that a chart draws: position and a value for each series; null where a series has none, NaN where its line
  * breaks because the value was not known any more or the drive had a gap.
  */
 function chartRows(drive, names) {
   const points = [];
-  const longest = Math.max(knownFor, drive.end / 1000);
   names.forEach((name, column) => {
     const series = drive.series[name];
     for (let at = 0; at < series.length; at += 2) {
       points.push([series[at], column, series[at + 1]]);
       const next = series[at + 2];
-      if (next === undefined) continue;
-      const isBroken = next - series[at] > longest || drive.stretchAt(next) !== drive.stretchAt(series[at]) ||
-        drive.changesTechnology(series[at], next);
-      if (isBroken) points.push([series[at] + 1, column, NaN]);
+      if (next !== undefined && !drive.isKnownUntil(series[at], next)) points.push([series[at] + 1, column, NaN]);
     }
   });
   points.sort((one, other) => one[0] - other[0]);
@@ -178,7 +171,7 @@ class Chart {
     this.cursor.hidden = position < from || position > to;
     this.cursor.style.left = `${area.x + area.w * (position - from) / (to - from)}px`;
     this.names.forEach((name, at) => {
-      const value = this.charts.valueAt(name, position);
+      const value = this.charts.drive.valueAt(name, position);
       this.values[at].textContent = rounded(value, Number.isInteger(value) ? 0 : 1) ?? '–';
       this.values[at].className = (value !== null && this.charts.drive.gradeOf(name, value)) || '';
     });
@@ -325,9 +318,9 @@ class Charts {
     actions[event.key]();
   }
 
-  /** Shows the half minutes before and after a position, and what held there. */
+  /** Shows a position in the middle of as much as a value is known before and after it, and what held there. */
   showMoment(position) {
-    const width = Math.min(this.range()[1] - this.range()[0], 2 * knownFor);
+    const width = Math.min(this.range()[1] - this.range()[0], 2 * this.drive.knownFor);
     this.pointAt(position);
     this.clamped(position - width / 2, width);
     this.section.scrollIntoView();
@@ -338,22 +331,6 @@ class Charts {
     const cell = this.drive.cellAt(position);
     this.moment.textContent = `${dateAndTime(Math.round(this.drive.timeAt(position)))} UTC${cell ? `, ${cell}` : ''}`;
     for (const chart of this.drawnCharts) chart.pointAt(position);
-  }
-
-  /** The last value at or before a position while it is known; else null. */
-  valueAt(name, position) {
-    const series = this.drive.series[name] || [];
-    let low = -1;
-    let high = series.length / 2;
-    while (high - low > 1) {
-      const middle = (low + high) >> 1;
-      if (series[2 * middle] <= position) low = middle;
-      else high = middle;
-    }
-    if (low < 0 || position - series[2 * low] > knownFor) return null;
-    const isForgotten = this.drive.stretchAt(series[2 * low]) !== this.drive.stretchAt(position) ||
-      this.drive.changesTechnology(series[2 * low], position);
-    return isForgotten ? null : series[2 * low + 1];
   }
 
   /** Full units of time: of the day where the drive is one stretch, else of the drive. */
