@@ -200,11 +200,11 @@ def check_live(browser, vesk, scratch, pictures):
         browser.wait(lambda: (inked := browser.run(INKED)) and all(inked), "charts with lines")
         browser.run(CLICK, "#screens button", "Serving Cell Meas")
         row = "return [...document.querySelectorAll('#screens .columns td')].map((each) => each.textContent).join(' ')"
-        shown = browser.wait(lambda: "rsrp" in (now := browser.run(row)) and now, "a screen")
-        browser.wait(lambda: browser.run(row) != shown, "the screen to go on")
+        browser.wait(lambda: "rsrp" in browser.run(row), "a screen")
         browser.wait(lambda: browser.run("return document.querySelectorAll('#cells tbody tr').length"), "the cells")
         check_width(browser)
         check_hidden(browser, place)
+        check_windows(browser, row)
         browser.look(1280, 1000, "light")
         check_paper(browser)
         take_pictures(browser, pictures, "live")
@@ -215,16 +215,37 @@ def check_live(browser, vesk, scratch, pictures):
     check_connects_again(browser, vesk, place)
 
 
+HIDE = "Object.defineProperty(document, 'hidden', {configurable: true, value: arguments[0]}); document.dispatchEvent(new Event('visibilitychange'))"
+STATE = "return document.querySelector('#state').textContent"
+
+
+def check_windows(browser, row):
+    """Of the six connections that a browser has, other windows hold four, then five."""
+    browser.run("window.others = [1, 2, 3, 4].map(() => new EventSource('/live'))")
+    shown = browser.run(row)
+    browser.wait(lambda: browser.run(row) != shown, "the screen to go on beside four windows")
+    demand((state := browser.run(STATE)).startswith("connected, "), f"beside four windows: {state}")
+    browser.run("others.push(new EventSource('/live'))")
+    browser.wait(lambda: browser.run("return others.every((each) => each.readyState === 1)"), "a sixth window")
+    browser.run("Connection.patience = 1000")
+    browser.run(HIDE, True)
+    browser.run(HIDE, False)
+    browser.wait(lambda: "in many windows" in browser.run(STATE), "a window too many to be told")
+    browser.run("for (const each of others) each.close()")
+    browser.run(HIDE, True)
+    browser.run(HIDE, False)
+    browser.wait(lambda: browser.run(STATE).startswith("connected, "), "the page to connect when others have gone")
+
+
 def check_hidden(browser, place):
-    """A page that nobody sees gives its connections back."""
-    hide = "Object.defineProperty(document, 'hidden', {configurable: true, value: arguments[0]}); document.dispatchEvent(new Event('visibilitychange'))"
+    """A page that nobody sees gives its connection back."""
     visitors = lambda: int(re.search(r"^vesk_visitors (\d+)", urllib.request.urlopen(place + "/metrics").read().decode(), re.M).group(1))
     # He who asks is one of them, and connections without an answer under way stay open for a while.
     seen = visitors()
-    browser.run(hide, True)
-    browser.wait(lambda: visitors() <= seen - 2, "the connections of a page that is hidden to be closed")
-    browser.run(hide, False)
-    browser.wait(lambda: visitors() >= seen, "the connections of a page that is seen again")
+    browser.run(HIDE, True)
+    browser.wait(lambda: visitors() <= seen - 1, "the connection of a page that is hidden to be closed", 5)
+    browser.run(HIDE, False)
+    browser.wait(lambda: visitors() >= seen, "the connection of a page that is seen again")
 
 
 class Refusing(http.server.BaseHTTPRequestHandler):
@@ -238,8 +259,7 @@ class Refusing(http.server.BaseHTTPRequestHandler):
 
 def check_connects_again(browser, vesk, place):
     """Also when somebody has answered in between that it is not possible, where a browser gives up."""
-    state = "return document.querySelector('#state').textContent"
-    browser.wait(lambda: browser.run(state).startswith("not connected"), "the loss of the connection to be told")
+    browser.wait(lambda: browser.run(STATE).startswith("not connected"), "the loss of the connection to be told")
     port = int(place.rpartition(":")[2])
     with http.server.ThreadingHTTPServer(("127.0.0.1", port), Refusing) as refusing:
         refusing.refused = 0
@@ -250,7 +270,7 @@ def check_connects_again(browser, vesk, place):
             refusing.shutdown()
     process, _ = serve(vesk, port=port)
     try:
-        browser.wait(lambda: browser.run(state).startswith("simulated"), "the page to connect again")
+        browser.wait(lambda: browser.run(STATE).startswith("connected, simulated"), "the page to connect again")
     finally:
         process.terminate()
         process.wait()
