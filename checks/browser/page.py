@@ -278,15 +278,20 @@ def check_connects_again(browser, vesk, place):
 
 def check_hostile_live(browser, vesk, scratch):
     recording = scratch / "hostile.jsonl"
-    recording.write_text(hostile_event(0))
+    recording.write_text(hostile_event(0) + hostile_event(4))
     process, place = serve(vesk, "--replay", str(recording))
     try:
         browser.open(place)
         browser.requests(), browser.errors()
+        browser.wait(lambda: "of 0:04" in browser.run("return document.querySelector('#clock').textContent"), "the replay's clock")
+        browser.run("""window.states = [byId('state').textContent];
+            new MutationObserver(() => states.push(byId('state').textContent)).observe(byId('state'), {childList: true})""")
         browser.wait(lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length"), "the event")
         browser.run(CLICK, "#screens button", "Active Bearers")
         browser.wait(lambda: browser.run("return document.querySelectorAll('#screens .columns td').length"), "the screen")
         check_hostile(browser)
+        browser.wait(lambda: browser.run("return states.length > 1"), "the end of the replay")
+        demand((states := browser.run("return states")) == ["connected, replaying", "connected, ended"], f"of a replay is told: {states}")
         check_clean(browser, place)
     finally:
         process.terminate()

@@ -79,6 +79,12 @@ class ScreenWalk {
   }
 }
 
+/** What of the source's state is worth telling whenever it changes; the rest changes with the seconds. */
+function phaseOf(state) {
+  const phases = [[/^▶▶/, 'on its way to another moment'], [/^▶/, 'replaying'], [/^▮▮/, 'held'], [/\d packets\/s/, 'live']];
+  return phases.find(([sign]) => sign.test(state))?.[1] ?? state;
+}
+
 class LivePage {
   /** How often the summary and the screen are asked for: as often as a screen changes. */
   static interval = 5000;
@@ -109,11 +115,13 @@ class LivePage {
     let text = this.drive ? `${this.why}; what shows is old` : this.why;
     if (this.isConnected) {
       const missing = [...this.unanswered].map((part) => `the ${part}`).join(' and ');
-      text = missing ? `connected in part, ${this.state}; no answer for ${missing}` : `connected, ${this.state}`;
+      text = missing ? `connected in part, ${phaseOf(this.state)}; no answer for ${missing}` : `connected, ${phaseOf(this.state)}`;
     }
     const isWhole = Boolean(this.isConnected) && this.unanswered.size === 0;
     byId('state').classList.toggle('poor', !isWhole);
+    // Whoever has the page read out is told when this is set, also to what it is already.
     if (byId('state').textContent !== text) byId('state').textContent = text;
+    byId('clock').textContent = this.isConnected && phaseOf(this.state) !== this.state ? this.state : '';
     if (this.walk) this.walk.note.hidden = Boolean(this.isConnected) && !this.unanswered.has('screen');
   }
 
