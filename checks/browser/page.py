@@ -88,8 +88,10 @@ def check_cells(browser):
 def check_timeline(browser):
     count = lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length")
     kinds = lambda: browser.run("return [...new Set([...document.querySelectorAll('#timeline tbody td:nth-child(2)')].map((each) => each.textContent))]")
-    browser.run(CLICK, "#timeline button", "none")
+    browser.run("[...document.querySelectorAll('#timeline button')].find((each) => each.textContent === 'none').focus()")
+    browser.press("Enter")
     demand(count() == 0, "no kind is chosen, and there are rows")
+    demand(browser.run("return document.activeElement.textContent") == "none", "a button loses the focus when it is pressed")
     browser.run(CLICK, "#timeline button", "rrc ")
     demand(kinds() == ["rrc"], f"only rrc was chosen: {kinds()}")
     whole = browser.run(AXIS)
@@ -298,6 +300,27 @@ def check_hostile_live(browser, vesk, scratch):
         process.wait()
 
 
+def check_news(browser, vesk, scratch):
+    """A row that was chosen stays so, keeps the focus, and stays where it is when others come above it."""
+    process, place = serve(vesk, "--replay", str(next(scratch.glob("<img*"))), "--speed", "20")
+    seen = """const row = document.querySelector('#timeline .chosen');
+        return [row.textContent, row.contains(document.activeElement), row.getBoundingClientRect().top]"""
+    above = "return [...document.querySelectorAll('#timeline tbody tr')].findIndex((row) => row.matches('.chosen'))"
+    try:
+        browser.open(place)
+        browser.wait(lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length > 20 && document.querySelector('#screens button')"),
+                     "events and the parts below them")
+        browser.run("""const first = document.querySelector('#timeline tbody button'); first.click(); first.focus();
+            first.scrollIntoView({block: 'center'})""")
+        chosen = browser.run(seen)
+        browser.wait(lambda: browser.run(above) >= 3, "events after the chosen one")
+        now = browser.run(seen)
+        demand(now[:2] == chosen[:2] and chosen[1] and abs(now[2] - chosen[2]) < 12, f"what was {chosen} is {now}")
+    finally:
+        process.terminate()
+        process.wait()
+
+
 def main(vesk, pictures):
     pictures = pathlib.Path(pictures)
     pictures.mkdir(parents=True, exist_ok=True)
@@ -306,6 +329,7 @@ def main(vesk, pictures):
         check_report(browser, vesk, scratch, pictures)
         check_live(browser, vesk, scratch, pictures)
         check_hostile_live(browser, vesk, scratch)
+        check_news(browser, vesk, scratch)
 
 
 if __name__ == "__main__":

@@ -22,6 +22,17 @@ function fill(section, ...children) {
   section.append(...children);
 }
 
+/** Gives `parent` these children in this order. Those that stay are not touched while their order stays: they keep the focus. */
+function arrange(parent, children) {
+  const staying = new Set(children);
+  for (const child of [...parent.children]) if (!staying.has(child)) child.remove();
+  let next = parent.firstElementChild;
+  for (const child of children) {
+    if (child === next) next = next.nextElementSibling;
+    else parent.insertBefore(child, next);
+  }
+}
+
 function byId(id) {
   return document.getElementById(id);
 }
