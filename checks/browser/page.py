@@ -213,7 +213,9 @@ def check_live(browser, vesk, scratch, pictures):
         browser.open(place)
         tiles = "return [...document.querySelectorAll('.kpi b')].map((each) => each.textContent).join(' ')"
         first = browser.wait(lambda: browser.run(tiles), "values")
+        browser.run("document.querySelector('#now .table').focus()")
         browser.wait(lambda: browser.run(tiles) != first, "a value to change")
+        demand(browser.run("return document.activeElement.matches('#now .table')"), "a table loses the focus when it is shown anew")
         browser.wait(lambda: (inked := browser.run(INKED)) and all(inked), "charts with lines")
         browser.run(CLICK, "#screens button", "Serving Cell Meas")
         row = "return [...document.querySelectorAll('#screens .columns td')].map((each) => each.textContent).join(' ')"

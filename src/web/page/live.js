@@ -75,7 +75,7 @@ class ScreenWalk {
   /** An answer may come when another screen was opened already. */
   show(screen) {
     if (screen.area === this.place.area && screen.category === this.place.category)
-      this.shown.replaceChildren(...screenTables(screen));
+      renew(this.shown, ...screenTables(screen));
   }
 }
 
