@@ -13,7 +13,7 @@ ARGUMENTS = [
     "--headless", "--no-sandbox", "--disable-gpu", "--disable-quic", "--no-first-run", "--disable-background-networking",
     "--disable-component-update", "--disable-sync", "--hide-scrollbars", "--force-device-scale-factor=1",
 ]
-KEYS = {"Tab": "\ue004", "Enter": "\ue007", "Left": "\ue012"}
+KEYS = {"Tab": "\ue004", "Enter": "\ue007", "Left": "\ue012", "Right": "\ue014", "Home": "\ue011", "End": "\ue010", "Shift": "\ue008"}
 
 
 class Browser:
@@ -73,7 +73,11 @@ class Browser:
         raise AssertionError(f"waited in vain for {what}")
 
     def press(self, *keys):
-        actions = [{"type": kind, "value": KEYS.get(key, key)} for key in keys for kind in ("keyDown", "keyUp")]
+        """One after the other; "Shift+Left" together."""
+        actions = []
+        for key in keys:
+            together = [KEYS.get(each, each) for each in (key.split("+") if len(key) > 1 else [key])]
+            actions += [{"type": "keyDown", "value": each} for each in together] + [{"type": "keyUp", "value": each} for each in together[::-1]]
         self.call("POST", self.session + "/actions", {"actions": [{"type": "key", "id": "keyboard", "actions": actions}]})
 
     def drag(self, selector, begin, end):

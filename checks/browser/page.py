@@ -8,7 +8,6 @@ import sys
 import tempfile
 import threading
 import time
-import urllib.request
 
 from browser import Browser
 
@@ -63,6 +62,17 @@ def check_zoom(browser):
     browser.wait(lambda: browser.run(AXIS) == whole, "the whole drive again")
 
 
+def check_known(browser):
+    """Where a line is drawn there is a value, also on a drive so long that its points lie a minute apart."""
+    script = """const {drive} = JSON.parse(byId('report').textContent);
+        Object.assign(drive, {stretches: [0, 0], series: {'lte.rsrp': [0, -90, 65000, -91]}, now: {position: arguments[0]}});
+        drive.marks.technology = [];
+        const long = new Drive(drive);
+        return [!chartRows(long, ['lte.rsrp']).some((row) => Number.isNaN(row[1])), long.valueAt('lte.rsrp', 64999) === -90]"""
+    for end, known in ((100000, False), (100000000, True)):
+        demand((seen := browser.run(script, end)) == [known, known], f"of {end} ms: line and value {seen}, not {known}")
+
+
 def check_cells(browser):
     for order in (sorted, lambda numbers: sorted(numbers, reverse=True)):
         browser.run(CLICK, "#cells th button", "visits")
@@ -77,8 +87,10 @@ def check_cells(browser):
 def check_timeline(browser):
     count = lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length")
     kinds = lambda: browser.run("return [...new Set([...document.querySelectorAll('#timeline tbody td:nth-child(2)')].map((each) => each.textContent))]")
-    browser.run(CLICK, "#timeline button", "none")
+    browser.run("[...document.querySelectorAll('#timeline button')].find((each) => each.textContent === 'none').focus()")
+    browser.press("Enter")
     demand(count() == 0, "no kind is chosen, and there are rows")
+    demand(browser.run("return document.activeElement.textContent") == "none", "a button loses the focus when it is pressed")
     browser.run(CLICK, "#timeline button", "rrc ")
     demand(kinds() == ["rrc"], f"only rrc was chosen: {kinds()}")
     whole = browser.run(AXIS)
@@ -96,10 +108,24 @@ def check_keyboard(browser):
     tab_to(browser, "chart ")
     browser.press("+")
     zoomed = browser.wait(lambda: (now := browser.run(AXIS)) != whole and now, "a zoom by key")
-    browser.press("Left")
+    browser.press("Shift+Left")
     browser.wait(lambda: browser.run(AXIS) != zoomed, "a move by key")
     browser.press("0")
     browser.wait(lambda: browser.run(AXIS) == whole, "the whole drive by key")
+    # Which moments there are, and what is shown of each, the first chart's own data tell.
+    pointed = """return [document.querySelector('#moment').textContent.slice(0, 23),
+        document.querySelector('.chart .legend b').textContent]"""
+    script = """const drive = new Drive(JSON.parse(byId('report').textContent).drive);
+        const names = chartGroups[0].names.filter((name) => drive.series[name]?.length);
+        const moments = [...new Set(names.flatMap((name) => drive.series[name].filter((_, at) => at % 2 === 0)))].sort((a, b) => a - b);
+        return [0, 1, moments.length - 2, moments.length - 1].map((at) => [dateAndTime(drive.timeAt(moments[at])),
+            rounded(drive.valueAt(names[0], moments[at]), 0) ?? '–'])"""
+    seen = []
+    for key in ("Home", "Right", "End", "Left"):
+        browser.press(key)
+        seen.append(browser.run(pointed))
+    first, second, last_but_one, last = browser.run(script)
+    demand(seen == [first, second, last, last_but_one], f"by keys {seen}, not {[first, second, last, last_but_one]}")
     tab_to(browser, " channel")
     browser.press("Enter")
     sort = "return document.querySelector('#cells th[aria-sort]').textContent"
@@ -157,6 +183,7 @@ def check_report(browser, vesk, scratch, pictures):
     browser.open(page.as_uri())
     browser.wait(lambda: (inked := browser.run(INKED)) and all(inked), "charts with lines")
     check_zoom(browser)
+    check_known(browser)
     check_cells(browser)
     check_timeline(browser)
     check_keyboard(browser)
@@ -181,18 +208,22 @@ def check_live(browser, vesk, scratch, pictures):
     process, place = serve(vesk)
     try:
         browser.look(1280, 1000, "light")
+        browser.command("Page.addScriptToEvaluateOnNewDocument", source="""window.streams = [];
+            window.EventSource = class extends EventSource { constructor(address) { super(address); streams.push(this); } };""")
         browser.open(place)
         tiles = "return [...document.querySelectorAll('.kpi b')].map((each) => each.textContent).join(' ')"
         first = browser.wait(lambda: browser.run(tiles), "values")
+        browser.run("document.querySelector('#now .table').focus()")
         browser.wait(lambda: browser.run(tiles) != first, "a value to change")
+        demand(browser.run("return document.activeElement.matches('#now .table')"), "a table loses the focus when it is shown anew")
         browser.wait(lambda: (inked := browser.run(INKED)) and all(inked), "charts with lines")
         browser.run(CLICK, "#screens button", "Serving Cell Meas")
         row = "return [...document.querySelectorAll('#screens .columns td')].map((each) => each.textContent).join(' ')"
-        shown = browser.wait(lambda: "rsrp" in (now := browser.run(row)) and now, "a screen")
-        browser.wait(lambda: browser.run(row) != shown, "the screen to go on")
+        browser.wait(lambda: "rsrp" in browser.run(row), "a screen")
         browser.wait(lambda: browser.run("return document.querySelectorAll('#cells tbody tr').length"), "the cells")
         check_width(browser)
-        check_hidden(browser, place)
+        check_hidden(browser)
+        check_windows(browser, row)
         browser.look(1280, 1000, "light")
         check_paper(browser)
         take_pictures(browser, pictures, "live")
@@ -203,16 +234,36 @@ def check_live(browser, vesk, scratch, pictures):
     check_connects_again(browser, vesk, place)
 
 
-def check_hidden(browser, place):
-    """A page that nobody sees gives its connections back."""
-    hide = "Object.defineProperty(document, 'hidden', {configurable: true, value: arguments[0]}); document.dispatchEvent(new Event('visibilitychange'))"
-    visitors = lambda: int(re.search(r"^vesk_visitors (\d+)", urllib.request.urlopen(place + "/metrics").read().decode(), re.M).group(1))
-    # He who asks is one of them, and connections without an answer under way stay open for a while.
-    seen = visitors()
-    browser.run(hide, True)
-    browser.wait(lambda: visitors() <= seen - 2, "the connections of a page that is hidden to be closed")
-    browser.run(hide, False)
-    browser.wait(lambda: visitors() >= seen, "the connections of a page that is seen again")
+HIDE = "Object.defineProperty(document, 'hidden', {configurable: true, value: arguments[0]}); document.dispatchEvent(new Event('visibilitychange'))"
+STATE = "return document.querySelector('#state').textContent"
+
+
+def check_windows(browser, row):
+    """Of the six connections that a browser has, other windows hold four, then five."""
+    browser.run("window.others = [1, 2, 3, 4].map(() => new EventSource('/live'))")
+    shown = browser.run(row)
+    browser.wait(lambda: browser.run(row) != shown, "the screen to go on beside four windows")
+    demand((state := browser.run(STATE)).startswith("connected, "), f"beside four windows: {state}")
+    browser.run("others.push(new EventSource('/live'))")
+    browser.wait(lambda: browser.run("return others.every((each) => each.readyState === 1)"), "a sixth window")
+    browser.run("Connection.patience = 1000")
+    browser.run(HIDE, True)
+    browser.run(HIDE, False)
+    browser.wait(lambda: "in many windows" in browser.run(STATE), "a window too many to be told")
+    browser.run("for (const each of others) each.close()")
+    browser.run(HIDE, True)
+    browser.run(HIDE, False)
+    browser.wait(lambda: browser.run(STATE).startswith("connected, "), "the page to connect when others have gone")
+
+
+def check_hidden(browser):
+    """A page that nobody sees gives its connection back."""
+    states = "return streams.map((each) => each.readyState)"
+    demand((now := browser.run(states)) == [1], f"a page that is seen has the streams {now}")
+    browser.run(HIDE, True)
+    demand((now := browser.run(states)) == [2], f"a page that is hidden has the streams {now}")
+    browser.run(HIDE, False)
+    browser.wait(lambda: browser.run(states) == [2, 1], "the connection of a page that is seen again")
 
 
 class Refusing(http.server.BaseHTTPRequestHandler):
@@ -226,8 +277,7 @@ class Refusing(http.server.BaseHTTPRequestHandler):
 
 def check_connects_again(browser, vesk, place):
     """Also when somebody has answered in between that it is not possible, where a browser gives up."""
-    state = "return document.querySelector('#state').textContent"
-    browser.wait(lambda: browser.run(state).startswith("not connected"), "the loss of the connection to be told")
+    browser.wait(lambda: browser.run(STATE).startswith("not connected"), "the loss of the connection to be told")
     port = int(place.rpartition(":")[2])
     with http.server.ThreadingHTTPServer(("127.0.0.1", port), Refusing) as refusing:
         refusing.refused = 0
@@ -238,7 +288,7 @@ def check_connects_again(browser, vesk, place):
             refusing.shutdown()
     process, _ = serve(vesk, port=port)
     try:
-        browser.wait(lambda: browser.run(state).startswith("simulated"), "the page to connect again")
+        browser.wait(lambda: browser.run(STATE).startswith("connected, simulated"), "the page to connect again")
     finally:
         process.terminate()
         process.wait()
@@ -246,16 +296,42 @@ def check_connects_again(browser, vesk, place):
 
 def check_hostile_live(browser, vesk, scratch):
     recording = scratch / "hostile.jsonl"
-    recording.write_text(hostile_event(0))
+    recording.write_text(hostile_event(0) + hostile_event(2))
     process, place = serve(vesk, "--replay", str(recording))
     try:
         browser.open(place)
         browser.requests(), browser.errors()
+        browser.wait(lambda: "of 0:02" in browser.run("return document.querySelector('#clock').textContent"), "the replay's clock")
+        browser.run("""window.states = [byId('state').textContent];
+            new MutationObserver(() => states.push(byId('state').textContent)).observe(byId('state'), {childList: true})""")
         browser.wait(lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length"), "the event")
         browser.run(CLICK, "#screens button", "Active Bearers")
         browser.wait(lambda: browser.run("return document.querySelectorAll('#screens .columns td').length"), "the screen")
         check_hostile(browser)
+        browser.wait(lambda: browser.run("return states.length > 1"), "the end of the replay")
+        demand((states := browser.run("return states")) == ["connected, replaying", "connected, ended"], f"of a replay is told: {states}")
         check_clean(browser, place)
+    finally:
+        process.terminate()
+        process.wait()
+
+
+def check_news(browser, vesk, scratch):
+    """A row that was chosen stays so, keeps the focus, and stays where it is when others come above it."""
+    process, place = serve(vesk, "--replay", str(next(scratch.glob("<img*"))), "--speed", "20")
+    seen = """const row = document.querySelector('#timeline .chosen');
+        return [row.textContent, row.contains(document.activeElement), row.getBoundingClientRect().top]"""
+    above = "return [...document.querySelectorAll('#timeline tbody tr')].findIndex((row) => row.matches('.chosen'))"
+    try:
+        browser.open(place)
+        browser.wait(lambda: browser.run("return document.querySelectorAll('#timeline tbody tr').length > 20 && document.querySelector('#screens button')"),
+                     "events and the parts below them")
+        browser.run("""const first = document.querySelector('#timeline tbody button'); first.click(); first.focus();
+            first.scrollIntoView({block: 'center'})""")
+        chosen = browser.run(seen)
+        browser.wait(lambda: browser.run(above) >= 3, "events after the chosen one")
+        now = browser.run(seen)
+        demand(now[:2] == chosen[:2] and chosen[1] and abs(now[2] - chosen[2]) < 12, f"what was {chosen} is {now}")
     finally:
         process.terminate()
         process.wait()
@@ -269,6 +345,7 @@ def main(vesk, pictures):
         check_report(browser, vesk, scratch, pictures)
         check_live(browser, vesk, scratch, pictures)
         check_hostile_live(browser, vesk, scratch)
+        check_news(browser, vesk, scratch)
 
 
 if __name__ == "__main__":

@@ -95,16 +95,10 @@ LiveServer::~LiveServer() {
 void LiveServer::start(std::unique_ptr<HttpServer> server) {
   server_ = std::move(server);
   server_->setRemarkHandler(std::move(sources_.remark));
-  server_->setStreamEndHandler([this](StreamId stream) {
-    watchers_.erase(stream);
-    walks_.erase(stream);
-  });
+  server_->setStreamEndHandler([this](StreamId stream) { watchers_.erase(stream); });
   RunLoop& loop = RunLoop::main();
   loop.addInput(server_->descriptor(), [this] { server_->serve(); });
-  newsTimer_.emplace(loop, kNewsInterval, RunLoopMode::defaultMode, [this] {
-    sendNews();
-    sendScreens();
-  });
+  newsTimer_.emplace(loop, kNewsInterval, RunLoopMode::defaultMode, [this] { sendNews(); });
   tendTimer_.emplace(loop, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] {
     server_->tend();
     server_->sendToQuiet(kLongestSilence, silence_);
@@ -125,14 +119,6 @@ std::string LiveServer::driveMessage(std::string_view event, const DriveRecord& 
   return message + "}\n\n";
 }
 
-std::string LiveServer::screenMessage(const ScreenWalk& walk) const {
-  std::string message = "event: screen\ndata: ";
-  JsonWriter json(message);
-  walk.writeJson(json, sources_.readings);
-  json.finish();
-  return message + "\n\n";
-}
-
 /// Those who have come since the last news have seen them: they were sent the whole drive.
 void LiveServer::sendNews() {
   std::string state = sources_.state();
@@ -150,23 +136,14 @@ void LiveServer::sendNews() {
   beginning_.reset();
 }
 
-void LiveServer::sendScreens() {
-  std::vector<std::pair<StreamId, SharedText>> messages;
-  for (auto& [stream, walk] : walks_)
-    if (std::exchange(walk.isChanged, false)) messages.emplace_back(stream, shared(screenMessage(*walk.screens)));
-  for (const auto& [stream, message] : messages)
-    server_->send(stream, message);
-}
-
 Response LiveServer::answer(const Request& request) {
-  static constexpr std::array<Route, 14> kRoutes{{
+  static constexpr std::array<Route, 13> kRoutes{{
       {"/", &LiveServer::page},
       {"/page.css", &LiveServer::page},
       {"/icon.svg", &LiveServer::page},
       {"/charts.js", &LiveServer::page},
       {"/page.js", &LiveServer::page},
       {"/live", &LiveServer::beginDrive},
-      {"/live/screen", &LiveServer::beginScreen},
       {"/api/menu", &LiveServer::menu},
       {"/api/screens", &LiveServer::screens},
       {"/api/cells", &LiveServer::cells},
@@ -204,16 +181,6 @@ Response LiveServer::beginDrive(const Request& /*request*/) {
     beginning_ = shared(driveMessage("drive", whole_, appendDriveJson));
   }
   return {.type = kStream, .body = beginning_, .begin = [this](StreamId stream) { watchers_.insert(stream); }};
-}
-
-Response LiveServer::beginScreen(const Request& request) {
-  auto walk = std::make_shared<Walk>(Walk{std::make_unique<ScreenWalk>(sources_.layout)});
-  if (!walk->screens->open(request.parameter("area"), request.parameter("category")))
-    return plainResponse(404, "There is no such screen; /api/menu tells which there are.");
-  return {.type = kStream, .body = shared(screenMessage(*walk->screens)), .begin = [this, walk](StreamId stream) {
-            Walk& kept = walks_[stream] = std::move(*walk);
-            kept.screens->setObserver([&kept] { kept.isChanged = true; });
-          }};
 }
 
 Response LiveServer::menu(const Request& /*request*/) {

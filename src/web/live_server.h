@@ -48,12 +48,6 @@ class LiveServer {
 
  private:
   struct Route;
-  /// A visitor's walk, and whether its screen has something new.
-  struct Walk {
-    std::unique_ptr<ScreenWalk> screens;
-    bool isChanged = false;
-  };
-
   /// An answer that stays the same until another event has come, or what is known is a second older.
   struct Kept {
     std::uint64_t events = 0;
@@ -64,10 +58,8 @@ class LiveServer {
   explicit LiveServer(LiveSources sources);
   void start(std::unique_ptr<HttpServer> server);
   void sendNews();
-  void sendScreens();
   using AppendDrive = void (*)(std::string& out, const DriveRecord& record, const insight::Insight& insight);
   [[nodiscard]] std::string driveMessage(std::string_view event, const DriveRecord& record, AppendDrive append) const;
-  [[nodiscard]] std::string screenMessage(const ScreenWalk& walk) const;
   /// The time of the drive, as far as it makes a difference to what is told.
   [[nodiscard]] std::int64_t secondOfDrive() const;
 
@@ -75,7 +67,6 @@ class LiveServer {
   template <class Write>
   [[nodiscard]] Response kept(const Request& request, Write write);
   [[nodiscard]] Response beginDrive(const Request& request);
-  [[nodiscard]] Response beginScreen(const Request& request);
   [[nodiscard]] Response menu(const Request& request);
   [[nodiscard]] Response screens(const Request& request);
   [[nodiscard]] Response cells(const Request& request);
@@ -95,7 +86,6 @@ class LiveServer {
   std::unique_ptr<HttpServer> server_;
   /// Those who watch the drive.
   std::set<StreamId> watchers_;
-  std::map<StreamId, Walk> walks_;
   /// The beginning of a watcher's stream, for those who come before the next news.
   SharedText beginning_;
   /// By path.

@@ -45,7 +45,6 @@ ScreenWalk::ScreenWalk(const InterfaceLayout& layout) : stack_(layout.makeFirstS
 }
 
 ScreenWalk::~ScreenWalk() {
-  stack_.setDisplayObserver(nullptr);
   stack_.popToDepth(1);
 }
 

@@ -15,7 +15,7 @@ namespace vesk::web {
 using RowReadings = std::function<std::optional<insight::Reading>(std::string_view area, std::string_view category,
                                                                   std::size_t section, std::size_t row)>;
 
-/// One visitor's walk through the screens: a stack of his own. Main queue only.
+/// A walk through the screens: a stack of its own. Main queue only.
 class ScreenWalk {
  public:
   /// `layout` must outlive the walk.
@@ -27,8 +27,6 @@ class ScreenWalk {
 
   /// Opens a category's screen from wherever the walk stands. False when the menu has no such labels.
   bool open(std::string_view area, std::string_view category);
-  /// Called whenever the screen that shows has something new.
-  void setObserver(std::function<void()> observer) { stack_.setDisplayObserver(std::move(observer)); }
   /// {"area":…,"category":…,"sections":[{"header":…,"rows":[{"key":…,"value":…,"reading":…|null},…]},…]}
   void writeJson(JsonWriter& json, const RowReadings& readings) const;
 

@@ -63,7 +63,6 @@ TEST_F(LiveServerTest, AnswersEveryPath) {
       {"/api/series", "application/json", R"("lte.rsrp":[500,-125])"},
       {"/api/summary", "application/json", R"({"events":3,"stored":3)"},
       {"/live", "text/event-stream", R"(data: {"state":"simulated","drive":)"},
-      {"/live/screen?area=LTE&category=NAS", "text/event-stream", R"(data: {"area":"LTE","category":"NAS")"},
       {"/metrics", "text/plain; version=0.0.4", "vesk_lte_rsrp_dbm{"},
   };
   for (const auto& [target, type, part] : cases) {
@@ -71,9 +70,9 @@ TEST_F(LiveServerTest, AnswersEveryPath) {
     EXPECT_EQ(response.status, 200) << target;
     EXPECT_TRUE(response.type.starts_with(type)) << target << " is " << response.type;
     EXPECT_NE(response.body->find(part), std::string::npos) << target << " is\n" << *response.body;
-    EXPECT_EQ(response.begin != nullptr, target.starts_with("/live")) << target;
+    EXPECT_EQ(response.begin != nullptr, target == "/live") << target;
   }
-  for (const char* unknown : {"/api", "/live/screen", "/api/screens?area=LTE&category=None", "/../etc/passwd"})
+  for (const char* unknown : {"/api", "/live/", "/api/screens?area=LTE&category=None", "/../etc/passwd"})
     EXPECT_EQ(ask(unknown).status, 404) << unknown;
 }
 

@@ -25,25 +25,18 @@ function cellColor(cell) {
   return `hsl(${(cell * 137.5) % 360} 48% 52%)`;
 }
 
-/** How long a value is known when no other follows. */
-const knownFor = 30000;
-
 /**
  * The rows that a chart draws: position and a value for each series; null where a series has none, NaN where its line
  * breaks because the value was not known any more or the drive had a gap.
  */
 function chartRows(drive, names) {
   const points = [];
-  const longest = Math.max(knownFor, drive.end / 1000);
   names.forEach((name, column) => {
     const series = drive.series[name];
     for (let at = 0; at < series.length; at += 2) {
       points.push([series[at], column, series[at + 1]]);
       const next = series[at + 2];
-      if (next === undefined) continue;
-      const isBroken = next - series[at] > longest || drive.stretchAt(next) !== drive.stretchAt(series[at]) ||
-        drive.changesTechnology(series[at], next);
-      if (isBroken) points.push([series[at] + 1, column, NaN]);
+      if (next !== undefined && !drive.isKnownUntil(series[at], next)) points.push([series[at] + 1, column, NaN]);
     }
   });
   points.sort((one, other) => one[0] - other[0]);
@@ -73,8 +66,8 @@ class Chart {
       return element('li', {}, swatch, `${name} `, this.values[at]);
     }));
     const title = `${group.title}${group.unit ? `, ${group.unit}` : ''}`;
-    this.frame = element('div', {class: 'chart', tabindex: '0', role: 'group', onkeydown: (event) => charts.keyPressed(event),
-      'aria-label': `${title}: arrow keys move, plus and minus zoom, 0 shows the whole drive`},
+    this.frame = element('div', {class: 'chart', tabindex: '0', role: 'group', onkeydown: (event) => charts.keyPressed(event, this),
+      'aria-label': title, 'aria-describedby': 'keys'},
       element('div', {class: 'head'}, element('h3', {text: title}), legend), this.plot);
   }
 
@@ -172,13 +165,20 @@ class Chart {
     context.globalAlpha = 1;
   }
 
+  /** The moment with a value that is next to a position, before (`step` -1) or after it (1); the position without one. */
+  momentNextTo(position, step) {
+    const moments = this.rows.filter((row) => row.some((value, at) => at > 0 && Number.isFinite(value))).map(([at]) => at);
+    const next = step > 0 ? moments.find((at) => at > position) : moments.findLast((at) => at < position);
+    return next ?? position;
+  }
+
   pointAt(position) {
     const [from, to] = this.graph.xAxisRange();
     const area = this.graph.getArea();
     this.cursor.hidden = position < from || position > to;
     this.cursor.style.left = `${area.x + area.w * (position - from) / (to - from)}px`;
     this.names.forEach((name, at) => {
-      const value = this.charts.valueAt(name, position);
+      const value = this.charts.drive.valueAt(name, position);
       this.values[at].textContent = rounded(value, Number.isInteger(value) ? 0 : 1) ?? '–';
       this.values[at].className = (value !== null && this.charts.drive.gradeOf(name, value)) || '';
     });
@@ -197,6 +197,8 @@ class Charts {
     this.isFollowing = false;
     this.moment = element('p', {id: 'moment', class: 'quiet', 'aria-live': 'polite'});
     this.note = element('p', {class: 'quiet'});
+    this.keys = element('p', {id: 'keys', class: 'quiet', text: 'Keys on a chart: ← and → point at the moment before and after, ' +
+      'Home and End at the first and the last; Shift with ← or → moves, + and − zoom, 0 shows the whole drive.'});
     this.controls = element('div', {class: 'row', role: 'group', 'aria-label': 'What the charts show'},
       button('whole drive', () => this.showWhole()), trail ? button('now', () => this.showTrail(trail)) : '',
       button('+', () => this.zoom(0.5), {'aria-label': 'zoom in'}), button('−', () => this.zoom(2), {'aria-label': 'zoom out'}),
@@ -242,7 +244,7 @@ class Charts {
     this.layout = layout;
     for (const chart of this.drawnCharts) chart.graph.destroy();
     this.charts = groups.map(([group, names]) => new Chart(this, group, names));
-    fill(this.section, this.controls, this.moment, this.note, ...this.charts.map((chart) => chart.frame),
+    fill(this.section, this.controls, this.keys, this.moment, this.note, ...this.charts.map((chart) => chart.frame),
       ...(this.charts.length ? [] : [element('p', {class: 'quiet', text: 'No level or power was measured.'})]));
     this.drawNext(this.charts);
   }
@@ -314,20 +316,39 @@ class Charts {
     this.show([begin, begin + width]);
   }
 
-  keyPressed(event) {
+  keyPressed(event, chart) {
+    const arrow = (step) => (event.shiftKey ? this.move(0.25 * step) : this.step(chart, step));
     const actions = {
-      ArrowLeft: () => this.move(-0.25), ArrowRight: () => this.move(0.25), '+': () => this.zoom(0.5), '=': () => this.zoom(0.5),
-      '-': () => this.zoom(2), '0': () => this.showWhole(), Home: () => this.clamped(0, this.range()[1] - this.range()[0]),
-      End: () => this.clamped(this.drive.end, this.range()[1] - this.range()[0]),
+      ArrowLeft: () => arrow(-1), ArrowRight: () => arrow(1),
+      Home: () => this.pointIn(chart, chart.momentNextTo(-Infinity, 1)), End: () => this.pointIn(chart, chart.momentNextTo(Infinity, -1)),
+      '+': () => this.zoom(0.5), '=': () => this.zoom(0.5), '-': () => this.zoom(2), '0': () => this.showWhole(),
     };
-    if (event.ctrlKey || event.altKey || event.metaKey || !actions[event.key]) return;
+    if (event.ctrlKey || event.altKey || event.metaKey || !actions[event.key] || !chart.graph) return;
     event.preventDefault();
     actions[event.key]();
   }
 
-  /** Shows the half minutes before and after a position, and what held there. */
+  /** From the moment pointed at to the next one of a chart; from the edge of what shows when that moment does not. */
+  step(chart, step) {
+    const [from, to] = this.range();
+    const isInView = this.pointed >= from && this.pointed <= to;
+    this.pointIn(chart, chart.momentNextTo(isInView ? this.pointed : step > 0 ? from - 1 : to + 1, step));
+  }
+
+  /** Brings the position into view, and has a chart's values told beside its time. */
+  pointIn(chart, position) {
+    const [from, to] = this.range();
+    this.pointAt(position);
+    for (const name of chart.names) {
+      const value = this.drive.valueAt(name, position);
+      if (value !== null) this.moment.textContent += `; ${name} ${rounded(value, Number.isInteger(value) ? 0 : 1)} ${this.drive.kpiNamed.get(name).unit}`;
+    }
+    if (position < from || position > to) this.clamped(position - (to - from) / 2, to - from);
+  }
+
+  /** Shows a position in the middle of as much as a value is known before and after it, and what held there. */
   showMoment(position) {
-    const width = Math.min(this.range()[1] - this.range()[0], 2 * knownFor);
+    const width = Math.min(this.range()[1] - this.range()[0], 2 * this.drive.knownFor);
     this.pointAt(position);
     this.clamped(position - width / 2, width);
     this.section.scrollIntoView();
@@ -338,22 +359,6 @@ class Charts {
     const cell = this.drive.cellAt(position);
     this.moment.textContent = `${dateAndTime(Math.round(this.drive.timeAt(position)))} UTC${cell ? `, ${cell}` : ''}`;
     for (const chart of this.drawnCharts) chart.pointAt(position);
-  }
-
-  /** The last value at or before a position while it is known; else null. */
-  valueAt(name, position) {
-    const series = this.drive.series[name] || [];
-    let low = -1;
-    let high = series.length / 2;
-    while (high - low > 1) {
-      const middle = (low + high) >> 1;
-      if (series[2 * middle] <= position) low = middle;
-      else high = middle;
-    }
-    if (low < 0 || position - series[2 * low] > knownFor) return null;
-    const isForgotten = this.drive.stretchAt(series[2 * low]) !== this.drive.stretchAt(position) ||
-      this.drive.changesTechnology(series[2 * low], position);
-    return isForgotten ? null : series[2 * low + 1];
   }
 
   /** Full units of time: of the day where the drive is one stretch, else of the drive. */

@@ -23,24 +23,33 @@ class Delay {
 }
 
 /**
- * The events at an address, for as long as the page is seen: a hidden one gives its connection back, of which a browser
- * has few. A lost one is made again. `takers` are called with the data of the events they are named after; `setConnected`
- * whenever the connection is there or lost.
+ * The events at an address, for as long as the page is seen: a hidden one gives its connection back. A lost one is made
+ * again. A browser has six connections to a program for all of its windows, and each window's events hold one: whoever took
+ * the last one gives it back, so that the others' requests are answered. `takers` are called with the data of the events
+ * they are named after; `setConnected` whenever the connection is there or lost, and why.
  */
 class Connection {
+  /** How long a connection may take, and an answer beside it. */
+  static patience = 4000;
+
   constructor(address, takers, setConnected) {
     this.address = address;
     this.takers = takers;
     this.setConnected = setConnected;
     this.delay = new Delay();
-    this.seen = () => (document.hidden ? this.disconnect() : this.connect());
-    document.addEventListener('visibilitychange', this.seen);
-    this.seen();
+    const seen = () => (document.hidden ? this.disconnect() : this.connect());
+    document.addEventListener('visibilitychange', seen);
+    seen();
   }
 
   connect() {
     this.disconnect();
     this.source = new EventSource(this.address);
+    const doubt = setTimeout(() => this.standBack(), Connection.patience);
+    this.doubt = doubt;
+    this.source.addEventListener('open', () => {
+      fetch('/icon.svg', {method: 'HEAD', cache: 'no-store'}).then(() => clearTimeout(doubt), () => {});
+    });
     for (const [name, take] of Object.entries(this.takers)) {
       this.source.addEventListener(name, (event) => {
         this.delay.reset();
@@ -49,29 +58,22 @@ class Connection {
       });
     }
     this.source.addEventListener('error', () => {
-      this.setConnected(false);
+      clearTimeout(doubt);
+      this.setConnected(false, 'not connected');
       // A browser tries again by itself when a connection ends, but not when it was refused.
-      if (this.source.readyState === EventSource.CLOSED) this.timer = setTimeout(() => this.connect(), this.delay.next());
+      if (this.source.readyState === EventSource.CLOSED) this.retry = setTimeout(() => this.connect(), this.delay.next());
     });
   }
 
-  disconnect() {
-    clearTimeout(this.timer);
-    this.source?.close();
-  }
-
-  close() {
-    document.removeEventListener('visibilitychange', this.seen);
+  standBack() {
     this.disconnect();
+    this.setConnected(false, 'not connected, for there was no answer: if this browser shows the page in many windows, close or hide one');
+    this.retry = setTimeout(() => this.connect(), Delay.most);
   }
-}
 
-/** What is at an address as JSON, asked for until it is there. */
-async function fetched(address) {
-  for (const delay = new Delay(); ;) {
-    const answer = await fetch(address).catch(() => null);
-    const value = answer?.ok ? await answer.json().catch(() => null) : null;
-    if (value !== null) return value;
-    await new Promise((resolve) => { setTimeout(resolve, delay.next()); });
+  disconnect() {
+    clearTimeout(this.retry);
+    clearTimeout(this.doubt);
+    this.source?.close();
   }
 }

@@ -6,6 +6,8 @@ class Drive {
   /** Of everything that grows while the page is live, as many numbers are wanted. */
   static mostNumbers = 40000;
   static mostEvents = 5000;
+  /** In milliseconds. */
+  static leastKnown = 30000;
 
   constructor(data) {
     Object.assign(this, data);
@@ -75,6 +77,30 @@ class Drive {
       else high = middle;
     }
     return high < changes.length && changes[high] <= upTo;
+  }
+
+  /** How long a value is known when no other follows; never shorter than points lie apart that a long drive keeps. */
+  get knownFor() {
+    return Math.max(Drive.leastKnown, this.end / 1000);
+  }
+
+  /** Whether what was measured at one position still holds at a later one. */
+  isKnownUntil(position, later) {
+    return later - position <= this.knownFor && this.stretchAt(position) === this.stretchAt(later) &&
+      !this.changesTechnology(position, later);
+  }
+
+  /** The last value at or before a position while it is known; else null. */
+  valueAt(name, position) {
+    const series = this.series[name] || [];
+    let low = -1;
+    let high = series.length / 2;
+    while (high - low > 1) {
+      const middle = (low + high) >> 1;
+      if (series[2 * middle] <= position) low = middle;
+      else high = middle;
+    }
+    return low >= 0 && this.isKnownUntil(series[2 * low], position) ? series[2 * low + 1] : null;
   }
 
   /** The name of the cell that serves there; null for none. */

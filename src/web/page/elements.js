@@ -16,10 +16,31 @@ function element(tag, properties, ...children) {
   return made;
 }
 
+/** Puts `children` in the place of a parent's. What has the focus keeps it; a table or chart hands it to the new one of its name. */
+function renew(parent, ...children) {
+  const focused = parent.contains(document.activeElement) ? document.activeElement : null;
+  parent.replaceChildren(...children);
+  if (!focused) return;
+  const name = focused.getAttribute('aria-label');
+  const heir = parent.contains(focused) ? focused
+    : [...parent.querySelectorAll('[tabindex][aria-label]')].find((each) => each.getAttribute('aria-label') === name);
+  heir?.focus({preventScroll: true});
+}
+
 /** Puts `children` in the place of what stands below a section's title. */
 function fill(section, ...children) {
-  while (section.children.length > 1) section.lastElementChild.remove();
-  section.append(...children);
+  renew(section, section.firstElementChild, ...children);
+}
+
+/** Gives `parent` these children in this order. Those that stay are not touched while their order stays: they keep the focus. */
+function arrange(parent, children) {
+  const staying = new Set(children);
+  for (const child of [...parent.children]) if (!staying.has(child)) child.remove();
+  let next = parent.firstElementChild;
+  for (const child of children) {
+    if (child === next) next = next.nextElementSibling;
+    else parent.insertBefore(child, next);
+  }
 }
 
 function byId(id) {

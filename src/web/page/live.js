@@ -41,61 +41,92 @@ class Overview {
   }
 }
 
-/** The screens, each of which the program keeps showing for as long as it is open. */
+/** The screens; the one that is open is asked for again and again. */
 class ScreenWalk {
-  constructor(section, menu) {
+  constructor(section, menu, opened) {
     this.shown = element('div', {class: 'columns', 'aria-live': 'off'});
     this.buttons = [];
     const folds = menu.map(({area, categories}, at) => element('details', {class: 'menu', open: at === 1 ? '' : null},
       element('summary', {text: area}), element('div', {class: 'areas'}, ...categories.map((category) => {
-        const made = button(category, () => this.open(area, category, made));
+        const made = button(category, () => {
+          this.open(area, category, made);
+          opened();
+        });
         this.buttons.push(made);
         return made;
       }))));
     this.title = element('h3');
-    this.note = element('p', {class: 'poor', role: 'status', hidden: '', text: 'not connected; what shows is old'});
+    this.note = element('p', {class: 'poor', hidden: '', text: 'no answer; what shows is old'});
     fill(section, ...folds, this.title, this.note, this.shown);
   }
 
   open(area, category, chosen) {
-    this.connection?.close();
     for (const each of this.buttons) each.removeAttribute('aria-current');
     chosen.setAttribute('aria-current', 'true');
     this.title.textContent = `${area} › ${category}`;
-    this.connection = new Connection(`/live/screen?${new URLSearchParams({area, category})}`,
-      {screen: (screen) => this.shown.replaceChildren(...screenTables(screen))},
-      (isConnected) => { this.note.hidden = isConnected; });
+    this.shown.replaceChildren();
+    this.place = {area, category};
+  }
+
+  get address() {
+    return this.place && `/api/screens?${new URLSearchParams(this.place)}`;
+  }
+
+  /** An answer may come when another screen was opened already. */
+  show(screen) {
+    if (screen.area === this.place.area && screen.category === this.place.category)
+      renew(this.shown, ...screenTables(screen));
   }
 }
 
+/** What of the source's state is worth telling whenever it changes; the rest changes with the seconds. */
+function phaseOf(state) {
+  const phases = [[/^▶▶/, 'on its way to another moment'], [/^▶/, 'replaying'], [/^▮▮/, 'held'], [/\d packets\/s/, 'live']];
+  return phases.find(([sign]) => sign.test(state))?.[1] ?? state;
+}
+
 class LivePage {
-  static summaryInterval = 5000;
+  /** How often the summary and the screen are asked for: as often as a screen changes. */
+  static interval = 5000;
+  /** How long their answers may take. */
+  static patience = 8000;
   /** How much of the drive the charts follow. */
   static trail = 300000;
 
   start() {
     document.title = 'Vesk, live';
+    /** The parts that were asked for last without an answer. */
+    this.unanswered = new Set();
+    this.why = 'connecting';
     this.connection = new Connection('/live', {drive: (message) => this.begin(message), news: (message) => this.take(message)},
-      (isConnected) => this.tellConnected(isConnected));
+      (isConnected, why) => {
+        this.isConnected = isConnected;
+        this.why = why;
+        if (!isConnected) this.showState();
+      });
+    this.showState();
     // While the mouse draws the frame of a zoom the charts hold still.
     document.addEventListener('pointerdown', () => { this.isHeld = true; });
     for (const end of ['pointerup', 'pointercancel']) document.addEventListener(end, () => { this.isHeld = false; });
-    setInterval(() => this.askForSummary(), LivePage.summaryInterval);
-    fetched('/api/menu').then((menu) => new ScreenWalk(byId('screens'), menu));
+    setInterval(() => this.refresh(), LivePage.interval);
   }
 
-  tell(state) {
-    byId('state').textContent = state;
-  }
-
-  tellConnected(isConnected) {
-    byId('state').classList.toggle('poor', !isConnected);
-    if (!isConnected) this.tell(this.drive ? 'not connected; what shows is old' : 'not connected');
+  showState() {
+    let text = this.drive ? `${this.why}; what shows is old` : this.why;
+    if (this.isConnected) {
+      const missing = [...this.unanswered].map((part) => `the ${part}`).join(' and ');
+      text = missing ? `connected in part, ${phaseOf(this.state)}; no answer for ${missing}` : `connected, ${phaseOf(this.state)}`;
+    }
+    const isWhole = Boolean(this.isConnected) && this.unanswered.size === 0;
+    byId('state').classList.toggle('poor', !isWhole);
+    // Whoever has the page read out is told when this is set, also to what it is already.
+    if (byId('state').textContent !== text) byId('state').textContent = text;
+    byId('clock').textContent = this.isConnected && phaseOf(this.state) !== this.state ? this.state : '';
+    if (this.walk) this.walk.note.hidden = Boolean(this.isConnected) && !this.unanswered.has('screen');
   }
 
   /** The whole drive: at the beginning, and whenever it is connected again; what the reader had chosen stays. */
   begin({drive, state}) {
-    this.tell(state);
     const earlier = this.drive;
     this.drive = new Drive(drive);
     if (!earlier) {
@@ -108,8 +139,10 @@ class LivePage {
     // The program was started again, and its drive with it.
     if (earlier && earlier.end > this.drive.end) this.charts.window = null;
     this.summary = null;
+    this.state = state;
+    this.showState();
     this.show();
-    this.askForSummary();
+    this.refresh();
   }
 
   take({drive, state}) {
@@ -119,7 +152,8 @@ class LivePage {
     for (const [, , kind] of drive.events) {
       if (this.summary) this.summary.kinds[kind] = (this.summary.kinds[kind] || 0) + 1;
     }
-    this.tell(state);
+    this.state = state;
+    this.showState();
     this.show(drive.events.length > 0);
   }
 
@@ -130,15 +164,34 @@ class LivePage {
     if (hasEvents && this.summary) this.timeline.show(this.summary.kinds, true);
   }
 
-  async askForSummary() {
-    if (document.hidden || !this.drive) return;
-    const answer = await fetch('/api/summary').catch(() => null);
-    const summary = answer?.ok ? await answer.json().catch(() => null) : null;
-    if (!summary) return;
-    const isFirst = !this.summary;
-    this.summary = summary;
-    showSummary(this.summary);
-    this.cells.show(this.summary.cells);
-    if (isFirst) this.timeline.show(this.summary.kinds, true);
+  /** What is asked for and not sent. */
+  refresh() {
+    if (document.hidden || !this.isConnected) return;
+    this.ask('summary', '/api/summary', (summary) => {
+      const isFirst = !this.summary;
+      this.summary = summary;
+      showSummary(this.summary);
+      this.cells.show(this.summary.cells);
+      if (isFirst) this.timeline.show(this.summary.kinds, true);
+    });
+    if (!this.walk) this.ask('menu', '/api/menu', (menu) => { this.walk ??= new ScreenWalk(byId('screens'), menu, () => this.askForScreen()); });
+    else this.askForScreen();
+  }
+
+  askForScreen() {
+    if (this.walk.address) this.ask('screen', this.walk.address, (screen) => this.walk.show(screen));
+  }
+
+  /** Hands what is at an address to `take`, and tells when it is not to be had. */
+  async ask(part, address, take) {
+    const answer = await fetch(address, {signal: AbortSignal.timeout(LivePage.patience)}).catch(() => null);
+    const value = answer?.ok ? await answer.json().catch(() => null) : null;
+    if (value === null) {
+      this.unanswered.add(part);
+    } else {
+      this.unanswered.delete(part);
+      take(value);
+    }
+    this.showState();
   }
 }
