@@ -228,9 +228,12 @@ class Charts {
 
   /** The series that have values; anew whenever another one has. */
   draw() {
-    const error = this.drive.time_error;
-    this.note.hidden = error === 0;
-    this.note.textContent = `There were more gaps than are kept: times in the charts may be off by ${duration(error)}.`;
+    const {time_error: error, serving_width: width} = this.drive;
+    const notes = [];
+    if (error > 0) notes.push(`There were more gaps than are kept: times in the charts may be off by ${duration(error)}.`);
+    if (width > 1) notes.push(`There were more changes than are kept: of cells that served within ${duration(width)}, the last is told.`);
+    this.note.hidden = notes.length === 0;
+    this.note.textContent = notes.join(' ');
     const groups = chartGroups.map((group) => [group, group.names.filter((name) => this.drive.series[name]?.length)])
       .filter(([, names]) => names.length > 0);
     const layout = JSON.stringify(groups.map(([, names]) => names));

@@ -24,6 +24,7 @@ class Drive {
     const append = (all, more) => { for (const each of more) all.push(each); };
     this.now = news.now;
     this.time_error = Math.max(this.time_error, news.time_error);
+    this.serving_width = Math.max(this.serving_width, news.serving_width);
     append(this.cells, news.cells);
     append(this.stretches, news.stretches);
     append(this.serving, news.serving);
