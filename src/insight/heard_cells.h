@@ -20,7 +20,10 @@ struct HeardKey {
   /// PCI, PSC or BSIC.
   std::optional<std::int64_t> code;
 
-  friend bool operator==(const HeardKey&, const HeardKey&) = default;
+  /// By code first, in which the cells of a list differ most.
+  friend bool operator==(const HeardKey& one, const HeardKey& other) {
+    return one.code == other.code && one.channel == other.channel && one.technology == other.technology;
+  }
 };
 
 enum class HeardRole : std::uint8_t { serving, secondary, neighbor };

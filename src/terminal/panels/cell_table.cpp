@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <ranges>
 #include <string>
 #include <string_view>
 
@@ -143,11 +144,10 @@ constexpr std::int64_t kRemembered = 60'000;
 
 CellNotes::CellNotes(const insight::Present& drive, const std::vector<HeardCell>& cells) {
   const std::int64_t now = drive.now().value_or(0);
-  const auto& happenings = drive.happenings();
-  for (auto each = happenings.rbegin(); each != happenings.rend(); ++each) {
-    const std::int64_t ago = now - each->event.moment.time;
+  for (const insight::Happening& each : std::ranges::reverse_view(drive.happenings())) {
+    const std::int64_t ago = now - each.event.moment.time;
     if (ago > kRemembered) break;
-    const auto* entry = std::get_if<insight::Reestablishment>(&each->event.fields);
+    const auto* entry = std::get_if<insight::Reestablishment>(&each.event.fields);
     if (entry != nullptr && entry->to)
       reestablished_.push_back({{entry->technology, entry->to->channel, entry->to->code}, ago});
   }
