@@ -88,7 +88,7 @@ struct LteNeighbor {
   Part channel;
   Part code;
   std::int32_t rsrp;
-  Part rsrqCode{};
+  std::optional<std::int32_t> rsrqCode{};
 };
 
 inline DriveEvent lteNeighbors(std::int64_t at, const std::vector<LteNeighbor>& neighbors) {

@@ -90,6 +90,7 @@ TEST(DriveRecord, RunsOverCountedTimeAndMarksWhatHappened) {
 
 TEST(DriveRecord, KeepsTimesRightInABoundedNumberOfStretches) {
   std::vector<DriveEvent> events;
+  events.reserve(3000);
   std::int64_t time = 0;
   for (int at = 0; at < 3000; ++at)
     events.push_back(lteLevel(time += at % 3 == 0 ? 70'000 + at * 10 : 1000, -90, -10));

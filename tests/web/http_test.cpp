@@ -219,6 +219,7 @@ TEST_F(ServerTest, ListensAgainWhenThereAreDescriptors) {
   std::vector<std::string> remarks;
   server_->setRemarkHandler([&](const std::string& remark) { remarks.push_back(remark); });
   std::vector<FileDescriptor> newcomers;
+  newcomers.reserve(2);
   for (int count = 0; count < 2; ++count)
     newcomers.push_back(newcomer("GET / HTTP/1.1\r\n" + std::string(kHost)));
   rlimit usual{};
@@ -242,6 +243,7 @@ TEST_F(ServerTest, ListensAgainWhenThereAreDescriptors) {
 
 TEST_F(ServerTest, BoundsWhatWaitsForAllAtOnce) {
   std::vector<FileDescriptor> visitors;
+  visitors.reserve(30);
   for (int count = 0; count < 30; ++count)
     visitors.push_back(visitor("GET /stream HTTP/1.1\r\n" + std::string(kHost)));
   const auto send = [&](std::size_t count, std::size_t size) {

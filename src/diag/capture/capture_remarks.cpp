@@ -29,7 +29,7 @@ Remark onDamage(const CaptureReader& capture) {
   const std::uint64_t frames = counts.damagedFrames() - std::min(cutOff, counts.damagedFrames());
   constexpr const char* kAdvice =
       "did another program read the port meanwhile, as ModemManager does? Stop it, and capture anew";
-  if (const Remark remark = remarkOnFrames(frames, counts.frames(), kAdvice)) return remark;
+  if (Remark remark = remarkOnFrames(frames, counts.frames(), kAdvice)) return remark;
   const std::uint64_t count = counts.damaged() - cutOff;
   if (count == 0) return std::nullopt;
   return counted(count, "damaged packet") + (count == 1 ? " was" : " were") + " passed over";

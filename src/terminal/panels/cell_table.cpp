@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <array>
-#include <ranges>
 #include <string>
 #include <string_view>
 
@@ -144,7 +143,9 @@ constexpr std::int64_t kRemembered = 60'000;
 
 CellNotes::CellNotes(const insight::Present& drive, const std::vector<HeardCell>& cells) {
   const std::int64_t now = drive.now().value_or(0);
-  for (const insight::Happening& each : std::ranges::reverse_view(drive.happenings())) {
+  const auto& happenings = drive.happenings();
+  for (std::size_t index = happenings.size(); index-- > 0;) {
+    const insight::Happening& each = happenings[index];
     const std::int64_t ago = now - each.event.moment.time;
     if (ago > kRemembered) break;
     const auto* entry = std::get_if<insight::Reestablishment>(&each.event.fields);
