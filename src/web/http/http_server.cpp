@@ -3,9 +3,9 @@
 #include <algorithm>
 #include <array>
 #include <cerrno>
+#include <cstring>
 #include <sys/epoll.h>
 #include <sys/socket.h>
-#include <system_error>
 #include <utility>
 
 #include "web/http/listener.h"
@@ -80,8 +80,7 @@ void HttpServer::acceptAll() {
     if (!isOutOfRoom) return;
     // He who waits to enter would be announced again and again.
     listen(false);
-    if (const auto tell = std::exchange(onRemark_, nullptr))
-      tell("visitors wait to enter: " + std::generic_category().message(errno));
+    if (const auto tell = std::exchange(onRemark_, nullptr)) tell(std::string("visitors wait to enter: ") + std::strerror(errno));
     return;
   }
 }
