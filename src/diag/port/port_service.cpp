@@ -142,6 +142,8 @@ bool PortService::readSome(FrameReader& frames, Session& session, const std::sto
     } else if (hasWatched_ || session.phase() == Session::Phase::watching) {
       // Before that, it is what a program before this one has left there.
       receiver_.noteDamagedFrame();
+      // Known before the events behind it come.
+      noteCounts();
     }
   }
   noteCounts();

@@ -80,7 +80,8 @@ void HttpServer::acceptAll() {
     if (!isOutOfRoom) return;
     // He who waits to enter would be announced again and again.
     listen(false);
-    if (const auto tell = std::exchange(onRemark_, nullptr)) tell(std::string("visitors wait to enter: ") + std::strerror(errno));
+    if (const auto tell = std::exchange(onRemark_, nullptr))
+      tell(std::string("visitors wait to enter: ") + std::strerror(errno));
     return;
   }
 }
