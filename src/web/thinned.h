@@ -34,7 +34,6 @@ class Thinned {
     all.insert(all.end(), latest_.begin(), latest_.end());
     return all;
   }
-  [[nodiscard]] bool isEmpty() const { return points_.empty() && latest_.empty(); }
   /// Of the intervals in which there is one point at most: milliseconds.
   [[nodiscard]] std::int64_t width() const { return width_; }
 

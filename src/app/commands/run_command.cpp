@@ -1,6 +1,7 @@
 #include "app/commands/run_command.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <unistd.h>
@@ -118,8 +119,9 @@ class Run {
 
   /// What is known grows old while no event comes, too.
   void growOlder() {
-    if (isOnTheWay_ || moment_.sinceLastEvent() == 0) return;
-    insight_.setLater(moment_.sinceLastEvent());
+    const std::int64_t later = moment_.sinceLastEvent();
+    if (isOnTheWay_ || later == 0) return;
+    insight_.setLater(later);
     terminal_->setNeedsDisplay();
   }
 

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "app/commands/row_readings.h"
+#include "app/output/word_list.h"
 #include "app/program/app_delegate.h"
 #include "app/program/drive_time.h"
 #include "app/program/stop_signals.h"
@@ -29,14 +30,6 @@ std::string placeOf(const std::string& address, std::uint16_t port) {
   if (address.find(':') != std::string::npos) host = address == "::" ? "[::1]" : "[" + address + "]";
   if (address == "0.0.0.0") host = "127.0.0.1";
   return "http://" + host + ":" + std::to_string(port);
-}
-
-/// "10.0.0.21, 192.168.1.4".
-std::string listOf(const std::vector<std::string>& words) {
-  std::string list;
-  for (const std::string& word : words)
-    list.append(list.empty() ? "" : ", ").append(word);
-  return list;
 }
 
 /// One run of the program behind its page.

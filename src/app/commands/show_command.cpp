@@ -7,6 +7,7 @@
 
 #include "app/commands/suggestion.h"
 #include "app/output/data_output.h"
+#include "app/output/word_list.h"
 #include "app/source/play_recording.h"
 #include "intake/metric_validator.h"
 #include "screens/category_sources.h"
@@ -114,36 +115,27 @@ std::string asText(const ShowOptions& options, const std::vector<ShownSection>& 
   return out;
 }
 
-std::string joined(const std::vector<Text>& labels) {
-  std::string out;
-  for (const Text& label : labels) {
-    if (!out.empty()) out += ", ";
-    out += label.view();
-  }
-  return out;
-}
-
-std::string suggestionAmong(const std::vector<Text>& labels, std::string_view typed) {
-  std::vector<std::string> candidates;
-  candidates.reserve(labels.size());
+std::vector<std::string> namesOf(const std::vector<Text>& labels) {
+  std::vector<std::string> names;
+  names.reserve(labels.size());
   for (const Text& label : labels)
-    candidates.emplace_back(label.view());
-  return suggestionFor(typed, candidates, "\"");
+    names.emplace_back(label.view());
+  return names;
 }
 
 /// Whether the menu has these labels. The user is told which ones there are when it has not.
 bool checkLabels(const ShowOptions& options) {
   const VeskViewItems& menu = VeskViewItems::shared();
-  const auto& areas = menu.launchViewItemNames;
-  const auto& categories = menu.categoriesOf(options.area);
+  const std::vector<std::string> areas = namesOf(menu.launchViewItemNames);
+  const std::vector<std::string> categories = namesOf(menu.categoriesOf(options.area));
   if (categories.empty()) {
-    tellUser("vesk: no area \"" + options.area + "\"" + suggestionAmong(areas, options.area) +
-             "; there are: " + joined(areas));
+    tellUser("vesk: no area \"" + options.area + "\"" + suggestionFor(options.area, areas, "\"") +
+             "; there are: " + listOf(areas));
     return false;
   }
   if (std::find(categories.begin(), categories.end(), options.category) == categories.end()) {
     tellUser("vesk: no category \"" + options.category + "\" in " + options.area +
-             suggestionAmong(categories, options.category) + "; there are: " + joined(categories));
+             suggestionFor(options.category, categories, "\"") + "; there are: " + listOf(categories));
     return false;
   }
   return true;
