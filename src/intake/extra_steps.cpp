@@ -5,6 +5,7 @@
 
 #include "intake/value_conversions.h"
 #include "system/output_lines.h"
+#include "values/ordered_lookup.h"
 #include "values/text_form.h"
 
 namespace vesk {
@@ -112,28 +113,17 @@ void replaceMultiBandInfo(Record& record) {
     OutputLines::print({text->view()});
 }
 
-/// The entry under `key`, looked for from `from` on, and then before it; the end when there is none.
-const Dictionary::Entry* findFrom(const Record& record, const Dictionary::Entry* from, const Text& key) {
-  const auto isMeant = [&](const Dictionary::Entry& entry) { return entry.key == key; };
-  const auto* found = std::find_if(from, record.end(), isMeant);
-  if (found != record.end()) return found;
-  found = std::find_if(record.begin(), from, isMeant);
-  return found == from ? record.end() : found;
-}
-
 /// Refreshes every key of the store's record; what the source does not have becomes the empty text.
 void fillTemplate(Record& store, const Record& source) {
   Record filled;
   filled.reserve(store.size());
-  // Both have their keys in much the same order.
-  const auto* next = source.begin();
+  OrderedLookup values(source);
   for (const auto& [key, value] : store) {
-    const auto* found = findFrom(source, next, key);
-    if (found == source.end()) {
+    const Value* found = values.find(key);
+    if (found == nullptr) {
       filled.append(key, ""_text);
     } else {
-      filled.append(key, found->value);
-      next = found + 1;
+      filled.append(key, *found);
     }
   }
   store = std::move(filled);

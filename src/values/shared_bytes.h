@@ -48,10 +48,14 @@ class SharedBytes {
     return block_ == 0 ? std::string_view{} : std::string_view{block()->bytes, block()->size};
   }
 
+  /// Whether they lie over static storage. Two that do are equal only when they are the same.
+  [[nodiscard]] bool isImmortal() const { return (block_ & kImmortalBit) != 0; }
+  /// Whether they share their bytes, which makes them equal.
+  [[nodiscard]] bool isSameAs(const SharedBytes& other) const { return block_ == other.block_; }
+
   friend bool operator==(const SharedBytes& a, const SharedBytes& b) {
-    if (a.block_ == b.block_) return true;
-    const bool areBothImmortal = (a.block_ & b.block_ & kImmortalBit) != 0;
-    return !areBothImmortal && a.view() == b.view();
+    if (a.isSameAs(b)) return true;
+    return !(a.isImmortal() && b.isImmortal()) && a.view() == b.view();
   }
 
  private:
@@ -62,7 +66,7 @@ class SharedBytes {
 
   // NOLINTNEXTLINE(performance-no-int-to-ptr): the address and the bit share one word, so that a look tells both
   [[nodiscard]] Block* block() const { return reinterpret_cast<Block*>(block_ & ~kImmortalBit); }
-  [[nodiscard]] bool isCounted() const { return block_ != 0 && (block_ & kImmortalBit) == 0; }
+  [[nodiscard]] bool isCounted() const { return block_ != 0 && !isImmortal(); }
   void release() noexcept;
 
   /// The block's address, with kImmortalBit.

@@ -22,6 +22,11 @@ class Text {
   [[nodiscard]] std::string_view view() const { return bytes_.view(); }
   [[nodiscard]] bool empty() const { return view().empty(); }
 
+  /// Whether it is a literal. Two literals are equal only when they are the same.
+  [[nodiscard]] bool isLiteral() const { return bytes_.isImmortal(); }
+  /// Whether both share their bytes, which makes them equal.
+  [[nodiscard]] bool isSameAs(const Text& other) const { return bytes_.isSameAs(other.bytes_); }
+
   friend bool operator==(const Text&, const Text&) = default;
   friend bool operator==(const Text& a, std::string_view b) { return a.view() == b; }
 

@@ -45,23 +45,36 @@ Dictionary::Dictionary(std::initializer_list<Entry> entries) {
     set(entry.key, entry.value);
 }
 
-template <class Key>
-std::optional<std::size_t> Dictionary::indexOf(const Key& key) const {
-  const Entry* entry = std::find_if(begin(), end(), [&](const Entry& each) { return each.key == key; });
-  if (entry == end()) return std::nullopt;
-  return static_cast<std::size_t>(entry - begin());
-}
-
-const Value* Dictionary::valueAt(std::optional<std::size_t> index) const {
-  return index ? &entries_[*index].value : nullptr;
+const Dictionary::Entry* Dictionary::findEntry(const Text& key, const Entry* from) const {
+  bool areLiterals = key.isLiteral();
+  const auto findAmong = [&areLiterals](const Entry* first, const Entry* last, auto isMeant) {
+    for (; first != last; ++first) {
+      if (isMeant(first->key)) return first;
+      areLiterals &= first->key.isLiteral();
+    }
+    return static_cast<const Entry*>(nullptr);
+  };
+  // A look at the addresses is enough where all keys are literals.
+  const auto isSame = [&key](const Text& each) { return each.isSameAs(key); };
+  if (const Entry* behind = findAmong(from, end(), isSame)) return behind;
+  if (const Entry* before = findAmong(begin(), from, isSame)) return before;
+  if (areLiterals) return nullptr;
+  return findAmong(begin(), end(), [&key](const Text& each) { return each == key; });
 }
 
 const Value* Dictionary::find(std::string_view key) const {
-  return valueAt(indexOf(key));
+  const Entry* found = std::find_if(begin(), end(), [&](const Entry& each) { return each.key == key; });
+  return found == end() ? nullptr : &found->value;
 }
 
 const Value* Dictionary::find(const Text& key) const {
-  return valueAt(indexOf(key));
+  const Entry* found = findEntry(key, begin());
+  return found == nullptr ? nullptr : &found->value;
+}
+
+std::optional<std::size_t> Dictionary::indexOf(const Text& key) const {
+  const Entry* found = findEntry(key, begin());
+  return found == nullptr ? std::nullopt : std::optional(static_cast<std::size_t>(found - begin()));
 }
 
 Value* Dictionary::findForChange(const Text& key) {
@@ -89,10 +102,9 @@ bool operator==(const Dictionary& a, const Dictionary& b) {
   });
 }
 
-std::optional<std::int64_t> Value::integer() const {
-  if (const auto* number = std::get_if<std::int64_t>(&held_)) return *number;
-  if (const auto* number = std::get_if<float>(&held_)) return integerOf(double{*number});
-  return std::nullopt;
+std::optional<std::int64_t> Value::integerOfFloat() const {
+  const auto* number = std::get_if<float>(&held_);
+  return number == nullptr ? std::nullopt : integerOf(double{*number});
 }
 
 std::optional<std::int32_t> Value::integer32() const {
@@ -110,13 +122,6 @@ std::optional<float> Value::exactFloat() const {
     const auto rounded = static_cast<float>(*large);
     if (rounded < kBeyondUInt64 && static_cast<std::uint64_t>(rounded) == *large) return rounded;
   }
-  return std::nullopt;
-}
-
-std::optional<double> Value::number() const {
-  if (const auto* number = std::get_if<std::int64_t>(&held_)) return static_cast<double>(*number);
-  if (const auto* number = std::get_if<std::uint64_t>(&held_)) return static_cast<double>(*number);
-  if (const auto* number = std::get_if<float>(&held_)) return double{*number};
   return std::nullopt;
 }
 

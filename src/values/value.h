@@ -60,6 +60,8 @@ class Dictionary {
   /// The value under `key`, or null; valid until the dictionary changes.
   [[nodiscard]] const Value* find(std::string_view key) const;
   [[nodiscard]] const Value* find(const Text& key) const;
+  /// The entry under `key`, looked for from `from` on and then before it; null when there is none.
+  [[nodiscard]] const Entry* findEntry(const Text& key, const Entry* from) const;
   /// The same, for changing it.
   [[nodiscard]] Value* findForChange(const Text& key);
   [[nodiscard]] bool contains(std::string_view key) const { return find(key) != nullptr; }
@@ -79,9 +81,7 @@ class Dictionary {
   friend bool operator==(const Dictionary& a, const Dictionary& b);
 
  private:
-  template <class Key>
-  [[nodiscard]] std::optional<std::size_t> indexOf(const Key& key) const;
-  [[nodiscard]] const Value* valueAt(std::optional<std::size_t> index) const;
+  [[nodiscard]] std::optional<std::size_t> indexOf(const Text& key) const;
 
   SharedVector<Entry> entries_;
 };
@@ -109,12 +109,20 @@ class Value {
   [[nodiscard]] const Held& held() const { return held_; }
 
   /// The number, when it is integral and fits. A boolean is no integer.
-  [[nodiscard]] std::optional<std::int64_t> integer() const;
+  [[nodiscard]] std::optional<std::int64_t> integer() const {
+    if (const auto* number = std::get_if<std::int64_t>(&held_)) return *number;
+    return integerOfFloat();
+  }
   [[nodiscard]] std::optional<std::int32_t> integer32() const;
   /// The number, when single precision holds it exactly.
   [[nodiscard]] std::optional<float> exactFloat() const;
   /// Any number, rounded where double precision does not hold it.
-  [[nodiscard]] std::optional<double> number() const;
+  [[nodiscard]] std::optional<double> number() const {
+    if (const auto* number = std::get_if<std::int64_t>(&held_)) return static_cast<double>(*number);
+    if (const auto* number = std::get_if<float>(&held_)) return double{*number};
+    if (const auto* number = std::get_if<std::uint64_t>(&held_)) return static_cast<double>(*number);
+    return std::nullopt;
+  }
 
   [[nodiscard]] const bool* boolean() const { return std::get_if<bool>(&held_); }
   [[nodiscard]] const Text* text() const { return std::get_if<Text>(&held_); }
@@ -126,6 +134,8 @@ class Value {
   friend bool operator==(const Value& a, const Value& b);
 
  private:
+  [[nodiscard]] std::optional<std::int64_t> integerOfFloat() const;
+
   Held held_;
 };
 
