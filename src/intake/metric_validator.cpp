@@ -33,7 +33,7 @@ void printRecord(std::string_view logText, const Dictionary& record) {
 }
 
 /// The record's timestamp while it is a number; absent when it is none that fits.
-std::optional<std::int64_t> millisecondsOf(const Record& record) {
+OptionalNumber<std::int64_t> millisecondsOf(const Record& record) {
   const Value* timestamp = record.find("timestamp"_text);
   return timestamp == nullptr ? std::nullopt : timestamp->integer();
 }

@@ -9,6 +9,7 @@
 #include "intake/stores.h"
 #include "link/corvik_wrapper.h"
 #include "messages/registry/metric_identifiers.h"
+#include "values/optional_number.h"
 #include "values/value.h"
 
 namespace vesk {
@@ -28,10 +29,10 @@ enum class EventFate {
 struct TakenEvent {
   EventFate fate;
   /// Absent when the event had none.
-  std::optional<std::int64_t> metricId{};
+  OptionalNumber<std::int64_t> metricId{};
   /// What the record had under "timestamp" before that became a date: milliseconds since 1970-01-01 00:00:00 UTC.
   /// Absent unless stored, and where the record has none that fits.
-  std::optional<std::int64_t> timestamp{};
+  OptionalNumber<std::int64_t> timestamp{};
   /// The latest record of its kind; null unless stored.
   const Record* record = nullptr;
 };
@@ -66,7 +67,7 @@ class MetricValidator : public CorvikWrapperDelegate {
   void startAnew();
 
   /// The metric identifier of the latest event; absent when it had none.
-  std::optional<std::int64_t> metricID;
+  OptionalNumber<std::int64_t> metricID;
 
   /// What the events so far have left behind; whoever shows it reads it here.
   Stores stores;

@@ -1,0 +1,52 @@
+#pragma once
+
+#include <cmath>
+#include <compare>
+#include <cstdint>
+#include <limits>
+#include <optional>
+
+namespace vesk {
+
+/// A number that may be absent, like std::optional of it, which it may be made of and made into. It is only as large as
+/// the number, so that a processor copies it in one piece: a std::optional just written in two is not ready to be read
+/// in one for a dozen cycles. The least std::int64_t, and a double that is no number, stand for an absent one.
+template <class Number>
+class OptionalNumber {
+ public:
+  constexpr OptionalNumber() = default;
+  constexpr OptionalNumber(std::nullopt_t /*absent*/) {}
+  constexpr OptionalNumber(Number number) : number_(number) {}
+  constexpr OptionalNumber(const std::optional<Number>& other) : number_(other ? *other : kAbsent) {}
+
+  constexpr operator std::optional<Number>() const { return has_value() ? std::optional(number_) : std::nullopt; }
+
+  [[nodiscard]] constexpr bool has_value() const {
+    if constexpr (std::numeric_limits<Number>::has_quiet_NaN) return !std::isnan(number_);
+    return number_ != kAbsent;
+  }
+  constexpr explicit operator bool() const { return has_value(); }
+  /// To be asked for when there is one.
+  constexpr const Number& operator*() const { return number_; }
+  [[nodiscard]] constexpr Number value_or(Number other) const { return has_value() ? number_ : other; }
+  constexpr void reset() { number_ = kAbsent; }
+
+  friend constexpr bool operator==(const OptionalNumber& one, const OptionalNumber& other) {
+    return one.number_ == other.number_ || (!one && !other);
+  }
+  /// An absent one comes before every number.
+  friend constexpr auto operator<=>(const OptionalNumber& one, const OptionalNumber& other)
+      -> std::compare_three_way_result_t<Number> {
+    if (one && other) return one.number_ <=> other.number_;
+    return one.has_value() <=> other.has_value();
+  }
+
+ private:
+  static constexpr Number kAbsent = std::numeric_limits<Number>::has_quiet_NaN
+                                        ? std::numeric_limits<Number>::quiet_NaN()
+                                        : std::numeric_limits<Number>::min();
+
+  Number number_ = kAbsent;
+};
+
+}  // namespace vesk
