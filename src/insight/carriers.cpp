@@ -7,12 +7,12 @@ namespace vesk::insight {
 namespace {
 
 template <class Part>
-bool changes(const std::optional<Part>& reported, const std::optional<Part>& known) {
+bool changes(const OptionalNumber<Part>& reported, const OptionalNumber<Part>& known) {
   return reported && reported != known;
 }
 
 template <class Part>
-void update(std::optional<Part>& known, const std::optional<Part>& reported) {
+void update(OptionalNumber<Part>& known, const OptionalNumber<Part>& reported) {
   if (reported) known = reported;
 }
 
@@ -26,7 +26,7 @@ void tell(EventKind kind, const Carrier& carrier, Step& step) {
 
 }  // namespace
 
-bool Carriers::isConfigured(const std::optional<std::int64_t>& index) const {
+bool Carriers::isConfigured(const OptionalNumber<std::int64_t>& index) const {
   return std::any_of(carriers_.begin(), carriers_.end(), [&](const Carrier& each) { return each.index == index; });
 }
 

@@ -7,6 +7,7 @@
 
 #include "insight/report.h"
 #include "insight/step.h"
+#include "values/optional_number.h"
 
 namespace vesk::insight {
 
@@ -14,10 +15,10 @@ namespace vesk::insight {
 struct Carrier {
   std::int64_t index;
   CarrierState state;
-  std::optional<std::int64_t> channel{};
-  std::optional<std::int64_t> code{};
+  OptionalNumber<std::int64_t> channel{};
+  OptionalNumber<std::int64_t> code{};
   /// MHz.
-  std::optional<double> bandwidth{};
+  OptionalNumber<double> bandwidth{};
 };
 
 /// The secondary component carriers of LTE.
@@ -25,7 +26,7 @@ class Carriers {
  public:
   /// Those that are not released, by index.
   [[nodiscard]] std::span<const Carrier> configured() const { return carriers_; }
-  [[nodiscard]] bool isConfigured(const std::optional<std::int64_t>& index) const;
+  [[nodiscard]] bool isConfigured(const OptionalNumber<std::int64_t>& index) const;
   [[nodiscard]] bool isAnyActivated() const;
 
   void take(std::span<const CarrierReport> reports, Step& step);

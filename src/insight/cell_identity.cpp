@@ -8,7 +8,7 @@ namespace vesk::insight {
 
 namespace {
 
-using Part = std::optional<std::int64_t>;
+using Part = OptionalNumber<std::int64_t>;
 
 bool differs(const Part& one, const Part& other) {
   return one && other && *one != *other;

@@ -6,16 +6,17 @@
 #include <utility>
 
 #include "insight/technology.h"
+#include "values/optional_number.h"
 
 namespace vesk::insight {
 
 /// Who a cell is, as far as it is known.
 struct CellIdentity {
   /// EARFCN, UARFCN or ARFCN.
-  std::optional<std::int64_t> channel;
+  OptionalNumber<std::int64_t> channel;
   /// PCI, PSC or BSIC.
-  std::optional<std::int64_t> code;
-  std::optional<std::int64_t> cellId;
+  OptionalNumber<std::int64_t> code;
+  OptionalNumber<std::int64_t> cellId;
 
   [[nodiscard]] bool isUnknown() const { return !channel && !code && !cellId; }
   /// Takes over what is unknown here and known there.

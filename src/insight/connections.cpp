@@ -9,11 +9,11 @@ namespace vesk::insight {
 /// A change of state on its way, with what it happened amid.
 struct Connections::Change {
   const RrcReport& report;
-  std::optional<std::int64_t> duration;
+  OptionalNumber<std::int64_t> duration;
   /// What was under way before; absent when its begin was not seen.
   std::optional<Attempt> attempt;
   std::optional<CellIdentity> cell;
-  std::optional<double> level;
+  OptionalNumber<double> level;
 
   [[nodiscard]] Technology technology() const { return report.technology; }
   [[nodiscard]] AttemptKind kind() const { return attemptKindOf(report.cause).value_or(AttemptKind::setUp); }
@@ -38,7 +38,7 @@ bool Connections::take(const RrcReport& report, const std::optional<ServingCell>
   if (connection.state == report.state && !isOtherAttempt) return false;
 
   const std::optional<Text> from = connection.state ? connection.state : report.previous;
-  std::optional<std::int64_t> duration = report.previousDuration;
+  OptionalNumber<std::int64_t> duration = report.previousDuration;
   if (!duration && connection.state) duration = step.now() - connection.since;
   const bool isServed = serving && serving->technology == report.technology;
   const Change change{report, duration, std::exchange(connection.attempt, std::nullopt),

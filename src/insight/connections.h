@@ -8,6 +8,7 @@
 #include "insight/kpis.h"
 #include "insight/rrc_states.h"
 #include "insight/step.h"
+#include "values/optional_number.h"
 
 namespace vesk::insight {
 
@@ -41,8 +42,14 @@ class Connections {
   /// Whether the connection of the technology became idle. `serving` is the cell that serves now.
   bool take(const RrcReport& report, const std::optional<ServingCell>& serving, const KnownKpis& kpis, Step& step);
   /// The states; what was counted stays.
-  void forget() { connections_ = {}; }
-  void forget(Technology technology) { connections_[indexOf(technology)] = {}; }
+  void forget() {
+    for (const Technology each : kTechnologies)
+      forget(each);
+  }
+  void forget(Technology technology) {
+    Connection& connection = connections_[indexOf(technology)];
+    if (connection.state) connection = {};
+  }
 
  private:
   /// An attempt under way whose begin was seen.
@@ -51,9 +58,10 @@ class Connections {
     std::optional<Text> cause;
     /// Of a re-establishment: where it was needed.
     std::optional<CellIdentity> cell{};
-    std::optional<double> level{};
+    OptionalNumber<double> level{};
   };
 
+  /// All of it is unknown while the state is.
   struct Connection {
     std::optional<Text> state;
     std::int64_t since = 0;

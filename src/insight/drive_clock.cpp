@@ -12,7 +12,7 @@ constexpr std::int64_t kLongestStepBack = 5'000;
 
 }  // namespace
 
-std::optional<DriveClock::Step> DriveClock::take(std::optional<std::int64_t> timestamp) {
+std::optional<DriveClock::Step> DriveClock::take(OptionalNumber<std::int64_t> timestamp) {
   const bool isTime = timestamp && *timestamp >= 1 && *timestamp <= kLastTime;
   if (!now_) {
     if (!isTime) return std::nullopt;

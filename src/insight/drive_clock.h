@@ -3,6 +3,8 @@
 #include <cstdint>
 #include <optional>
 
+#include "values/optional_number.h"
+
 namespace vesk::insight {
 
 /// A jump of the events' time that is no passing of time: from one session of a drive to the next, or a clock set back.
@@ -24,18 +26,18 @@ class DriveClock {
   };
 
   /// Takes the timestamp of the next event. Absent while no event has had a time yet: such an event takes no part.
-  std::optional<Step> take(std::optional<std::int64_t> timestamp);
+  std::optional<Step> take(OptionalNumber<std::int64_t> timestamp);
 
   /// Absent before the first event with a time.
-  [[nodiscard]] std::optional<std::int64_t> now() const { return now_; }
-  [[nodiscard]] std::optional<std::int64_t> first() const { return first_; }
+  [[nodiscard]] OptionalNumber<std::int64_t> now() const { return now_; }
+  [[nodiscard]] OptionalNumber<std::int64_t> first() const { return first_; }
   /// All that passed in the stretches.
   [[nodiscard]] std::int64_t counted() const { return counted_; }
   [[nodiscard]] std::uint64_t stretches() const { return stretches_; }
 
  private:
-  std::optional<std::int64_t> now_;
-  std::optional<std::int64_t> first_;
+  OptionalNumber<std::int64_t> now_;
+  OptionalNumber<std::int64_t> first_;
   std::int64_t counted_ = 0;
   std::uint64_t stretches_ = 0;
 };

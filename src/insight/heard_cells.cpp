@@ -16,8 +16,15 @@ std::optional<HeardKey> keyOf(const std::optional<ServingCell>& cell) {
   return HeardKey{cell->technology, cell->identity.channel, cell->identity.code};
 }
 
+/// Another cell has nearly always another one.
+std::uint64_t digestOf(const HeardKey& key) {
+  const auto channel = static_cast<std::uint64_t>(key.channel.value_or(-1)) + 1;
+  const auto code = static_cast<std::uint64_t>(key.code.value_or(-1)) + 1;
+  return channel << 12U ^ code << 2U ^ static_cast<std::uint64_t>(key.technology);
+}
+
 /// Unknown is weakest.
-double strengthOf(const std::optional<double>& level) {
+double strengthOf(const OptionalNumber<double>& level) {
   return level.value_or(-std::numeric_limits<double>::infinity());
 }
 
@@ -29,16 +36,19 @@ std::string_view nameOf(HeardRole role) {
 }
 
 void HeardCells::take(const Report& report, const Timeline& timeline, std::int64_t now) {
+  // Only now and then, for all rows are gone through; until then find() may come upon an old one.
+  constexpr std::int64_t kTidied = 5000;
+  if (now - tidiedAt_ >= kTidied) dropOld(now);
   const std::optional<HeardKey> serving = keyOf(timeline.mobility().cell());
   if (serving != serving_) {
-    if (Row* left = serving_ ? find(*serving_, now) : nullptr) left->servedUntil = now;
+    if (Row* left = serving_ ? find(*serving_) : nullptr) left->servedUntil = now;
     serving_ = serving;
   }
   if (serving_) takeServing(report, timeline, now);
   for (const CarrierReport& each : report.carriers)
     if (each.level || timeline.carriers().isConfigured(each.index))
       hear({Technology::lte, each.channel, each.code}, each.level, each.quality, now);
-  takeNeighbors(report.neighbors, now);
+  if (!report.neighbors.empty()) takeNeighbors(report.neighbors, now);
 }
 
 void HeardCells::takeNeighbors(std::span<const NeighborReport> neighbors, std::int64_t now) {
@@ -65,7 +75,7 @@ void HeardCells::takeServing(const Report& report, const Timeline& timeline, std
   hear(*serving_, level, quality ? report.kpis.find(*quality) : std::nullopt, now);
 }
 
-void HeardCells::hear(const HeardKey& key, const std::optional<double>& level, const std::optional<double>& quality,
+void HeardCells::hear(const HeardKey& key, const OptionalNumber<double>& level, const OptionalNumber<double>& quality,
                       std::int64_t now) {
   if (!key.channel && !key.code) return;
   Row* row = findOrAdd(key, level, now);
@@ -75,30 +85,56 @@ void HeardCells::hear(const HeardKey& key, const std::optional<double>& level, c
   row->heardAt = now;
 }
 
-HeardCells::Row* HeardCells::find(const HeardKey& key, std::int64_t now) {
-  const auto found = std::find_if(rows_.begin(), rows_.end(), [&](const Row& row) { return row.key == key; });
-  return found == rows_.end() || isOld(*found, now) ? nullptr : &*found;
+void HeardCells::dropOld(std::int64_t now) {
+  tidiedAt_ = now;
+  std::size_t kept = 0;
+  for (std::size_t index = 0; index < rows_.size(); ++index) {
+    if (isOld(rows_[index], now)) continue;
+    rows_[kept] = rows_[index];
+    digests_[kept++] = digests_[index];
+  }
+  rows_.erase(rows_.begin() + static_cast<std::ptrdiff_t>(kept), rows_.end());
+  digests_.resize(kept);
 }
 
-HeardCells::Row* HeardCells::findOrAdd(const HeardKey& key, const std::optional<double>& level, std::int64_t now) {
-  if (Row* row = find(key, now)) return row;
-  Row* room = makeRoom(level, now);
-  if (room != nullptr) *room = {key, std::nullopt, std::nullopt, now, std::nullopt};
-  return room;
+HeardCells::Row* HeardCells::find(const HeardKey& key) {
+  const std::uint64_t digest = digestOf(key);
+  for (auto place = std::find(digests_.begin(), digests_.end(), digest); place != digests_.end();
+       place = std::find(place + 1, digests_.end(), digest)) {
+    Row& row = rows_[static_cast<std::size_t>(place - digests_.begin())];
+    if (row.key == key) return &row;
+  }
+  return nullptr;
 }
 
-HeardCells::Row* HeardCells::makeRoom(const std::optional<double>& level, std::int64_t now) {
-  std::erase_if(rows_, [now](const Row& row) { return isOld(row, now); });
-  if (rows_.size() < kMostCells) return &rows_.emplace_back();
-  const auto weakest = std::min_element(rows_.begin(), rows_.end(), [this](const Row& one, const Row& other) {
-    return std::pair(one.key == serving_, strengthOf(one.level)) <
-           std::pair(other.key == serving_, strengthOf(other.level));
-  });
-  return strengthOf(weakest->level) < strengthOf(level) ? &*weakest : nullptr;
+HeardCells::Row* HeardCells::findOrAdd(const HeardKey& key, const OptionalNumber<double>& level, std::int64_t now) {
+  Row* row = find(key);
+  if (row != nullptr && !isOld(*row, now)) return row;
+  const Row heard{key, std::nullopt, std::nullopt, now, std::nullopt};
+  if (row == nullptr) {
+    if (rows_.size() == kMostCells) dropOld(now);
+    if (rows_.size() < kMostCells) {
+      digests_.push_back(digestOf(key));
+      return &rows_.emplace_back(heard);
+    }
+    row = weakest();
+    if (strengthOf(row->level) >= strengthOf(level)) return nullptr;
+    digests_[static_cast<std::size_t>(row - rows_.data())] = digestOf(key);
+  }
+  *row = heard;
+  return row;
+}
+
+HeardCells::Row* HeardCells::weakest() {
+  const auto rank = [this](const Row& row) { return std::pair(row.key == serving_, strengthOf(row.level)); };
+  return &*std::min_element(rows_.begin(), rows_.end(),
+                            [&](const Row& one, const Row& other) { return rank(one) < rank(other); });
 }
 
 void HeardCells::forget() {
   rows_.clear();
+  digests_.clear();
+  tidiedAt_ = 0;
   serving_.reset();
 }
 

@@ -9,6 +9,7 @@
 #include "insight/report.h"
 #include "insight/timeline.h"
 #include "values/json_form.h"
+#include "values/optional_number.h"
 
 namespace vesk::insight {
 
@@ -16,9 +17,9 @@ namespace vesk::insight {
 struct HeardKey {
   Technology technology;
   /// EARFCN, UARFCN or ARFCN.
-  std::optional<std::int64_t> channel;
+  OptionalNumber<std::int64_t> channel;
   /// PCI, PSC or BSIC.
-  std::optional<std::int64_t> code;
+  OptionalNumber<std::int64_t> code;
 
   /// By code first, in which the cells of a list differ most.
   friend bool operator==(const HeardKey& one, const HeardKey& other) {
@@ -36,15 +37,15 @@ struct HeardCell {
   HeardKey key;
   HeardRole role;
   /// dBm.
-  std::optional<double> level;
+  OptionalNumber<double> level;
   /// dB.
-  std::optional<double> quality;
+  OptionalNumber<double> quality;
   /// To the level of the serving cell of the same technology, dB.
-  std::optional<double> difference;
+  OptionalNumber<double> difference;
   /// Milliseconds since the last report.
   std::int64_t age;
   /// Milliseconds since it ceased to serve, 0 while it serves; absent when it did not serve since it was first heard.
-  std::optional<std::int64_t> servedAgo;
+  OptionalNumber<std::int64_t> servedAgo;
 };
 
 /// The cells heard in the last half minute, of all technologies.
@@ -64,24 +65,31 @@ class HeardCells {
 
   struct Row {
     HeardKey key;
-    std::optional<double> level;
-    std::optional<double> quality;
+    OptionalNumber<double> level;
+    OptionalNumber<double> quality;
     std::int64_t heardAt;
     /// When it last ceased to serve.
-    std::optional<std::int64_t> servedUntil;
+    OptionalNumber<std::int64_t> servedUntil;
   };
 
   [[nodiscard]] static bool isOld(const Row& row, std::int64_t now) { return now - row.heardAt > kKeptFor; }
+  void dropOld(std::int64_t now);
   void takeServing(const Report& report, const Timeline& timeline, std::int64_t now);
   void takeNeighbors(std::span<const NeighborReport> neighbors, std::int64_t now);
-  [[nodiscard]] Row* find(const HeardKey& key, std::int64_t now);
+  /// Also one that is old; null when there is none.
+  [[nodiscard]] Row* find(const HeardKey& key);
   /// The row, a new one when there is none; null when there is no room for one of that level.
-  [[nodiscard]] Row* findOrAdd(const HeardKey& key, const std::optional<double>& level, std::int64_t now);
-  [[nodiscard]] Row* makeRoom(const std::optional<double>& level, std::int64_t now);
-  void hear(const HeardKey& key, const std::optional<double>& level, const std::optional<double>& quality,
+  [[nodiscard]] Row* findOrAdd(const HeardKey& key, const OptionalNumber<double>& level, std::int64_t now);
+  /// Of those that do not serve.
+  [[nodiscard]] Row* weakest();
+  void hear(const HeardKey& key, const OptionalNumber<double>& level, const OptionalNumber<double>& quality,
             std::int64_t now);
 
   std::vector<Row> rows_;
+  /// Of each row's key, in one word: a search looks at these.
+  std::vector<std::uint64_t> digests_;
+  /// When the old rows were dropped last.
+  std::int64_t tidiedAt_ = 0;
   std::optional<HeardKey> serving_;
 };
 

@@ -4,42 +4,42 @@
 
 namespace vesk::insight {
 
-void Histogram::add(double value) {
-  const auto halves = static_cast<std::int32_t>(value * 2 + (value < 0 ? -0.5 : 0.5));
-  // Reports tend to repeat.
-  if (last_ < bins_.size() && bins_[last_].halves == halves) {
-    ++bins_[last_].count;
-    return;
+void Histogram::widenFor(double value) {
+  const std::int64_t halves = halvesOf(value);
+  if (counts_.empty()) first_ = halves;
+  if (halves < first_) {
+    counts_.insert(counts_.begin(), static_cast<std::size_t>(first_ - halves), 0);
+    first_ = halves;
   }
-  auto bin = std::lower_bound(bins_.begin(), bins_.end(), halves,
-                              [](const Bin& each, std::int32_t other) { return each.halves < other; });
-  if (bin == bins_.end() || bin->halves != halves) bin = bins_.insert(bin, {halves, 0});
-  ++bin->count;
-  last_ = static_cast<std::size_t>(bin - bins_.begin());
+  const auto place = static_cast<std::size_t>(halves - first_);
+  counts_.resize(std::max(counts_.size(), place + 1));
+  ++counts_[place];
 }
 
 std::optional<Stats> Histogram::stats() const {
-  if (bins_.empty()) return std::nullopt;
+  if (empty()) return std::nullopt;
   std::uint64_t count = 0;
   std::int64_t sum = 0;
-  for (const Bin& bin : bins_) {
-    count += bin.count;
-    sum += bin.halves * static_cast<std::int64_t>(bin.count);
+  std::int64_t halves = first_;
+  for (const std::uint64_t each : counts_) {
+    count += each;
+    sum += halves++ * static_cast<std::int64_t>(each);
   }
   return Stats{.count = count,
-               .min = bins_.front().halves / 2.0,
-               .mean = static_cast<double>(sum) / 2.0 / static_cast<double>(count),
+               .min = static_cast<double>(first_) / 2,
+               .mean = static_cast<double>(sum) / 2 / static_cast<double>(count),
                .median = (valueAt((count - 1) / 2) + valueAt(count / 2)) / 2,
-               .max = bins_.back().halves / 2.0};
+               .max = static_cast<double>(halves - 1) / 2};
 }
 
 double Histogram::valueAt(std::uint64_t place) const {
-  const auto bin = std::find_if(bins_.begin(), bins_.end(), [&](const Bin& each) {
-    if (place < each.count) return true;
-    place -= each.count;
-    return false;
-  });
-  return bin->halves / 2.0;
+  std::int64_t halves = first_;
+  for (const std::uint64_t each : counts_) {
+    if (place < each) break;
+    place -= each;
+    ++halves;
+  }
+  return static_cast<double>(halves) / 2;
 }
 
 }  // namespace vesk::insight

@@ -69,8 +69,9 @@ std::optional<Reading> readNetworkCode(const ReadingRule& rule, const Value& val
   const std::optional<std::int64_t> code = value.integer();
   if (!code || *code < rule.lowest || *code > rule.highest) return impossibleReading();
   const Value* digits = record.find("num_mnc_digits");
-  const std::optional<std::string> plmn = plmnText(record.find(rule.sibling), &value, digits);
-  return Reading{.text = plmn ? *plmn : codeText(*code, mncDigitsOf(digits)), .plmn = plmn};
+  const std::optional<Plmn> plmn = plmnOf(record.find(rule.sibling), &value, digits);
+  if (!plmn) return Reading{.text = codeText(*code, mncDigitsOf(digits))};
+  return Reading{.text = textOf(*plmn), .plmn = textOf(*plmn)};
 }
 
 std::optional<Reading> readAreaCode(std::int64_t code) {
@@ -90,10 +91,10 @@ std::optional<Reading> readHexadecimal(std::int64_t code) {
 std::optional<Reading> readArea(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {
   const Dictionary* area = value.dictionary();
   if (area == nullptr) return std::nullopt;
-  const std::optional<std::string> plmn = encodedPlmnText(*area);
+  const std::optional<Plmn> plmn = encodedPlmnOf(*area);
   const std::optional<std::int64_t> lac = integerAt(*area, "lac");
   if (!plmn || !lac) return std::nullopt;
-  Reading reading{.text = *plmn + " LAC " + std::to_string(*lac), .plmn = plmn};
+  Reading reading{.text = textOf(*plmn) + " LAC " + std::to_string(*lac), .plmn = textOf(*plmn)};
   if (rule.sibling.empty()) return reading;
   const std::optional<std::int64_t> rac = integerAt(*area, rule.sibling);
   if (!rac) return std::nullopt;

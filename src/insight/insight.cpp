@@ -37,9 +37,8 @@ void Insight::take(const TakenEvent& event, const Stores& stores, std::uint64_t 
   }
   later_ = 0;
   if (passing->passed > 0) summary_.pass(passing->passed, before, timeline_);
-  events_.clear();
-  const Moment moment{time(), number};
-  Step step(moment, events_);
+  const Moment moment{time(), number, clock_.counted()};
+  Step step(moment, happenings_);
   if (passing->gap) {
     summary_.takeGap(*passing->gap);
     timeline_.forget();
@@ -52,11 +51,11 @@ void Insight::take(const TakenEvent& event, const Stores& stores, std::uint64_t 
   timeline_.take(report, step);
   details_.take(report, timeline_.mobility(), moment.time);
   heard_.take(report, timeline_, moment.time);
-  judge_.judge(timeline_.kpis(), moment, events_);
-  summary_.take(report, events_, timeline_);
-  trend_.take(report.kpis, clock_.counted(), moment.time);
-  if (onStep_) onStep_(report, events_);
-  keep(events_);
+  if (!judge_.empty()) judge_.judge(timeline_.kpis(), step);
+  summary_.take(report, step, timeline_);
+  trend_.take(report.kpis, moment);
+  if (onStep_) onStep_(report, step);
+  if (!step.empty()) forgetOldHappenings();
 }
 
 }  // namespace vesk::insight

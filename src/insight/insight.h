@@ -18,7 +18,7 @@ namespace vesk::insight {
 /// only.
 class Insight : public Present {
  public:
-  using StepHandler = std::function<void(const Report& report, const std::vector<TimelineEvent>& events)>;
+  using StepHandler = std::function<void(const Report& report, const Step& step)>;
 
   /// Takes an event that the intake has just taken into `stores`.
   void observe(const TakenEvent& event, const Stores& stores);
@@ -43,8 +43,6 @@ class Insight : public Present {
   ReportReader reader_;
   Summary summary_;
   RuleJudge judge_;
-  /// Of the step under way; kept for its storage.
-  std::vector<TimelineEvent> events_;
   StepHandler onStep_;
 };
 

@@ -8,6 +8,7 @@
 
 #include "insight/quantities.h"
 #include "insight/technology.h"
+#include "values/optional_number.h"
 
 namespace vesk::insight {
 
@@ -88,7 +89,7 @@ struct KpiValue {
 class KpiReport {
  public:
   /// Nothing for an absent value.
-  void add(Kpi kpi, std::optional<double> value) {
+  void add(Kpi kpi, OptionalNumber<double> value) {
     if (value) values_[size_++] = {kpi, *value};
   }
   void clear() { size_ = 0; }
@@ -96,7 +97,7 @@ class KpiReport {
   [[nodiscard]] bool empty() const { return size_ == 0; }
   [[nodiscard]] const KpiValue* begin() const { return values_.data(); }
   [[nodiscard]] const KpiValue* end() const { return values_.data() + size_; }
-  [[nodiscard]] std::optional<double> find(Kpi kpi) const {
+  [[nodiscard]] OptionalNumber<double> find(Kpi kpi) const {
     for (const KpiValue& each : *this)
       if (each.kpi == kpi) return each.value;
     return std::nullopt;
@@ -116,32 +117,40 @@ class KnownKpis {
   static constexpr std::int64_t kKnownFor = 30'000;
 
   void take(const KpiReport& report, std::int64_t now) {
-    for (const auto& [kpi, value] : report)
-      reports_[indexOf(kpi)] = {value, now};
+    for (const auto& [kpi, value] : report) {
+      values_[indexOf(kpi)] = value;
+      times_[indexOf(kpi)] = now;
+    }
   }
-  void forget() { reports_ = {}; }
+  void forget() { times_ = kNoTimes; }
   void forget(Technology technology) {
     for (const KpiDescription& each : kKpis)
-      if (each.technology == technology) reports_[indexOf(each.kpi)].reset();
+      if (each.technology == technology) times_[indexOf(each.kpi)] = kNever;
   }
 
-  [[nodiscard]] std::optional<double> at(Kpi kpi, std::int64_t now) const {
-    const auto& report = reports_[indexOf(kpi)];
-    return report && now - report->time <= kKnownFor ? std::optional(report->value) : std::nullopt;
+  [[nodiscard]] bool isKnown(Kpi kpi, std::int64_t now) const { return now - times_[indexOf(kpi)] <= kKnownFor; }
+  [[nodiscard]] OptionalNumber<double> at(Kpi kpi, std::int64_t now) const {
+    return isKnown(kpi, now) ? OptionalNumber(values_[indexOf(kpi)]) : std::nullopt;
   }
   /// How long ago, in milliseconds, the value was reported, also when it is no longer known.
-  [[nodiscard]] std::optional<std::int64_t> age(Kpi kpi, std::int64_t now) const {
-    const auto& report = reports_[indexOf(kpi)];
-    return report ? std::optional(now - report->time) : std::nullopt;
+  [[nodiscard]] OptionalNumber<std::int64_t> age(Kpi kpi, std::int64_t now) const {
+    const std::int64_t time = times_[indexOf(kpi)];
+    return time == kNever ? std::nullopt : OptionalNumber(now - time);
   }
 
  private:
-  struct Report {
-    double value;
-    std::int64_t time;
-  };
+  /// So long before every time that it is not known at any.
+  static constexpr std::int64_t kNever = -kKnownFor - 1;
 
-  std::array<std::optional<Report>, kKpiCount> reports_;
+  static constexpr auto kNoTimes = [] {
+    std::array<std::int64_t, kKpiCount> times{};
+    times.fill(kNever);
+    return times;
+  }();
+
+  std::array<double, kKpiCount> values_{};
+  /// When each was reported.
+  std::array<std::int64_t, kKpiCount> times_ = kNoTimes;
 };
 
 }  // namespace vesk::insight

@@ -13,7 +13,8 @@ struct UmtsChain {
 };
 
 /// Ec/N0 is RSCP / RSSI: where the RSCP is not reported, the two tell it.
-UmtsChain umtsChainOf(const Record& record) {
+UmtsChain umtsChainOf(const Record& element) {
+  OrderedLookup record(element);
   UmtsChain chain{std::nullopt, decodedLevel(kEcNo, record.find("rsrq_range"_text), 0.5, -24.5),
                   levelOf(kRssi, record, "rssi"_text)};
   if (const Value* code = record.find("rsrp_range"_text)) {
@@ -33,21 +34,28 @@ struct NeighborKeys {
 };
 
 void readLteNeighbors(Report& report, const RecordList& list, const NeighborKeys& keys) {
-  for (const Record& each : list)
+  for (const Record& element : list) {
+    OrderedLookup each(element);
     report.neighbors.push_back({Technology::lte, earfcnOf(each, keys.channel), pciOf(each, keys.code),
                                 levelOf(kRsrp, each, keys.level), levelOf(kRsrq, each, keys.quality)});
+  }
 }
 
 void readUmtsNeighbors(Report& report, const RecordList& list, const NeighborKeys& keys) {
-  for (const Record& each : list)
+  for (const Record& element : list) {
+    OrderedLookup each(element);
     report.neighbors.push_back({Technology::umts, uarfcnOf(each, keys.channel), pscOf(each, keys.code),
                                 levelOf(kRscp, each, keys.level), levelOf(kEcNo, each, keys.quality)});
+  }
 }
 
 void readGsmNeighbors(Report& report, const RecordList& list) {
-  for (const Record& each : list)
-    report.neighbors.push_back(
-        {Technology::gsm, arfcnOf(each), bsicOf(each), levelOf(kRxLev, each, "rxlev"_text), std::nullopt});
+  for (const Record& element : list) {
+    OrderedLookup each(element);
+    const Integer arfcn = arfcnOf(each, std::nullopt);
+    const Integer bsic = bsicOf(each);
+    report.neighbors.push_back({Technology::gsm, arfcn, bsic, levelOf(kRxLev, each, "rxlev"_text), std::nullopt});
+  }
 }
 
 const NeighborKeys& utraKeys() {
@@ -57,37 +65,43 @@ const NeighborKeys& utraKeys() {
 
 }  // namespace
 
-void readLteMeasurement(Report& report, const Dictionary& record, const Stores& stores) {
+void readLteMeasurement(Report& report, OrderedLookup& record, const Stores& stores) {
   if (record.find("inst_values"_text) == nullptr || stores.myLTE.RsrpRsrqSinr.size() == 0) return;
-  const Record& sample = stores.myLTE.RsrpRsrqSinr[0];
+  OrderedLookup sample(stores.myLTE.RsrpRsrqSinr[0]);
+  report.samplePci = pciOf(sample, "phy_cell_id"_text);
   const auto better = [&](const Quantity& quantity, const Text& first, const Text& second) {
-    return greater(levelOf(quantity, sample, first), levelOf(quantity, sample, second));
+    const Number one = levelOf(quantity, sample, first);
+    return greater(one, levelOf(quantity, sample, second));
   };
   const Number level = better(kRsrp, "rsrp0"_text, "rsrp1"_text);
   report.kpis.add(Kpi::lteRsrp, level);
   report.kpis.add(Kpi::lteRsrq, better(kRsrq, "rsrq0"_text, "rsrq1"_text));
   report.kpis.add(Kpi::lteSinr, better(kSinr, "sinr0"_text, "sinr1"_text));
-  report.samplePci = pciOf(sample, "phy_cell_id"_text);
   if (level) report.technology = Technology::lte;
 }
 
-void readLteTxPower(Report& report, const Dictionary& record, const Stores& stores) {
+void readLteTxPower(Report& report, OrderedLookup& record, const Stores& stores) {
   if (record.find("tx_power_info"_text) == nullptr) return;
-  const auto strongest = [&](const Text& key) {
-    return greatest(stores.myLTE.TxPower, [&](const Record& each) { return levelOf(kTxPower, each, key); });
-  };
-  report.kpis.add(Kpi::ltePuschTxPower, strongest("pusch_tx_power"_text));
-  report.kpis.add(Kpi::ltePucchTxPower, strongest("pucch_tx_power"_text));
+  Number pucch;
+  Number pusch;
+  for (const Record& element : stores.myLTE.TxPower) {
+    OrderedLookup each(element);
+    pucch = greater(pucch, levelOf(kTxPower, each, "pucch_tx_power"_text));
+    pusch = greater(pusch, levelOf(kTxPower, each, "pusch_tx_power"_text));
+  }
+  report.kpis.add(Kpi::ltePuschTxPower, pusch);
+  report.kpis.add(Kpi::ltePucchTxPower, pucch);
 }
 
-void readUmtsTxPower(Report& report, const Dictionary& record, const Stores& stores) {
+void readUmtsTxPower(Report& report, OrderedLookup& record, const Stores& stores) {
   if (record.find("tx_power_info"_text) == nullptr) return;
-  report.kpis.add(Kpi::umtsTxPower, greatest(stores.myUMTS.TxPower, [](const Record& each) {
+  report.kpis.add(Kpi::umtsTxPower, greatest(stores.myUMTS.TxPower, [](const Record& element) {
+                    OrderedLookup each(element);
                     return levelOf(kTxPower, each, "pusch_tx_power"_text);
                   }));
 }
 
-void readUmtsMeasurement(Report& report, const Dictionary& record, const Stores& stores) {
+void readUmtsMeasurement(Report& report, OrderedLookup& record, const Stores& stores) {
   const Value* isConnected = record.find("connected_mode"_text);
   if (isConnected != nullptr && isConnected->boolean() != nullptr) report.isConnectedMode = *isConnected->boolean();
   if (record.find("rx_info"_text) == nullptr) return;
@@ -102,12 +116,12 @@ void readUmtsMeasurement(Report& report, const Dictionary& record, const Stores&
   if (!report.kpis.empty()) report.technology = Technology::umts;
 }
 
-void readGsmIdleMeasurement(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+void readGsmIdleMeasurement(Report& report, OrderedLookup& record, const Stores& /*stores*/) {
   report.kpis.add(Kpi::gsmRxLev, levelOf(kRxLev, record, "idle_rxlev_dBm"_text));
   if (!report.kpis.empty()) report.technology = Technology::gsm;
 }
 
-void readGsmConnectedMeasurement(Report& report, const Dictionary& record, const Stores& /*stores*/) {
+void readGsmConnectedMeasurement(Report& report, OrderedLookup& record, const Stores& /*stores*/) {
   const Number level = decodedLevel(kRxLev, record.find("cs_rxlev_sub"_text), 1, -110);
   report.kpis.add(Kpi::gsmRxLev, level);
   report.kpis.add(Kpi::gsmRxQual, levelOf(kRxQual, record, "cs_rxqual_sub"_text));
@@ -118,26 +132,26 @@ void readGsmConnectedMeasurement(Report& report, const Dictionary& record, const
                   greatest(*powers->array(), [](const Value& each) { return possibleValue(kTxPower, &each); }));
 }
 
-void readNeighborsOfLte(Report& report, const Dictionary& record, const Stores& stores) {
+void readNeighborsOfLte(Report& report, OrderedLookup& record, const Stores& stores) {
   if (record.find("meas_nbr_eutra"_text) == nullptr) return;
   static const NeighborKeys kKeys{"nbr_earfcn"_text, "nbr_phys_cell_id"_text, "nbr_rsrp"_text, "nbr_rsrq"_text};
   readLteNeighbors(report, stores.myLTE.EutraNbrsMeas, kKeys);
   report.kpis.add(Kpi::lteNbrRsrp, greatest(report.neighbors, [](const NeighborReport& each) { return each.level; }));
 }
 
-void readOtherNeighborsOfLte(Report& report, const Dictionary& record, const Stores& stores) {
+void readOtherNeighborsOfLte(Report& report, OrderedLookup& record, const Stores& stores) {
   if (record.find("meas_nbr_utra"_text) != nullptr) readUmtsNeighbors(report, stores.myLTE.UtraNbrsMeas, utraKeys());
   if (record.find("meas_nbr_geran"_text) != nullptr) readGsmNeighbors(report, stores.myLTE.GeraNbrsMeas);
 }
 
-void readNeighborsOfUmts(Report& report, const Dictionary& record, const Stores& stores) {
+void readNeighborsOfUmts(Report& report, OrderedLookup& record, const Stores& stores) {
   static const NeighborKeys kEutraKeys{"earfcn"_text, "phy_cell_id"_text, "rsrp"_text, "rsrq"_text};
   if (record.find("meas_utra_result"_text) != nullptr) readUmtsNeighbors(report, stores.myUMTS.utraNbrMeas, utraKeys());
   if (record.find("meas_gsm_result"_text) != nullptr) readGsmNeighbors(report, stores.myUMTS.geraNbrMeas);
   if (record.find("meas_lte_result"_text) != nullptr) readLteNeighbors(report, stores.myUMTS.eUtraNbrMeas, kEutraKeys);
 }
 
-void readNeighborsOfGsm(Report& report, const Dictionary& record, const Stores& stores) {
+void readNeighborsOfGsm(Report& report, OrderedLookup& record, const Stores& stores) {
   static const NeighborKeys kUtraKeys{"dl_uarfcn"_text, "cpich_sc"_text, "cpich_rscp"_text, "cpich_ecn0"_text};
   static const NeighborKeys kEutraKeys{"earfcn"_text, "physical_cell_id"_text, "rsrp"_text, "rsrq"_text};
   if (record.find("gsm_ncell_meas"_text) != nullptr) readGsmNeighbors(report, stores.myGSM.geraNbrMeas);

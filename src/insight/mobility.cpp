@@ -14,11 +14,22 @@ constexpr std::int64_t kPingPongStay = 10'000;
 std::optional<Technology> Mobility::takeTechnology(const Report& report, Step& step) {
   if (!report.technology || report.technology == technology_) return std::nullopt;
   const std::optional<Technology> left = std::exchange(technology_, report.technology);
+  forgetCells();
+  step.add(EventKind::technology, TechnologyChange{left, *technology_});
+  return left;
+}
+
+void Mobility::forgetCells() {
   cell_.reset();
   previous_.reset();
   isConnectedMode_.reset();
-  step.add(EventKind::technology, TechnologyChange{left, *technology_});
-  return left;
+}
+
+void Mobility::forget() {
+  technology_.reset();
+  forgetCells();
+  for (auto& area : areas_)
+    area.reset();
 }
 
 void Mobility::take(const Report& report, const Connections& connections, const KnownKpis& kpis, Step& step) {
@@ -35,7 +46,7 @@ void Mobility::takeCell(const ServingCellReport& report, const Connections& conn
     cell_->identity.fillIn(identity);
     return;
   }
-  const std::optional<double> level = kpis.at(levelOf(technology), step.now());
+  const OptionalNumber<double> level = kpis.at(levelOf(technology), step.now());
   const std::optional<ServingCell> left = std::exchange(cell_, ServingCell{technology, identity, step.now()});
   if (!left) {
     step.add(EventKind::cell, CellChange{technology, CellEntry::first, std::nullopt, identity, level, std::nullopt});
@@ -72,7 +83,7 @@ Mobility::Way Mobility::wayToNewCell(Technology technology, const Connections& c
 }
 
 void Mobility::takeArea(const AreaReport& report, Step& step) {
-  std::optional<std::string>& known = areas_[static_cast<std::size_t>(report.area)];
+  std::optional<AreaIdentity>& known = areas_[static_cast<std::size_t>(report.area)];
   if (known == report.identity) return;
   step.add(EventKind::area, AreaChange{report.area, known, report.identity});
   known = report.identity;

@@ -3,7 +3,6 @@
 #include <array>
 #include <cstdint>
 #include <optional>
-#include <string>
 
 #include "insight/connections.h"
 #include "insight/kpis.h"
@@ -25,8 +24,8 @@ class Mobility {
   [[nodiscard]] const std::optional<Technology>& technology() const { return technology_; }
   /// Of the technology in use.
   [[nodiscard]] const std::optional<ServingCell>& cell() const { return cell_; }
-  /// "310-410 19980"; absent while unknown.
-  [[nodiscard]] const std::optional<std::string>& area(Area area) const {
+  /// Absent while unknown.
+  [[nodiscard]] const std::optional<AreaIdentity>& area(Area area) const {
     return areas_[static_cast<std::size_t>(area)];
   }
 
@@ -34,7 +33,7 @@ class Mobility {
   std::optional<Technology> takeTechnology(const Report& report, Step& step);
   /// The serving cell and the area. `connections` are those before the report.
   void take(const Report& report, const Connections& connections, const KnownKpis& kpis, Step& step);
-  void forget() { *this = Mobility(); }
+  void forget();
 
  private:
   struct Way {
@@ -44,6 +43,7 @@ class Mobility {
 
   void takeCell(const ServingCellReport& report, const Connections& connections, const KnownKpis& kpis, Step& step);
   [[nodiscard]] Way wayToNewCell(Technology technology, const Connections& connections) const;
+  void forgetCells();
   void takeArea(const AreaReport& report, Step& step);
 
   std::optional<Technology> technology_;
@@ -51,7 +51,7 @@ class Mobility {
   /// The cell before, in the same technology.
   std::optional<CellIdentity> previous_;
   std::optional<bool> isConnectedMode_;
-  std::array<std::optional<std::string>, 3> areas_;
+  std::array<std::optional<AreaIdentity>, 3> areas_;
 };
 
 }  // namespace vesk::insight

@@ -2,13 +2,10 @@
 
 namespace vesk::insight {
 
-void Present::keep(const std::vector<TimelineEvent>& events) {
-  for (const TimelineEvent& event : events) {
-    if (happenings_.size() == kMostHappenings) {
-      happenings_.pop_front();
-      ++happenedBefore_;
-    }
-    happenings_.push_back({event, clock_.counted()});
+void Present::forgetOldHappenings() {
+  for (std::size_t size = happenings_.size(); size > kMostHappenings; --size) {
+    happenings_.pop_front();
+    ++happenedBefore_;
   }
 }
 

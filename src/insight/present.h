@@ -2,7 +2,6 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <deque>
 #include <optional>
 #include <vector>
 
@@ -14,12 +13,6 @@
 #include "insight/trend.h"
 
 namespace vesk::insight {
-
-/// An event with where it lies in the drive's counted time, without its gaps: milliseconds.
-struct Happening {
-  TimelineEvent event;
-  std::int64_t position;
-};
 
 /// What is known of a drive at a moment, and what led there: everything but the figures of the whole drive. A copy
 /// stays as it is while the drive goes on.
@@ -45,7 +38,7 @@ class Present {
   [[nodiscard]] const ServingDetails& servingDetails() const { return details_; }
 
   /// The last events, oldest first.
-  [[nodiscard]] const std::deque<Happening>& happenings() const { return happenings_; }
+  [[nodiscard]] const Happenings& happenings() const { return happenings_; }
   /// How many there were before the first of these.
   [[nodiscard]] std::uint64_t happenedBefore() const { return happenedBefore_; }
   [[nodiscard]] const Trend& trend() const { return trend_; }
@@ -53,7 +46,8 @@ class Present {
  protected:
   /// Of the last event.
   [[nodiscard]] std::int64_t time() const { return clock_.now().value_or(0); }
-  void keep(const std::vector<TimelineEvent>& events);
+  /// Keeps the last of what happened.
+  void forgetOldHappenings();
 
   DriveClock clock_;
   EventCounts counts_;
@@ -61,6 +55,7 @@ class Present {
   ServingDetails details_;
   HeardCells heard_;
   Trend trend_;
+  Happenings happenings_;
   std::int64_t later_ = 0;
 
  private:
@@ -68,7 +63,6 @@ class Present {
 
   [[nodiscard]] std::int64_t seen() const { return time() + later_; }
 
-  std::deque<Happening> happenings_;
   std::uint64_t happenedBefore_ = 0;
 };
 

@@ -16,11 +16,6 @@ std::string_view nameOf(Grade grade) {
   return {};
 }
 
-std::optional<double> possibleValue(const Quantity& quantity, const Value* value) {
-  const std::optional<double> number = value == nullptr ? std::nullopt : value->number();
-  return number && isPossible(quantity, *number) ? number : std::nullopt;
-}
-
 std::optional<Grade> gradeOf(const Quantity& quantity, double value) {
   if (!quantity.steps) return std::nullopt;
   if (value >= quantity.steps->excellent) return Grade::excellent;

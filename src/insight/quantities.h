@@ -3,6 +3,7 @@
 #include <optional>
 #include <string_view>
 
+#include "values/optional_number.h"
 #include "values/value.h"
 
 /// The measured quantities: what values are possible, and which are good.
@@ -38,7 +39,7 @@ struct Quantity {
   std::optional<GradeSteps> steps{};
   std::optional<Floor> floor{};
   /// From this value on it is high; absent where that says nothing.
-  std::optional<double> high{};
+  OptionalNumber<double> high{};
 };
 
 // clang-format off
@@ -61,7 +62,10 @@ inline constexpr Quantity kTxPower{.unit = "dBm", .lowest = -50, .highest = 39, 
 }
 
 /// The number that a record holds, when it is one (a boolean is none) and possible; null is absent.
-[[nodiscard]] std::optional<double> possibleValue(const Quantity& quantity, const Value* value);
+[[nodiscard]] inline OptionalNumber<double> possibleValue(const Quantity& quantity, const Value* value) {
+  const OptionalNumber<double> number = value == nullptr ? std::nullopt : value->number();
+  return number && isPossible(quantity, *number) ? number : std::nullopt;
+}
 
 /// Absent for a quantity without grades.
 [[nodiscard]] std::optional<Grade> gradeOf(const Quantity& quantity, double value);

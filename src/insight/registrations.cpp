@@ -56,7 +56,10 @@ bool Registrations::hasNoService(const std::optional<Technology>& technology) co
 }
 
 void Registrations::forget() {
-  known_ = {};
+  for (Known& each : known_) {
+    each.status.reset();
+    each.rejectCause.reset();
+  }
   noServiceSince_.reset();
 }
 

@@ -7,6 +7,7 @@
 #include "insight/cause_counts.h"
 #include "insight/report.h"
 #include "insight/step.h"
+#include "values/optional_number.h"
 
 namespace vesk::insight {
 
@@ -20,7 +21,7 @@ class Registrations {
     return of(registration).rejectCause;
   }
   /// Since when there is no service; absent while there is.
-  [[nodiscard]] const std::optional<std::int64_t>& noServiceSince() const { return noServiceSince_; }
+  [[nodiscard]] const OptionalNumber<std::int64_t>& noServiceSince() const { return noServiceSince_; }
   /// On the whole drive.
   [[nodiscard]] const CauseCounts& rejects(Registration registration) const {
     return rejects_[static_cast<std::size_t>(registration)];
@@ -45,7 +46,7 @@ class Registrations {
 
   std::array<Known, 3> known_;
   std::array<CauseCounts, 3> rejects_;
-  std::optional<std::int64_t> noServiceSince_;
+  OptionalNumber<std::int64_t> noServiceSince_;
 };
 
 }  // namespace vesk::insight

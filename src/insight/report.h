@@ -4,12 +4,13 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
-#include <string>
 #include <string_view>
 #include <vector>
 
 #include "insight/cell_identity.h"
 #include "insight/kpis.h"
+#include "insight/plmn.h"
+#include "values/optional_number.h"
 #include "values/text.h"
 
 /// What one metric event says, in the terms of this room: everything that is impossible is already absent.
@@ -30,8 +31,7 @@ enum class Area : std::uint8_t { tracking, location, routing };
 
 struct AreaReport {
   Area area;
-  /// "310-410 19980", "460-00 4566 100".
-  std::string identity;
+  AreaIdentity identity;
 };
 
 /// Names are whole: "KLTE_RRC_STATE_CONNECTED".
@@ -40,7 +40,7 @@ struct RrcReport {
   Text state;
   std::optional<Text> previous{};
   /// Milliseconds.
-  std::optional<std::int64_t> previousDuration{};
+  OptionalNumber<std::int64_t> previousDuration{};
   std::optional<Text> cause{};
   /// Told beside something else: it is known from then on, and is no change.
   bool isMention = false;
@@ -57,21 +57,21 @@ enum class Registration : std::uint8_t { emm, mm, gmm };
 struct RegistrationReport {
   Registration registration;
   std::optional<Text> status;
-  std::optional<Text> procedure;
   std::optional<Text> rejectCause;
+  std::optional<Text> procedure;
 };
 
 enum class CarrierState : std::uint8_t { released, configured, activated };
 
 /// An element of the carrier aggregation list.
 struct CarrierReport {
-  std::optional<std::int64_t> index;
+  OptionalNumber<std::int64_t> index;
   std::optional<CarrierState> state;
-  std::optional<std::int64_t> channel;
-  std::optional<std::int64_t> code;
-  std::optional<double> bandwidth;
-  std::optional<double> level;
-  std::optional<double> quality;
+  OptionalNumber<std::int64_t> code;
+  OptionalNumber<std::int64_t> channel;
+  OptionalNumber<double> bandwidth;
+  OptionalNumber<double> level;
+  OptionalNumber<double> quality;
 };
 
 struct Bearer {
@@ -82,10 +82,10 @@ struct Bearer {
 
 /// Milliseconds.
 struct CdrxParameters {
-  std::optional<std::int64_t> onDuration;
-  std::optional<std::int64_t> inactivity;
-  std::optional<std::int64_t> longCycle;
-  std::optional<std::int64_t> shortCycle;
+  OptionalNumber<std::int64_t> onDuration;
+  OptionalNumber<std::int64_t> inactivity;
+  OptionalNumber<std::int64_t> longCycle;
+  OptionalNumber<std::int64_t> shortCycle;
 
   friend bool operator==(const CdrxParameters&, const CdrxParameters&) = default;
 };
@@ -98,10 +98,10 @@ struct CdrxReport {
 /// A cell as a list of neighbours has it.
 struct NeighborReport {
   Technology technology;
-  std::optional<std::int64_t> channel;
-  std::optional<std::int64_t> code;
-  std::optional<double> level;
-  std::optional<double> quality;
+  OptionalNumber<std::int64_t> channel;
+  OptionalNumber<std::int64_t> code;
+  OptionalNumber<double> level;
+  OptionalNumber<double> quality;
 };
 
 struct Report {
@@ -109,7 +109,7 @@ struct Report {
   std::optional<Technology> technology;
   KpiReport kpis;
   /// Of the LTE sample that the KPIs are of.
-  std::optional<std::int64_t> samplePci;
+  OptionalNumber<std::int64_t> samplePci;
   /// Of a UMTS measurement.
   std::optional<bool> isConnectedMode;
   std::optional<ServingCellReport> servingCell;
@@ -119,11 +119,11 @@ struct Report {
   std::vector<CarrierReport> carriers;
   std::optional<std::vector<Bearer>> bearers;
   std::optional<CdrxReport> cdrx;
-  std::optional<std::int64_t> transmissionMode;
+  OptionalNumber<std::int64_t> transmissionMode;
   /// Of the serving LTE cell's downlink, MHz.
-  std::optional<double> bandwidth;
+  OptionalNumber<double> bandwidth;
   /// The least level to stay on the LTE cell, dBm.
-  std::optional<double> leastLevel;
+  OptionalNumber<double> leastLevel;
   std::optional<std::size_t> simFiles;
   std::vector<NeighborReport> neighbors;
 };

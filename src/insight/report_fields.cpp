@@ -3,8 +3,6 @@
 #include <array>
 #include <limits>
 
-#include "insight/channels.h"
-
 namespace vesk::insight {
 
 namespace {
@@ -15,7 +13,7 @@ constexpr std::int64_t kLastBsic = 63;
 
 }  // namespace
 
-Integer integerOf(const Dictionary& record, const Text& key) {
+Integer integerOf(OrderedLookup& record, const Text& key) {
   constexpr std::array<std::int64_t, 3> kNoValues{std::numeric_limits<std::uint32_t>::max(),
                                                   std::numeric_limits<std::int32_t>::max(),
                                                   std::numeric_limits<std::int32_t>::min()};
@@ -25,36 +23,35 @@ Integer integerOf(const Dictionary& record, const Text& key) {
   return isValue ? number : std::nullopt;
 }
 
-Integer integerIn(const Dictionary& record, const Text& key, std::int64_t first, std::int64_t last) {
+Integer integerIn(OrderedLookup& record, const Text& key, std::int64_t first, std::int64_t last) {
   const Integer number = integerOf(record, key);
   return number && *number >= first && *number <= last ? number : std::nullopt;
 }
 
-Integer anyInteger(const Dictionary& record, const Text& key) {
+Integer anyInteger(OrderedLookup& record, const Text& key) {
   const Value* value = record.find(key);
   return value == nullptr ? std::nullopt : value->integer();
 }
 
-Integer uarfcnOf(const Dictionary& record, const Text& key) {
+Integer uarfcnOf(OrderedLookup& record, const Text& key) {
   const Integer number = integerOf(record, key);
   return number && umtsChannel(*number) ? number : std::nullopt;
 }
 
-Integer arfcnOf(const Dictionary& record) {
+Integer arfcnOf(OrderedLookup& record, std::optional<SharedGsmBand> indicated) {
   const Integer number = integerOf(record, "arfcn"_text);
-  const auto indicated = sharedGsmBand(record.find("gsm_band"_text));
   return number && gsmChannel(*number, indicated) ? number : std::nullopt;
 }
 
-Integer pciOf(const Dictionary& record, const Text& key) {
+Integer pciOf(OrderedLookup& record, const Text& key) {
   return integerIn(record, key, 0, kLastPci);
 }
 
-Integer pscOf(const Dictionary& record, const Text& key) {
+Integer pscOf(OrderedLookup& record, const Text& key) {
   return integerIn(record, key, 0, kLastPsc);
 }
 
-Integer bsicOf(const Dictionary& record) {
+Integer bsicOf(OrderedLookup& record) {
   return integerIn(record, "bsic"_text, 0, kLastBsic);
 }
 
@@ -65,7 +62,7 @@ Number decodedLevel(const Quantity& quantity, const Value* code, double step, do
   return isPossible(quantity, level) ? Number(level) : std::nullopt;
 }
 
-std::optional<Text> nameIn(const Dictionary& record, const Text& key) {
+std::optional<Text> nameIn(OrderedLookup& record, const Text& key) {
   const Value* value = record.find(key);
   const Text* name = value == nullptr ? nullptr : value->text();
   return name == nullptr ? std::nullopt : std::optional(*name);

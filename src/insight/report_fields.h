@@ -4,32 +4,35 @@
 #include <cstdint>
 #include <optional>
 
+#include "insight/channels.h"
 #include "insight/quantities.h"
-#include "values/value.h"
+#include "values/optional_number.h"
+#include "values/ordered_lookup.h"
 
 /// What a record holds under a key, as far as it is possible; absent for anything else.
 namespace vesk::insight {
 
-using Integer = std::optional<std::int64_t>;
-using Number = std::optional<double>;
+using Integer = OptionalNumber<std::int64_t>;
+using Number = OptionalNumber<double>;
 
 /// A number, unless it is one of those that stand for no value in 32 bits.
-[[nodiscard]] Integer integerOf(const Dictionary& record, const Text& key);
-[[nodiscard]] Integer integerIn(const Dictionary& record, const Text& key, std::int64_t first, std::int64_t last);
+[[nodiscard]] Integer integerOf(OrderedLookup& record, const Text& key);
+[[nodiscard]] Integer integerIn(OrderedLookup& record, const Text& key, std::int64_t first, std::int64_t last);
 /// Any number: of a row that says nothing of what is possible.
-[[nodiscard]] Integer anyInteger(const Dictionary& record, const Text& key);
+[[nodiscard]] Integer anyInteger(OrderedLookup& record, const Text& key);
 
 /// A new band may have any EARFCN: one that lies in no known band is a channel all the same.
-[[nodiscard]] inline Integer earfcnOf(const Dictionary& record, const Text& key) {
+[[nodiscard]] inline Integer earfcnOf(OrderedLookup& record, const Text& key) {
   return integerOf(record, key);
 }
-[[nodiscard]] Integer uarfcnOf(const Dictionary& record, const Text& key);
-[[nodiscard]] Integer arfcnOf(const Dictionary& record);
-[[nodiscard]] Integer pciOf(const Dictionary& record, const Text& key);
-[[nodiscard]] Integer pscOf(const Dictionary& record, const Text& key);
-[[nodiscard]] Integer bsicOf(const Dictionary& record);
+[[nodiscard]] Integer uarfcnOf(OrderedLookup& record, const Text& key);
+/// `indicated`: the band of a number that two bands have.
+[[nodiscard]] Integer arfcnOf(OrderedLookup& record, std::optional<SharedGsmBand> indicated);
+[[nodiscard]] Integer pciOf(OrderedLookup& record, const Text& key);
+[[nodiscard]] Integer pscOf(OrderedLookup& record, const Text& key);
+[[nodiscard]] Integer bsicOf(OrderedLookup& record);
 
-[[nodiscard]] inline Number levelOf(const Quantity& quantity, const Dictionary& record, const Text& key) {
+[[nodiscard]] inline Number levelOf(const Quantity& quantity, OrderedLookup& record, const Text& key) {
   return possibleValue(quantity, record.find(key));
 }
 /// What a code in steps of `step` above `offset` stands for; null is absent.
@@ -49,6 +52,6 @@ template <class Records, class LevelIn>
 }
 
 /// The whole name of an enumeration value.
-[[nodiscard]] std::optional<Text> nameIn(const Dictionary& record, const Text& key);
+[[nodiscard]] std::optional<Text> nameIn(OrderedLookup& record, const Text& key);
 
 }  // namespace vesk::insight

@@ -1,10 +1,10 @@
 #include "insight/report_reader.h"
 
-#include <algorithm>
 #include <array>
 
 #include "insight/report_steps.h"
 #include "messages/registry/metric_identifiers.h"
+#include "messages/registry/metric_rows.h"
 
 namespace vesk::insight {
 
@@ -12,11 +12,11 @@ namespace {
 
 struct MetricReading {
   std::int64_t metricId;
-  void (*read)(Report& report, const Dictionary& record, const Stores& stores);
+  void (*read)(Report& report, OrderedLookup& record, const Stores& stores);
 };
 
 /// The others say nothing here.
-constexpr std::array kReadings{
+constexpr MetricRows kReadings(std::array{
     MetricReading{K_LTE_RSRP_RSRQ_SINR, readLteMeasurement},
     MetricReading{K_LTE_INTRARAT_MEAS, readNeighborsOfLte},
     MetricReading{K_UMTS_SCELL_MEAS, readUmtsMeasurement},
@@ -40,7 +40,7 @@ constexpr std::array kReadings{
     MetricReading{K_GSM_CS_RF_MEAS, readGsmConnectedMeasurement},
     MetricReading{K_GSM_NCELL_MEAS, readNeighborsOfGsm},
     MetricReading{K_SIM_FILE_INFO, readSimFiles},
-};
+});
 
 /// Nothing is said; the lists keep their storage.
 void clear(Report& report) {
@@ -66,9 +66,10 @@ void clear(Report& report) {
 
 const Report& ReportReader::read(std::int64_t metricId, const Dictionary& record, const Stores& stores) {
   clear(report_);
-  const auto* reading = std::find_if(kReadings.begin(), kReadings.end(),
-                                     [metricId](const MetricReading& each) { return each.metricId == metricId; });
-  if (reading != kReadings.end()) reading->read(report_, record, stores);
+  if (const MetricReading* reading = kReadings.find(metricId)) {
+    OrderedLookup fields(record);
+    reading->read(report_, fields, stores);
+  }
   return report_;
 }
 

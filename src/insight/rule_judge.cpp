@@ -8,35 +8,34 @@ void RuleJudge::setRules(std::vector<Rule> rules) {
     rules_.push_back({std::move(rule)});
 }
 
-void RuleJudge::judge(const KnownKpis& kpis, const Moment& moment, std::vector<TimelineEvent>& events) {
-  const std::size_t happened = events.size();
-  Step alerts(moment, events);
+void RuleJudge::judge(const KnownKpis& kpis, Step& step) {
+  const std::size_t happened = step.size();
   for (Judged& judged : rules_) {
     if (const auto* rule = std::get_if<KpiRule>(&judged.rule.condition)) {
-      judgeKpi(judged, *rule, kpis, alerts);
+      judgeKpi(judged, *rule, kpis, step);
       continue;
     }
     const EventKind kind = std::get<EventRule>(judged.rule.condition).kind;
     for (std::size_t index = 0; index < happened; ++index) {
-      if (events[index].kind != kind) continue;
+      if (step[index].kind != kind) continue;
       ++fired_;
-      alerts.add(EventKind::alert, Alert{judged.rule.text, moment.time, std::nullopt});
+      step.add(EventKind::alert, Alert{judged.rule.text, step.now(), std::nullopt});
     }
   }
 }
 
-void RuleJudge::judgeKpi(Judged& judged, const KpiRule& rule, const KnownKpis& kpis, Step& alerts) {
-  const auto value = kpis.at(rule.kpi, alerts.now());
+void RuleJudge::judgeKpi(Judged& judged, const KpiRule& rule, const KnownKpis& kpis, Step& step) {
+  const auto value = kpis.at(rule.kpi, step.now());
   if (!value || !rule.compare(*value, rule.limit)) {
     judged.since.reset();
     judged.isTold = false;
     return;
   }
-  if (!judged.since) judged.since = alerts.now();
-  if (judged.isTold || static_cast<double>(alerts.now() - *judged.since) < rule.duration) return;
+  if (!judged.since) judged.since = step.now();
+  if (judged.isTold || static_cast<double>(step.now() - *judged.since) < rule.duration) return;
   judged.isTold = true;
   ++fired_;
-  alerts.add(EventKind::alert, Alert{judged.rule.text, *judged.since, value});
+  step.add(EventKind::alert, Alert{judged.rule.text, *judged.since, value});
 }
 
 void RuleJudge::forget() {

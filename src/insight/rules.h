@@ -47,9 +47,10 @@ struct RuleError {
 class RuleJudge {
  public:
   void setRules(std::vector<Rule> rules);
+  [[nodiscard]] bool empty() const { return rules_.empty(); }
 
-  /// `events` are those of the step; an alert is added for each rule that fires, in the order of the rules.
-  void judge(const KnownKpis& kpis, const Moment& moment, std::vector<TimelineEvent>& events);
+  /// Adds an alert to the step for each rule that fires, in the order of the rules.
+  void judge(const KnownKpis& kpis, Step& step);
   /// At a gap every rule starts anew.
   void forget();
 
@@ -65,7 +66,7 @@ class RuleJudge {
     bool isTold = false;
   };
 
-  void judgeKpi(Judged& judged, const KpiRule& rule, const KnownKpis& kpis, Step& alerts);
+  void judgeKpi(Judged& judged, const KpiRule& rule, const KnownKpis& kpis, Step& step);
 
   std::vector<Judged> rules_;
   std::uint64_t fired_ = 0;

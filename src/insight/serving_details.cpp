@@ -2,7 +2,7 @@
 
 namespace vesk::insight {
 
-std::optional<double> ServingDetails::leastLevel() const {
+OptionalNumber<double> ServingDetails::leastLevel() const {
   return broadcast_ ? std::optional(broadcast_->leastLevel) : std::nullopt;
 }
 

@@ -5,6 +5,7 @@
 
 #include "insight/mobility.h"
 #include "insight/report.h"
+#include "values/optional_number.h"
 
 namespace vesk::insight {
 
@@ -12,12 +13,12 @@ namespace vesk::insight {
 class ServingDetails {
  public:
   /// Of the downlink, MHz.
-  [[nodiscard]] const std::optional<double>& bandwidth() const { return bandwidth_; }
+  [[nodiscard]] const OptionalNumber<double>& bandwidth() const { return bandwidth_; }
   /// The level that a phone must receive to stay (QRxLevMin), dBm.
-  [[nodiscard]] std::optional<double> leastLevel() const;
-  [[nodiscard]] const std::optional<std::int64_t>& transmissionMode() const { return transmissionMode_; }
+  [[nodiscard]] OptionalNumber<double> leastLevel() const;
+  [[nodiscard]] const OptionalNumber<std::int64_t>& transmissionMode() const { return transmissionMode_; }
   /// Of the last measurement: during a change it may be another cell's.
-  [[nodiscard]] const std::optional<std::int64_t>& samplePci() const { return samplePci_; }
+  [[nodiscard]] const OptionalNumber<std::int64_t>& samplePci() const { return samplePci_; }
 
   /// `mobility` is as the report left it.
   void take(const Report& report, const Mobility& mobility, std::int64_t now);
@@ -30,10 +31,10 @@ class ServingDetails {
   };
 
   std::optional<CellIdentity> cell_;
-  std::optional<double> bandwidth_;
+  OptionalNumber<double> bandwidth_;
   std::optional<Broadcast> broadcast_;
-  std::optional<std::int64_t> transmissionMode_;
-  std::optional<std::int64_t> samplePci_;
+  OptionalNumber<std::int64_t> transmissionMode_;
+  OptionalNumber<std::int64_t> samplePci_;
 };
 
 }  // namespace vesk::insight

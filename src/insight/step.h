@@ -1,7 +1,7 @@
 #pragma once
 
+#include <cstddef>
 #include <utility>
-#include <vector>
 
 #include "insight/moment.h"
 #include "insight/timeline_event.h"
@@ -11,15 +11,29 @@ namespace vesk::insight {
 /// One metric event's step of the timeline: its moment, and what happened at it, in order.
 class Step {
  public:
-  Step(Moment moment, std::vector<TimelineEvent>& events) : moment_(moment), events_(events) {}
+  /// Adds what happens to `happened`, which belongs to nobody else while the step lasts.
+  Step(const Moment& moment, Happenings& happened) : moment_(moment), happened_(happened) {}
 
-  [[nodiscard]] const Moment& moment() const { return moment_; }
   [[nodiscard]] std::int64_t now() const { return moment_.time; }
-  void add(EventKind kind, EventFields fields) { events_.push_back({moment_, kind, std::move(fields)}); }
+  /// `fields` are those of the kind, one of EventFields.
+  template <class Fields>
+  void add(EventKind kind, Fields&& fields) {
+    happened_.emplace_back(moment_, kind, std::forward<Fields>(fields));
+    ++size_;
+  }
+
+  [[nodiscard]] std::size_t size() const { return size_; }
+  [[nodiscard]] bool empty() const { return size_ == 0; }
+  [[nodiscard]] const TimelineEvent& operator[](std::size_t index) const {
+    return happened_[happened_.size() - size_ + index];
+  }
+  [[nodiscard]] auto begin() const { return happened_.cend() - static_cast<std::ptrdiff_t>(size_); }
+  [[nodiscard]] auto end() const { return happened_.cend(); }
 
  private:
-  Moment moment_;
-  std::vector<TimelineEvent>& events_;
+  const Moment& moment_;
+  Happenings& happened_;
+  std::size_t size_ = 0;
 };
 
 }  // namespace vesk::insight

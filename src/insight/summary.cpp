@@ -11,6 +11,13 @@ constexpr std::array kKpisOfTime{Kpi::lteRsrp,         Kpi::lteRsrq,   Kpi::lteS
                                  Kpi::ltePucchTxPower, Kpi::umtsRscp,  Kpi::umtsEcNo, Kpi::umtsTxPower,
                                  Kpi::gsmRxLev,        Kpi::gsmTxPower};
 
+/// Under which of the KPI's times the value counts.
+std::uint8_t placeOfTime(const KpiDescription& kpi, double value) {
+  if (kpi.isTransmitPower) return value >= kHighTxPower ? 1 : 0;
+  const auto grade = gradeOf(*kpi.quantity, value);
+  return grade ? static_cast<std::uint8_t>(*grade) : 0;
+}
+
 }  // namespace
 
 void Summary::pass(std::int64_t passed, std::int64_t from, const Timeline& timeline) {
@@ -24,15 +31,8 @@ void Summary::pass(std::int64_t passed, std::int64_t from, const Timeline& timel
 }
 
 void Summary::passKpis(std::int64_t passed, std::int64_t from, const KnownKpis& known) {
-  for (const Kpi kpiOfTime : kKpisOfTime) {
-    const auto value = known.at(kpiOfTime, from);
-    if (!value) continue;
-    const KpiDescription& each = descriptionOf(kpiOfTime);
-    KpiSummary& kpi = kpis_[indexOf(each.kpi)];
-    kpi.known += passed;
-    if (each.isTransmitPower && *value >= kHighTxPower) kpi.high += passed;
-    if (const auto grade = gradeOf(*each.quantity, *value)) kpi.graded[static_cast<std::size_t>(*grade)] += passed;
-  }
+  for (const Kpi kpi : kKpisOfTime)
+    if (known.isKnown(kpi, from)) kpis_[indexOf(kpi)].times[timed_[indexOf(kpi)]] += passed;
 }
 
 void Summary::takeGap(const Gap& gap) {
@@ -40,13 +40,15 @@ void Summary::takeGap(const Gap& gap) {
   cells_.leave();
 }
 
-void Summary::take(const Report& report, const std::vector<TimelineEvent>& events, const Timeline& timeline) {
-  for (const TimelineEvent& event : events) {
-    count(event);
+void Summary::take(const Report& report, const Step& step, const Timeline& timeline) {
+  for (const TimelineEvent& event : step) {
+    ++kinds_[static_cast<std::size_t>(event.kind)];
     takeCellEvent(event);
   }
-  for (const auto& [kpi, value] : report.kpis)
+  for (const auto& [kpi, value] : report.kpis) {
     kpis_[indexOf(kpi)].values.add(value);
+    timed_[indexOf(kpi)] = placeOfTime(descriptionOf(kpi), value);
+  }
   const auto& serving = timeline.mobility().cell();
   if (!serving) return;
   if (report.servingCell) cells_.fillIn(serving->identity);

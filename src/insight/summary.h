@@ -2,6 +2,7 @@
 
 #include <array>
 #include <cstdint>
+#include <numeric>
 #include <optional>
 #include <vector>
 
@@ -25,12 +26,12 @@ struct EventCounts {
 /// What was measured of a KPI on the whole drive.
 struct KpiSummary {
   Histogram values;
-  /// Milliseconds for which it was known.
-  std::int64_t known = 0;
-  /// Of these, by grade.
-  std::array<std::int64_t, 4> graded{};
-  /// Of these, at high transmit power.
-  std::int64_t high = 0;
+  /// Milliseconds for which it was known: by the grade of its value, or, of transmit power, by whether that was high.
+  std::array<std::int64_t, 4> times{};
+
+  [[nodiscard]] std::int64_t known() const { return std::accumulate(times.begin(), times.end(), std::int64_t{}); }
+  [[nodiscard]] std::int64_t graded(Grade grade) const { return times[static_cast<std::size_t>(grade)]; }
+  [[nodiscard]] std::int64_t high() const { return times[1]; }
 };
 
 /// How the phone changed cells in a technology.
@@ -49,10 +50,8 @@ class Summary {
   /// Time that passed while `timeline` was as it is, up to the time `from`.
   void pass(std::int64_t passed, std::int64_t from, const Timeline& timeline);
   void takeGap(const Gap& gap);
-  /// A step: what was reported, and what happened; `timeline` is as it left it.
-  void take(const Report& report, const std::vector<TimelineEvent>& events, const Timeline& timeline);
-  /// Something happened that no report told: an alert.
-  void count(const TimelineEvent& event) { ++kinds_[static_cast<std::size_t>(event.kind)]; }
+  /// What was reported at a step, and what happened; `timeline` is as it left it.
+  void take(const Report& report, const Step& step, const Timeline& timeline);
 
   /// Without a technology: the time in which none was known.
   [[nodiscard]] std::int64_t time(const std::optional<Technology>& technology) const;
@@ -76,6 +75,8 @@ class Summary {
   std::array<std::int64_t, kTechnologies.size() + 1> times_{};
   VisitedCells cells_;
   std::array<KpiSummary, kKpiCount> kpis_;
+  /// Under which of its times a KPI's last value counts.
+  std::array<std::uint8_t, kKpiCount> timed_{};
   std::array<MobilityCounts, kTechnologies.size()> mobility_;
   std::int64_t carriersConfigured_ = 0;
   std::int64_t carriersActivated_ = 0;

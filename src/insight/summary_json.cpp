@@ -83,7 +83,7 @@ class SummaryWriter {
               fields.plainKey(each.name);
               object([&](JsonObject& grades) {
                 for (const Grade grade : {Grade::excellent, Grade::good, Grade::fair, Grade::poor})
-                  number(grades, nameOf(grade), kpi.graded[static_cast<std::size_t>(grade)]);
+                  number(grades, nameOf(grade), kpi.graded(grade));
               });
             });
   }
@@ -126,9 +126,9 @@ class SummaryWriter {
               fields.plainKey(each.name);
               object([&](JsonObject& power) {
                 writeField(json_, power, "max", std::optional(kpi.values.stats()->max));
-                number(power, "ms", kpi.known);
-                number(power, "ms_high", kpi.high);
-                share(power, "share", kpi.high, kpi.known);
+                number(power, "ms", kpi.known());
+                number(power, "ms_high", kpi.high());
+                share(power, "share", kpi.high(), kpi.known());
               });
             });
   }

@@ -157,7 +157,7 @@ class SummaryLines {
       for (const std::string& figure :
            {numberText(stats->min), oneDecimal(stats->mean), numberText(stats->median), numberText(stats->max)})
         line += right(figure, 8);
-      const auto graded = [&](Grade grade) { return percent(kpi.graded[static_cast<std::size_t>(grade)], kpi.known); };
+      const auto graded = [&](Grade grade) { return percent(kpi.graded(grade), kpi.known()); };
       add(line + right(graded(Grade::excellent), 12) + right(graded(Grade::good), 6) + right(graded(Grade::fair), 6) +
           right(graded(Grade::poor), 6));
     }
@@ -200,7 +200,7 @@ class SummaryLines {
       const auto stats = kpi.values.stats();
       if (!each.isTransmitPower || !stats) continue;
       powers.push_back(std::string(each.name) + " max " + numberText(stats->max) + " dBm, " +
-                       percent(kpi.high, kpi.known) + " high");
+                       percent(kpi.high(), kpi.known()) + " high");
     }
     addJoined(powers, "  ");
   }

@@ -30,11 +30,11 @@ std::string duration(std::int64_t milliseconds) {
 }
 
 /// ", -101 dBm"; empty for an unknown level.
-std::string levelText(const std::optional<double>& level) {
+std::string levelText(const OptionalNumber<double>& level) {
   return level ? ", " + numberText(*level) + " dBm" : "";
 }
 
-std::string part(std::string_view before, const std::optional<std::int64_t>& number, std::string_view unit) {
+std::string part(std::string_view before, const OptionalNumber<std::int64_t>& number, std::string_view unit) {
   return number ? std::string(before) + std::to_string(*number) + std::string(unit) : "";
 }
 
@@ -60,7 +60,7 @@ struct TextWriter {
 
   std::string operator()(const AreaChange& change) const {
     const std::string area(nameOf(change.area));
-    return area + " " + (change.from ? *change.from + " -> " : "") + change.to;
+    return area + " " + (change.from ? textOf(*change.from) + " -> " : "") + textOf(change.to);
   }
 
   std::string operator()(const RrcChange& change) const {
@@ -172,8 +172,8 @@ struct FieldWriter {
 
   void operator()(const AreaChange& change) {
     field("area", nameOf(change.area));
-    field("from", change.from);
-    field("to", std::string_view(change.to));
+    field("from", change.from ? std::optional(textOf(*change.from)) : std::nullopt);
+    field("to", std::string_view(textOf(change.to)));
   }
 
   void operator()(const RrcChange& change) {
@@ -210,7 +210,7 @@ struct FieldWriter {
     const auto code = causeCode(reject.cause.view());
     field("registration", nameOf(reject.registration));
     name("cause", reject.cause);
-    field("code", code ? std::optional<std::int64_t>(*code) : std::nullopt);
+    field("code", code ? OptionalNumber<std::int64_t>(*code) : std::nullopt);
     name("procedure", reject.procedure);
   }
 

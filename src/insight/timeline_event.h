@@ -3,9 +3,11 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <deque>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <variant>
 
 #include "insight/cell_identity.h"
@@ -14,6 +16,8 @@
 #include "insight/report.h"
 #include "insight/technology.h"
 #include "values/json_form.h"
+#include "values/optional_number.h"
+#include "values/recycled_memory.h"
 #include "values/text.h"
 
 /// What happened on a drive: the events of its timeline, as plain values. Times are milliseconds; names of enumeration
@@ -71,9 +75,9 @@ struct CellChange {
   std::optional<CellEntry> how;
   std::optional<CellIdentity> from;
   CellIdentity to;
-  std::optional<double> level;
+  OptionalNumber<double> level;
   /// How long the cell left had served.
-  std::optional<std::int64_t> stay;
+  OptionalNumber<std::int64_t> stay;
 };
 
 struct PingPong {
@@ -85,8 +89,8 @@ struct PingPong {
 
 struct AreaChange {
   Area area;
-  std::optional<std::string> from;
-  std::string to;
+  std::optional<AreaIdentity> from;
+  AreaIdentity to;
 };
 
 struct RrcChange {
@@ -94,17 +98,17 @@ struct RrcChange {
   std::optional<Text> from;
   Text to;
   std::optional<Text> cause;
-  std::optional<std::int64_t> duration;
+  OptionalNumber<std::int64_t> duration;
 };
 
 struct Reestablishment {
   Technology technology;
   std::optional<Text> cause;
-  std::optional<std::int64_t> duration;
+  OptionalNumber<std::int64_t> duration;
   std::optional<CellIdentity> from;
   std::optional<CellIdentity> to;
   /// Before it.
-  std::optional<double> level;
+  OptionalNumber<double> level;
 };
 
 /// A connection that failed to come about, or was lost.
@@ -112,7 +116,7 @@ struct ConnectionLoss {
   Technology technology;
   std::optional<Text> cause;
   std::optional<CellIdentity> cell;
-  std::optional<double> level;
+  OptionalNumber<double> level;
 };
 
 struct RegistrationChange {
@@ -130,15 +134,15 @@ struct Reject {
 struct ServiceChange {
   std::optional<Technology> technology;
   /// How long there was none; of EventKind::service only.
-  std::optional<std::int64_t> duration;
+  OptionalNumber<std::int64_t> duration;
 };
 
 struct CarrierChange {
   std::int64_t index;
-  std::optional<std::int64_t> channel;
-  std::optional<std::int64_t> code;
+  OptionalNumber<std::int64_t> channel;
+  OptionalNumber<std::int64_t> code;
   /// MHz.
-  std::optional<double> bandwidth;
+  OptionalNumber<double> bandwidth;
 };
 
 struct BearerChange {
@@ -159,7 +163,7 @@ struct Alert {
   /// From when on the rule has held.
   std::int64_t since;
   /// Of the KPI; absent for a rule of events.
-  std::optional<double> value;
+  OptionalNumber<double> value;
 };
 
 using EventFields =
@@ -170,7 +174,15 @@ struct TimelineEvent {
   Moment moment;
   EventKind kind;
   EventFields fields;
+
+  /// `told` is one of EventFields.
+  template <class Fields>
+  TimelineEvent(const Moment& when, EventKind what, Fields&& told)
+      : moment(when), kind(what), fields(std::forward<Fields>(told)) {}
 };
+
+/// Events in the order in which they happened.
+using Happenings = std::deque<TimelineEvent, RecyclingAllocator<TimelineEvent>>;
 
 /// What a person reads beside the kind.
 [[nodiscard]] std::string textOf(const TimelineEvent& event);

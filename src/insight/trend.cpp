@@ -4,11 +4,11 @@
 
 namespace vesk::insight {
 
-void Trend::take(const KpiReport& report, std::int64_t position, std::int64_t time) {
+void Trend::take(const KpiReport& report, const Moment& moment) {
   for (const auto& [kpi, value] : report) {
-    std::deque<TrendPoint>& points = points_[indexOf(kpi)];
-    if (points.empty() || position - points.back().position >= kWidth) {
-      points.push_back({position - position % kWidth, time, value, value, value, 1});
+    Points& points = points_[indexOf(kpi)];
+    if (points.empty() || moment.position - points.back().position >= kWidth) {
+      points.push_back({moment.position - moment.position % kWidth, moment.time, value, value, value, 1});
       if (points.size() > kMostPoints) points.pop_front();
       continue;
     }

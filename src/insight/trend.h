@@ -5,6 +5,8 @@
 #include <deque>
 
 #include "insight/kpis.h"
+#include "insight/moment.h"
+#include "values/recycled_memory.h"
 
 namespace vesk::insight {
 
@@ -25,15 +27,17 @@ struct TrendPoint {
 /// The course of every KPI over the last hour of a drive.
 class Trend {
  public:
-  void take(const KpiReport& report, std::int64_t position, std::int64_t time);
+  using Points = std::deque<TrendPoint, RecyclingAllocator<TrendPoint>>;
+
+  void take(const KpiReport& report, const Moment& moment);
   /// In the order of time.
-  [[nodiscard]] const std::deque<TrendPoint>& points(Kpi kpi) const { return points_[indexOf(kpi)]; }
+  [[nodiscard]] const Points& points(Kpi kpi) const { return points_[indexOf(kpi)]; }
 
  private:
   static constexpr std::int64_t kWidth = 1000;
   static constexpr std::size_t kMostPoints = 3600;
 
-  std::array<std::deque<TrendPoint>, kKpiCount> points_;
+  std::array<Points, kKpiCount> points_;
 };
 
 }  // namespace vesk::insight

@@ -143,7 +143,8 @@ void writeNow(JsonWriter& json, const insight::Insight& insight) {
     json.write(std::string_view(insight::textOf(cell.technology, cell.identity, true)));
   });
   insight::writeName(json, fields, "rrc", technology ? timeline.connections().state(*technology) : std::nullopt);
-  writeField(json, fields, "area", mobility.area(insight::Area::tracking));
+  const auto& area = mobility.area(insight::Area::tracking);
+  writeField(json, fields, "area", area ? std::optional(textOf(*area)) : std::nullopt);
   const insight::Registrations& registrations = timeline.registrations();
   insight::writeName(json, fields, "emm", registrations.status(insight::Registration::emm));
   insight::writeName(json, fields, "mm", registrations.status(insight::Registration::mm));

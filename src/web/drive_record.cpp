@@ -36,8 +36,7 @@ DriveRecord::DriveRecord(const RecordLimits& limits)
       serving_(limits.changes, limits.whole),
       marks_(kMarkCount, Thinned<MarkPoint>(limits.changes, limits.whole)) {}
 
-void DriveRecord::take(const insight::Insight& insight, const insight::Report& report,
-                       const std::vector<insight::TimelineEvent>& events) {
+void DriveRecord::take(const insight::Insight& insight, const insight::Report& report, const insight::Step& step) {
   hasTaken_ = true;
   const std::int64_t position = insight.clock().counted();
   if (insight.clock().stretches() != stretchCount_) {
@@ -47,7 +46,7 @@ void DriveRecord::take(const insight::Insight& insight, const insight::Report& r
   for (const auto& [kpi, value] : report.kpis)
     courses_[insight::indexOf(kpi)].add({position, position, value, position, value});
   takeServing(insight.timeline().mobility().cell(), position);
-  for (const insight::TimelineEvent& event : events)
+  for (const insight::TimelineEvent& event : step)
     takeEvent(event, position);
 }
 

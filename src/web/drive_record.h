@@ -76,8 +76,7 @@ class DriveRecord {
   explicit DriveRecord(const RecordLimits& limits);
 
   /// A step of the drive that `insight` follows, as its handler is told it.
-  void take(const insight::Insight& insight, const insight::Report& report,
-            const std::vector<insight::TimelineEvent>& events);
+  void take(const insight::Insight& insight, const insight::Report& report, const insight::Step& step);
   /// Lets go of all that happened; the cells keep their numbers.
   void clear();
   /// Nothing was taken since it was made or cleared.

@@ -105,10 +105,10 @@ void LiveServer::start(std::unique_ptr<HttpServer> server) {
   });
 }
 
-void LiveServer::take(const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
+void LiveServer::take(const insight::Report& report, const insight::Step& step) {
   lastEvent_ = RunLoop::main().clock().now();
-  whole_.take(sources_.insight, report, events);
-  news_.take(sources_.insight, report, events);
+  whole_.take(sources_.insight, report, step);
+  news_.take(sources_.insight, report, step);
 }
 
 std::string LiveServer::driveMessage(std::string_view event, const DriveRecord& record, AppendDrive append) const {
@@ -207,7 +207,7 @@ Response LiveServer::cells(const Request& /*request*/) {
 Response LiveServer::timeline(const Request& /*request*/) {
   return jsonResponse([&](JsonWriter& json) {
     writeJsonArray(json, sources_.insight.happenings(),
-                   [&](const insight::Happening& each) { writeJson(json, each.event); });
+                   [&](const insight::TimelineEvent& each) { writeJson(json, each); });
   });
 }
 

@@ -40,7 +40,7 @@ class LiveServer {
   ~LiveServer();
 
   /// A step of the drive, as the handler of the insight is told it.
-  void take(const insight::Report& report, const std::vector<insight::TimelineEvent>& events);
+  void take(const insight::Report& report, const insight::Step& step);
   [[nodiscard]] std::uint16_t port() const { return server_->port(); }
 
   /// Answers a request as a visitor's; for tests too.

@@ -221,9 +221,8 @@ class Drive {
     OutputLines::setSink(nullptr);
     insight.setRules(std::move(rules));
     insight.observeEventsOf(*intake_);
-    insight.setStepHandler([this](const Report&, const std::vector<TimelineEvent>& happened) {
-      timeline.insert(timeline.end(), happened.begin(), happened.end());
-    });
+    insight.setStepHandler(
+        [this](const Report&, const Step& step) { timeline.insert(timeline.end(), step.begin(), step.end()); });
     play(events);
   }
   ~Drive() { intake_->setEventObserver(nullptr); }

@@ -43,6 +43,11 @@ TEST(CellsHeard, HaveRolesAgesAndDifferences) {
             lteNeighbors(30'001, {{5815, 338, -90}}), lteLevel(30'002, -99.0)},
            R"([{"technology":"LTE","channel":5815,"code":328,"role":"serving","level":-99,"quality":-10,"difference":0,"age_ms":0,"served_ms_ago":0},)"
            R"({"technology":"LTE","channel":5815,"code":338,"role":"neighbour","level":-90,"quality":null,"difference":9,"age_ms":1,"served_ms_ago":29802}])"},
+          {"one forgotten is another when it is heard again",
+           {lteCell(0, 5815, 338), lteLevel(100, -96), lteCell(200, 5815, 328), lteLevel(30'000, -99),
+            lteNeighbors(32'000, {{5815, 338, -90}})},
+           R"([{"technology":"LTE","channel":5815,"code":328,"role":"serving","level":-99,"quality":-10,"difference":0,"age_ms":2000,"served_ms_ago":0},)"
+           R"({"technology":"LTE","channel":5815,"code":338,"role":"neighbour","level":-90,"quality":null,"difference":9,"age_ms":0,"served_ms_ago":null}])"},
           {"cell info renews the time only; nothing is compared across technologies",
            {umtsCell(0, 10637, 1), umtsLevel(10, -70, 43), umtsCell(500, 10637, 1),
             lteNeighbors(500, {{5815, 5, -99}})},
@@ -67,7 +72,7 @@ TEST(Series, HasARowForEachReportWithAllThatIsKnown) {
   Drive drive;
   std::string rows = seriesHeader() + "\n";
   std::string lines;
-  drive.insight.setStepHandler([&](const Report& report, const std::vector<TimelineEvent>&) {
+  drive.insight.setStepHandler([&](const Report& report, const Step&) {
     if (report.kpis.empty()) return;
     appendSeriesRow(rows, drive.insight);
     rows += '\n';

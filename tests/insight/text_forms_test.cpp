@@ -58,8 +58,9 @@ TEST(EnumerationNames, LoseTheirPrefix) {
 }
 
 TEST(Plmn, ComesFromNumbersOrThreeBytes) {
-  const auto ofNumbers = [](Value mcc, Value mnc, std::optional<Value> digits) {
-    return plmnText(&mcc, &mnc, digits ? &*digits : nullptr);
+  const auto text = [](const std::optional<Plmn>& plmn) { return plmn ? std::optional(textOf(*plmn)) : std::nullopt; };
+  const auto ofNumbers = [&](Value mcc, Value mnc, std::optional<Value> digits) {
+    return text(plmnOf(&mcc, &mnc, digits ? &*digits : nullptr));
   };
   EXPECT_EQ(ofNumbers(608, 3, std::nullopt), "608-03");
   EXPECT_EQ(ofNumbers(310, 410, 2), "310-410");
@@ -68,12 +69,12 @@ TEST(Plmn, ComesFromNumbersOrThreeBytes) {
   EXPECT_FALSE(ofNumbers(999, 1000, 3));
   EXPECT_FALSE(ofNumbers(true, 1, 2));
 
-  for (const auto& [bytes, text] : {std::pair{Bytes{0x64, 0xF0, 0x00}, std::optional<std::string>("460-00")},
-                                    {{0x13, 0x00, 0x14}, "310-410"},
-                                    {{0x64, 0xF0}, std::nullopt},
-                                    {{0xF4, 0xF0, 0x00}, std::nullopt},
-                                    {{0x64, 0xA0, 0x00}, std::nullopt}})
-    EXPECT_EQ(plmnText(bytes), text);
+  for (const auto& [bytes, expected] : {std::pair{Bytes{0x64, 0xF0, 0x00}, std::optional<std::string>("460-00")},
+                                        {{0x13, 0x00, 0x14}, "310-410"},
+                                        {{0x64, 0xF0}, std::nullopt},
+                                        {{0xF4, 0xF0, 0x00}, std::nullopt},
+                                        {{0x64, 0xA0, 0x00}, std::nullopt}})
+    EXPECT_EQ(text(plmnOf(bytes)), expected);
 }
 
 }  // namespace

@@ -310,7 +310,7 @@ TEST(TrendGraph, UsesTheSignsThatTheTerminalHas) {
 }
 
 TEST(TrendGraph, ShowsAValueWhileItIsFreshAndNotBeyondABreak) {
-  const std::deque<TrendPoint> points{{1000, 0, -90, -80, -170, 2}, {4000, 0, -100, -100, -100, 1}};
+  const Trend::Points points{{1000, 0, -90, -80, -170, 2}, {4000, 0, -100, -100, -100, 1}};
   const auto shown = [&](std::int64_t step, const std::vector<std::int64_t>& breaks) {
     std::string out;
     for (const auto& slot : slotValues(points, {0, step, 18}, breaks))

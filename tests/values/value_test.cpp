@@ -5,6 +5,9 @@
 #include <string>
 #include <vector>
 
+#include "values/optional_number.h"
+#include "values/ordered_lookup.h"
+
 namespace vesk {
 namespace {
 
@@ -64,6 +67,34 @@ TEST(Dictionary, KeepsTheOrderInWhichKeysCame) {
   EXPECT_FALSE(dictionary.contains("a"));
   EXPECT_EQ(dictionary, (Dictionary{{"c"_text, 3}, {"b"_text, 4}}));
   EXPECT_NE(dictionary, (Dictionary{{"c"_text, 3}, {"d"_text, 4}}));
+}
+
+TEST(Dictionary, IsLookedUpInAnyOrderByAnyKindOfKey) {
+  const Dictionary dictionary{{"a"_text, 1}, {Text::copy("b"), 2}, {"c"_text, 3}, {"d"_text, 4}};
+  OrderedLookup lookup(dictionary);
+  for (const auto& [key, value] : {std::pair{"a"_text, 1},
+                                   {"c"_text, 3},
+                                   {"b"_text, 2},
+                                   {Text::copy("d"), 4},
+                                   {"a"_text, 1},
+                                   {Text::copy("b"), 2}}) {
+    EXPECT_EQ(lookup.find("missing"_text), nullptr);
+    ASSERT_NE(lookup.find(key), nullptr) << key.view();
+    EXPECT_EQ(*dictionary.find(key), Value(value));
+    EXPECT_EQ(*OrderedLookup(dictionary).find(key), Value(value));
+  }
+  EXPECT_EQ(OrderedLookup(Dictionary()).find("a"_text), nullptr);
+}
+
+TEST(OptionalNumber, IsLikeTheStandardOne) {
+  const OptionalNumber<double> none;
+  const OptionalNumber<double> zero(0.0);
+  EXPECT_FALSE(none || !zero);
+  EXPECT_TRUE(none == std::nullopt && none < zero && none != zero && zero > OptionalNumber(-1e300));
+  EXPECT_EQ(std::optional<double>(none), std::nullopt);
+  EXPECT_EQ(OptionalNumber(std::optional(7.5)), 7.5);
+  EXPECT_EQ(OptionalNumber<std::int64_t>(std::nullopt).value_or(3), 3);
+  EXPECT_LT(OptionalNumber<std::int64_t>(), OptionalNumber<std::int64_t>(INT64_MIN + 1));
 }
 
 TEST(Dictionary, ACopyIsUntouchedByChangesToTheOther) {

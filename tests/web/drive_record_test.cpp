@@ -18,9 +18,8 @@ class RecordedDrive {
  public:
   explicit RecordedDrive(const std::vector<DriveEvent>& events, const RecordLimits& limits = kWholeDrive)
       : record(limits) {
-    drive.insight.setStepHandler([this](const insight::Report& report, const std::vector<TimelineEvent>& happened) {
-      record.take(drive.insight, report, happened);
-    });
+    drive.insight.setStepHandler(
+        [this](const insight::Report& report, const Step& step) { record.take(drive.insight, report, step); });
     drive.play(events);
   }
 

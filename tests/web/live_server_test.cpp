@@ -21,9 +21,8 @@ class LiveServerTest : public testing::Test {
     std::string reason;
     server_ = LiveServer::open({.address = "127.0.0.1", .port = 0},
                                {drive_.insight, interface_.layout(), {}, [this] { return state_; }}, reason);
-    drive_.insight.setStepHandler([this](const insight::Report& report, const std::vector<TimelineEvent>& happened) {
-      server_->take(report, happened);
-    });
+    drive_.insight.setStepHandler(
+        [this](const insight::Report& report, const Step& step) { server_->take(report, step); });
     drive_.play({lteCell(0, 850, 443), lteLevel(500, -125, -20), bearersWithName(600)});
   }
 

@@ -41,8 +41,8 @@ Outcome runTimeline(const TimelineOptions& options) {
   DataOutput output;
   insight::Insight insight;
   insight.setRules(*std::move(rules));
-  insight.setStepHandler([&](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
-    for (const insight::TimelineEvent& event : events)
+  insight.setStepHandler([&](const insight::Report& /*report*/, const insight::Step& step) {
+    for (const insight::TimelineEvent& event : step)
       output.writeLine(options.asJson ? jsonOf(event) : visibleLineOf(event));
   });
   return watchDrive(options.input, insight, output);
@@ -53,7 +53,7 @@ Outcome runSeries(const RecordingInput& input, bool asCsv) {
   insight::Insight insight;
   std::string line;
   if (asCsv) output.writeLine(insight::seriesHeader());
-  insight.setStepHandler([&](const insight::Report& report, const std::vector<insight::TimelineEvent>& /*events*/) {
+  insight.setStepHandler([&](const insight::Report& report, const insight::Step& /*step*/) {
     if (report.kpis.empty()) return;
     line.clear();
     if (asCsv) {

@@ -29,9 +29,8 @@ Outcome runReport(const ReportOptions& options) {
   DataOutput unused;
   insight::Insight insight;
   web::DriveRecord record(web::kWholeDrive);
-  insight.setStepHandler([&](const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
-    record.take(insight, report, events);
-  });
+  insight.setStepHandler(
+      [&](const insight::Report& report, const insight::Step& step) { record.take(insight, report, step); });
   const Outcome outcome = watchDrive(options.input, insight, unused, [&] {
     page.begin();
     web::writeReport({titleOf(options.input), record, insight, veskInterface(), readingOfRow},

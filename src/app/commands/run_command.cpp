@@ -104,11 +104,10 @@ class Run {
 
   /// Those that fire are told among the diagnostic lines, and on the screens.
   void judgeRules() {
-    insight_.setStepHandler(
-        [this](const insight::Report& /*report*/, const std::vector<insight::TimelineEvent>& events) {
-          for (const insight::TimelineEvent& event : events)
-            if (event.kind == insight::EventKind::alert) tellAlert(textOf(event));
-        });
+    insight_.setStepHandler([this](const insight::Report& /*report*/, const insight::Step& step) {
+      for (const insight::TimelineEvent& event : step)
+        if (event.kind == insight::EventKind::alert) tellAlert(textOf(event));
+    });
   }
 
   void tellAlert(const std::string& alert) {
@@ -173,7 +172,7 @@ class Run {
         .changeSpeed = [this](int step) { changeSpeed(step); },
         .jump = [this](std::chrono::seconds distance) { control_.jump(distance); },
         .drive = &insight_,
-        .goToEvent = [this](const insight::TimelineEvent& event) { control_.goTo(event); },
+        .goToEvent = [this](const insight::TimelineEvent& event) { control_.goTo(event.moment); },
         .diagnostics = &diagnostics_,
         .setTracking =
             [this](bool isTracking) { loop_.setMode(isTracking ? RunLoopMode::tracking : RunLoopMode::defaultMode); },

@@ -75,9 +75,9 @@ class Serving {
                               reason);
     if (page == nullptr) return fail("vesk: " + reason);
     tellPlace(page->port());
-    insight_.setStepHandler([&](const insight::Report& report, const std::vector<insight::TimelineEvent>& events) {
+    insight_.setStepHandler([&](const insight::Report& report, const insight::Step& step) {
       time_.take(insight_.clock().now(), clock_.now());
-      page->take(report, events);
+      page->take(report, step);
     });
     insight_.observeEventsOf(*MetricValidator::shared());
     // What is known grows old while no event comes, too.

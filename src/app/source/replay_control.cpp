@@ -45,9 +45,9 @@ void ReplayControl::jump(std::chrono::seconds distance) {
   if (player != nullptr) player->seek(player->state().position + static_cast<double>(distance.count()));
 }
 
-void ReplayControl::goTo(const insight::TimelineEvent& event) {
+void ReplayControl::goTo(const insight::Moment& moment) {
   corvik::Player* player = seekable();
-  if (player != nullptr) player->seekToEvent(event.moment.event + 1);
+  if (player != nullptr) player->seekToEvent(moment.event + 1);
 }
 
 }  // namespace vesk

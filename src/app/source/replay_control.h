@@ -6,7 +6,7 @@
 #include <string>
 
 #include "corvik/player.h"
-#include "insight/timeline_event.h"
+#include "insight/moment.h"
 
 namespace vesk {
 
@@ -24,8 +24,8 @@ class ReplayControl {
   /// One step faster for +1, slower for -1.
   void changeSpeed(int step);
   void jump(std::chrono::seconds distance);
-  /// To the moment at which `event` had just happened.
-  void goTo(const insight::TimelineEvent& event);
+  /// To the moment at which its metric event had just come.
+  void goTo(const insight::Moment& moment);
 
  private:
   /// Null, and refused, where there is no way back.

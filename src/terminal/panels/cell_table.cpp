@@ -145,10 +145,10 @@ CellNotes::CellNotes(const insight::Present& drive, const std::vector<HeardCell>
   const std::int64_t now = drive.now().value_or(0);
   const auto& happenings = drive.happenings();
   for (std::size_t index = happenings.size(); index-- > 0;) {
-    const insight::Happening& each = happenings[index];
-    const std::int64_t ago = now - each.event.moment.time;
+    const insight::TimelineEvent& each = happenings[index];
+    const std::int64_t ago = now - each.moment.time;
     if (ago > kRemembered) break;
-    const auto* entry = std::get_if<insight::Reestablishment>(&each.event.fields);
+    const auto* entry = std::get_if<insight::Reestablishment>(&each.fields);
     if (entry != nullptr && entry->to)
       reestablished_.push_back({{entry->technology, entry->to->channel, entry->to->code}, ago});
   }

@@ -33,7 +33,7 @@ auto firstSince(const insight::Present& drive, std::int64_t start) {
   const auto& happenings = drive.happenings();
   return std::lower_bound(
       happenings.begin(), happenings.end(), start,
-      [](const insight::Happening& each, std::int64_t position) { return each.position < position; });
+      [](const insight::TimelineEvent& each, std::int64_t position) { return each.moment.position < position; });
 }
 
 }  // namespace
@@ -66,8 +66,8 @@ void drawMarks(const Canvas& canvas, int column, int line, const insight::Presen
                int slotsPerColumn) {
   std::vector<const EventMark*> marks(static_cast<std::size_t>(span.slots / slotsPerColumn), nullptr);
   for (auto each = firstSince(drive, span.start); each != drive.happenings().end(); ++each) {
-    const auto slot = span.slotOf(each->position);
-    const EventMark* mark = markOf(each->event);
+    const auto slot = span.slotOf(each->moment.position);
+    const EventMark* mark = markOf(*each);
     if (!slot || mark == nullptr) continue;
     const EventMark*& place = marks[static_cast<std::size_t>(*slot / slotsPerColumn)];
     if (place == nullptr || mark < place) place = mark;
@@ -80,14 +80,14 @@ void drawMarks(const Canvas& canvas, int column, int line, const insight::Presen
 std::vector<std::int64_t> breaksOf(const insight::Present& drive) {
   std::vector<std::int64_t> breaks;
   for (const auto& each : drive.happenings())
-    if (each.event.kind == EventKind::gap || each.event.kind == EventKind::technology) breaks.push_back(each.position);
+    if (each.kind == EventKind::gap || each.kind == EventKind::technology) breaks.push_back(each.moment.position);
   return breaks;
 }
 
 std::size_t countSince(const insight::Present& drive, const EventMark& mark, std::int64_t start) {
   return static_cast<std::size_t>(
       std::count_if(firstSince(drive, start), drive.happenings().end(),
-                    [&](const insight::Happening& each) { return markOf(each.event) == &mark; }));
+                    [&](const insight::TimelineEvent& each) { return markOf(each) == &mark; }));
 }
 
 }  // namespace vesk

@@ -138,7 +138,7 @@ void OverviewPanel::drawHappenings(const Canvas& canvas) {
   const auto& happenings = drive_.present().happenings();
   shownEvents_.clear();
   for (std::size_t index = happenings.size(); index-- > 0 && static_cast<int>(shownEvents_.size()) < canvas.lines();) {
-    const insight::TimelineEvent& event = happenings[index].event;
+    const insight::TimelineEvent& event = happenings[index];
     if (!isNotable(event.kind)) continue;
     drawEventRow(canvas, static_cast<int>(shownEvents_.size()), event, false);
     shownEvents_.push_back(drive_.present().happenedBefore() + index);

@@ -39,7 +39,7 @@ std::string identityText(const insight::Present& drive, Technology technology) {
     if (cellId) add(siteText(technology, *cellId));
   }
   const insight::Area area = technology == Technology::lte ? insight::Area::tracking : insight::Area::location;
-  if (const auto& identity = mobility.area(area)) add(std::string(nameOf(area)) + " " + *identity);
+  if (const auto& identity = mobility.area(area)) add(std::string(nameOf(area)) + " " + textOf(*identity));
   return out;
 }
 

@@ -19,7 +19,7 @@ std::span<const Action> TimelinePanel::hints() const {
 }
 
 const insight::TimelineEvent& TimelinePanel::eventOf(std::uint64_t number) const {
-  return drive_.present().happenings()[number - oldest_].event;
+  return drive_.present().happenings()[number - oldest_];
 }
 
 bool TimelinePanel::passesFilter(const insight::TimelineEvent& event) const {

@@ -9,7 +9,7 @@ namespace {
 /// For how long a value is shown on where nothing newer was reported, milliseconds.
 constexpr std::int64_t kFresh = 10'000;
 
-auto firstFrom(const std::deque<insight::TrendPoint>& points, std::int64_t position) {
+auto firstFrom(const insight::Trend::Points& points, std::int64_t position) {
   return std::lower_bound(points.begin(), points.end(), position,
                           [](const insight::TrendPoint& point, std::int64_t start) { return point.position < start; });
 }
@@ -32,7 +32,7 @@ void TrendValues::add(const insight::TrendPoint& point) {
   count += point.count;
 }
 
-std::vector<std::optional<TrendValues>> slotValues(const std::deque<insight::TrendPoint>& points, const TrendSpan& span,
+std::vector<std::optional<TrendValues>> slotValues(const insight::Trend::Points& points, const TrendSpan& span,
                                                    const std::vector<std::int64_t>& breaks) {
   std::vector<std::optional<TrendValues>> slots(static_cast<std::size_t>(span.slots));
   for (auto point = firstFrom(points, span.start - kFresh); point != points.end(); ++point) {
@@ -55,7 +55,7 @@ std::vector<std::optional<TrendValues>> slotValues(const std::deque<insight::Tre
   return slots;
 }
 
-std::optional<TrendValues> valuesSince(const std::deque<insight::TrendPoint>& points, std::int64_t start) {
+std::optional<TrendValues> valuesSince(const insight::Trend::Points& points, std::int64_t start) {
   std::optional<TrendValues> values;
   for (auto point = firstFrom(points, start); point != points.end(); ++point) {
     if (!values) values = TrendValues{};

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstdint>
-#include <deque>
 #include <optional>
 #include <vector>
 
@@ -36,11 +35,11 @@ struct TrendValues {
 
 /// Of each slot. One without a report shows the last value for as long as that is fresh, but not beyond a position in
 /// `breaks`, which are in order: there values are forgotten.
-[[nodiscard]] std::vector<std::optional<TrendValues>> slotValues(const std::deque<insight::TrendPoint>& points,
+[[nodiscard]] std::vector<std::optional<TrendValues>> slotValues(const insight::Trend::Points& points,
                                                                  const TrendSpan& span,
                                                                  const std::vector<std::int64_t>& breaks);
 
 /// Of all that was reported from `start` on; absent when nothing was.
-[[nodiscard]] std::optional<TrendValues> valuesSince(const std::deque<insight::TrendPoint>& points, std::int64_t start);
+[[nodiscard]] std::optional<TrendValues> valuesSince(const insight::Trend::Points& points, std::int64_t start);
 
 }  // namespace vesk
