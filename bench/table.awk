@@ -54,38 +54,35 @@ function finish_heading(row, quantity,    i) {
   print_cells()
 }
 
-function add_row(row, quantity, what, goal,    i, value, ratio, ratios, worst_value, worst_ratio) {
+function add_row(row, quantity, what, goal,    i, value, ratio, ratios, is_met) {
   if (first == "") finish_heading(row, quantity)
   if (!((row, quantity) in counts)) return
   split("", cell)
   cell[1] = (markdown ? "" : "  ") what
+  is_met = 1
   for (i = 1; i <= figures; ++i) {
     if (!((row, quantity, events[i]) in figure)) continue
     value = figure[row, quantity, events[i]]
     cell[1 + i] = rounded(value)
-    if (value > worst_value) worst_value = value
     if ((row, "MB/s", events[i]) in figure) cell[2 + kFigures] = rounded(figure[row, "MB/s", events[i]])
     ratio = figure[first, quantity, events[i]] / value
-    if (ratio > worst_ratio) worst_ratio = ratio
+    is_met = is_met && meets(goal, quantity, events[i], value, ratio)
     ratios = ratios (ratios == "" ? "" : " ") sprintf(ratio < 0.2 ? "%.3f" : "%.2f", ratio)
   }
   if (quantity == "ns") {
     if (row in instructions) cell[3 + kFigures] = sprintf("%.0f", instructions[row])
     if (row != first) cell[4 + kFigures] = ratios
   }
-  if (goal != "") cell[kColumns] = goal_and_verdict(goal, worst_value, worst_ratio)
+  sub(/^ratio /, "", goal)
+  if (goal != "") cell[kColumns] = "<= " goal (is_met ? ": met" : ": missed")
   print_cells()
 }
 
-function goal_and_verdict(goal, value, ratio,    word, words, is_met) {
+# N, "ratio N", or "N or ROW + M", where ROW has a figure for the same number of events.
+function meets(goal, quantity, count, value, ratio,    word, words) {
   words = split(goal, word, " ")
-  if (word[1] == "ratio") {
-    is_met = ratio <= word[2]
-    goal = word[2]
-  } else {
-    is_met = value <= word[1] || (words == 5 && value <= figure[word[3], "ms", 0] + word[5])
-  }
-  return "<= " goal (is_met ? ": met" : ": missed")
+  if (word[1] == "ratio") return ratio <= word[2]
+  return value <= word[1] || (words == 5 && value <= figure[word[3], quantity, count] + word[5])
 }
 
 function rounded(value) {
