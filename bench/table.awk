@@ -82,7 +82,8 @@ function add_row(row, quantity, what, goal,    i, value, ratio, ratios, is_met) 
 function meets(goal, quantity, count, value, ratio,    word, words) {
   words = split(goal, word, " ")
   if (word[1] == "ratio") return ratio <= word[2]
-  return value <= word[1] || (words == 5 && value <= figure[word[3], quantity, count] + word[5])
+  if (value <= word[1]) return 1
+  return words == 5 && (word[3], quantity, count) in figure && value <= figure[word[3], quantity, count] + word[5]
 }
 
 function rounded(value) {

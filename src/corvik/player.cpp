@@ -118,7 +118,7 @@ Player::Step Player::next(const std::stop_token& stop) {
         if (countBadLine()) return std::move(*bad);
         continue;
       } else {
-        if (endsSeek()) return SeekEnded{};
+        if (endsSeek()) return SeekEnded{sinceLastEvent_};
         auto* failure = std::get_if<vesk::ReadFailure>(&step);
         if (failure == nullptr && startAgain()) continue;
         setPhase(PlaybackState::Phase::ended);
@@ -130,7 +130,7 @@ Player::Step Player::next(const std::stop_token& stop) {
       case Turn::event:
         return *std::exchange(pending_, std::nullopt);
       case Turn::arrival:
-        return SeekEnded{};
+        return SeekEnded{sinceLastEvent_};
       case Turn::somethingElse:
         if (stop.stop_requested()) return vesk::EndOfRecording{};
         break;
@@ -179,9 +179,7 @@ Player::Turn Player::waitForTurn(double at, const std::stop_token& stop) {
         countEvent(at);
         return Turn::event;
       }
-      restartTime(std::isfinite(target_->at) ? target_->at : state_.position);
-      target_.reset();
-      state_.isSeeking = false;
+      arrive(std::isfinite(target_->at) ? target_->at : state_.position);
       return Turn::arrival;
     }
     if (state_.isHeld) {
@@ -230,10 +228,15 @@ std::optional<SeekBegun> Player::beginSeek() {
 bool Player::endsSeek() {
   const std::lock_guard lock(stateLock_);
   if (!target_ || (loops_ && !std::isfinite(target_->at))) return false;
-  restartTime(state_.position);
+  arrive(state_.position);
+  return true;
+}
+
+void Player::arrive(double position) {
+  restartTime(position);
   target_.reset();
   state_.isSeeking = false;
-  return true;
+  sinceLastEvent_ = std::max(position - lastEventAt_, 0.0);
 }
 
 void Player::countEvent(double at) {
@@ -241,6 +244,7 @@ void Player::countEvent(double at) {
   next_.reset();
   state_.shortenedPause.reset();
   state_.position = at;
+  lastEventAt_ = at;
   // A recording may have grown since its end was looked at.
   if (state_.duration) state_.duration = std::max(*state_.duration, at);
   ++state_.events;

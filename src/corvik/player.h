@@ -59,7 +59,10 @@ struct SeekBegun {
 };
 
 /// Everything up to the position has been played, and nothing behind it.
-struct SeekEnded {};
+struct SeekEnded {
+  /// How far behind the last of these events the position lies: seconds.
+  double sinceLastEvent;
+};
 
 /// Takes events from a recording, each when its time has come. One thread at a time plays; any thread may ask how far
 /// it is, and steer it.
@@ -128,6 +131,8 @@ class Player {
 
   // With stateLock_ held.
   [[nodiscard]] double position() const;
+  /// The position that was sought is reached.
+  void arrive(double position);
   /// Lets the time go on from a position.
   void restartTime(double position);
   void countEvent(double at);
@@ -138,6 +143,10 @@ class Player {
   bool keepsPauses_;
   /// Read, and not played yet.
   std::optional<vesk::RecordedEvent> pending_;
+  /// Seconds: "at" of the last event played.
+  double lastEventAt_ = 0;
+  /// As of SeekEnded.
+  double sinceLastEvent_ = 0;
   std::size_t eventsOfLap_ = 0;
   std::size_t badLinesOfLap_ = 0;
   const std::stop_token* stop_ = nullptr;

@@ -89,8 +89,8 @@ bool RecordedService::playNext(const std::stop_token& stop, EventStream& events)
       events.afterDelivery([tell = onSeekBegun_, isFromStart = begun->isFromStart] { tell(isFromStart); });
     return true;
   }
-  if (std::holds_alternative<SeekEnded>(step)) {
-    if (onSeekEnded_) events.afterDelivery([tell = onSeekEnded_] { tell(); });
+  if (const auto* ended = std::get_if<SeekEnded>(&step)) {
+    if (onSeekEnded_) events.afterDelivery([tell = onSeekEnded_, since = ended->sinceLastEvent] { tell(since); });
     return true;
   }
   std::optional<std::string> failure;

@@ -36,7 +36,7 @@ class RecordedService final : public Service {
   using EndHandler = std::function<void(const std::optional<std::string>& failure)>;
   /// Behind everything that was played before, and in front of what is played after.
   using SeekBegunHandler = std::function<void(bool isFromStart)>;
-  using SeekEndedHandler = std::function<void()>;
+  using SeekEndedHandler = std::function<void(double sinceLastEvent)>;
 
   /// `clock` must outlive the service.
   RecordedService(std::unique_ptr<vesk::TimedEvents> recording, const vesk::Clock& clock, Playback playback,

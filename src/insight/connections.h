@@ -61,7 +61,7 @@ class Connections {
     OptionalNumber<double> level{};
   };
 
-  /// All of it is unknown while the state is.
+  /// While the state is unknown so is the rest; forget() relies on that.
   struct Connection {
     std::optional<Text> state;
     std::int64_t since = 0;

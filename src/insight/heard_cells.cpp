@@ -16,7 +16,7 @@ std::optional<HeardKey> keyOf(const std::optional<ServingCell>& cell) {
   return HeardKey{cell->technology, cell->identity.channel, cell->identity.code};
 }
 
-/// Another cell has nearly always another one.
+/// Two cells seldom share one: whoever finds it compares the keys, too.
 std::uint64_t digestOf(const HeardKey& key) {
   const auto channel = static_cast<std::uint64_t>(key.channel.value_or(-1)) + 1;
   const auto code = static_cast<std::uint64_t>(key.code.value_or(-1)) + 1;
@@ -36,9 +36,9 @@ std::string_view nameOf(HeardRole role) {
 }
 
 void HeardCells::take(const Report& report, const Timeline& timeline, std::int64_t now) {
-  // Only now and then, for all rows are gone through; until then find() may come upon an old one.
-  constexpr std::int64_t kTidied = 5000;
-  if (now - tidiedAt_ >= kTidied) dropOld(now);
+  // Dropping goes through all rows, so it is done only now and then; until then find() may come upon an old row.
+  constexpr std::int64_t kTidyInterval = 5000;
+  if (now - tidiedAt_ >= kTidyInterval) dropOld(now);
   const std::optional<HeardKey> serving = keyOf(timeline.mobility().cell());
   if (serving != serving_) {
     if (Row* left = serving_ ? find(*serving_) : nullptr) left->servedUntil = now;
@@ -110,17 +110,15 @@ HeardCells::Row* HeardCells::find(const HeardKey& key) {
 HeardCells::Row* HeardCells::findOrAdd(const HeardKey& key, const OptionalNumber<double>& level, std::int64_t now) {
   Row* row = find(key);
   if (row != nullptr && !isOld(*row, now)) return row;
+  if (row != nullptr || rows_.size() == kMostCells) dropOld(now);
   const Row heard{key, std::nullopt, std::nullopt, now, std::nullopt};
-  if (row == nullptr) {
-    if (rows_.size() == kMostCells) dropOld(now);
-    if (rows_.size() < kMostCells) {
-      digests_.push_back(digestOf(key));
-      return &rows_.emplace_back(heard);
-    }
-    row = weakest();
-    if (strengthOf(row->level) >= strengthOf(level)) return nullptr;
-    digests_[static_cast<std::size_t>(row - rows_.data())] = digestOf(key);
+  if (rows_.size() < kMostCells) {
+    digests_.push_back(digestOf(key));
+    return &rows_.emplace_back(heard);
   }
+  row = weakest();
+  if (strengthOf(row->level) >= strengthOf(level)) return nullptr;
+  digests_[static_cast<std::size_t>(row - rows_.data())] = digestOf(key);
   *row = heard;
   return row;
 }

@@ -76,17 +76,17 @@ class HeardCells {
   void dropOld(std::int64_t now);
   void takeServing(const Report& report, const Timeline& timeline, std::int64_t now);
   void takeNeighbors(std::span<const NeighborReport> neighbors, std::int64_t now);
-  /// Also one that is old; null when there is none.
+  /// The row of the key, which may be old; null when there is none.
   [[nodiscard]] Row* find(const HeardKey& key);
   /// The row, a new one when there is none; null when there is no room for one of that level.
   [[nodiscard]] Row* findOrAdd(const HeardKey& key, const OptionalNumber<double>& level, std::int64_t now);
-  /// Of those that do not serve.
+  /// The serving cell's comes last.
   [[nodiscard]] Row* weakest();
   void hear(const HeardKey& key, const OptionalNumber<double>& level, const OptionalNumber<double>& quality,
             std::int64_t now);
 
   std::vector<Row> rows_;
-  /// Of each row's key, in one word: a search looks at these.
+  /// A digest of each row's key, in the order of the rows: a search looks at these first.
   std::vector<std::uint64_t> digests_;
   /// When the old rows were dropped last.
   std::int64_t tidiedAt_ = 0;

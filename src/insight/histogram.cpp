@@ -4,7 +4,7 @@
 
 namespace vesk::insight {
 
-void Histogram::widenFor(double value) {
+void Histogram::addOutside(double value) {
   const std::int64_t halves = halvesOf(value);
   if (counts_.empty()) first_ = halves;
   if (halves < first_) {

@@ -24,7 +24,7 @@ class Histogram {
     if (place >= 0 && place < std::ssize(counts_)) [[likely]] {
       ++counts_[static_cast<std::size_t>(place)];
     } else {
-      widenFor(value);
+      addOutside(value);
     }
   }
   [[nodiscard]] bool empty() const { return counts_.empty(); }
@@ -37,7 +37,7 @@ class Histogram {
     return static_cast<std::int64_t>(value * 2 + (value < 0 ? -0.5 : 0.5));
   }
   /// Adds a value below the least or above the greatest.
-  void widenFor(double value);
+  void addOutside(double value);
   /// The value at that place of all values in order.
   [[nodiscard]] double valueAt(std::uint64_t place) const;
 

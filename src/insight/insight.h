@@ -30,7 +30,8 @@ class Insight : public Present {
 
   /// Rules to judge from the next event on.
   void setRules(std::vector<Rule> rules) { judge_.setRules(std::move(rules)); }
-  /// Called after every event that takes part, with what it reported and what happened, often nothing.
+  /// Called after every event that takes part, with what it reported and what happened, often nothing. happenings()
+  /// then has the step, too.
   void setStepHandler(StepHandler handler) { onStep_ = std::move(handler); }
 
   [[nodiscard]] const Summary& summary() const { return summary_; }

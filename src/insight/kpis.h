@@ -139,7 +139,7 @@ class KnownKpis {
   }
 
  private:
-  /// So long before every time that it is not known at any.
+  /// No time: at 0 and later, a value of then is no longer known.
   static constexpr std::int64_t kNever = -kKnownFor - 1;
 
   static constexpr auto kNoTimes = [] {

@@ -21,8 +21,8 @@ struct Plmn {
   friend bool operator==(const Plmn&, const Plmn&) = default;
 };
 
-/// From the values of a record; null is absent. The network code has 3 digits when `mncDigits` is 3, else at least 2.
-/// Absent without a country and a network code.
+/// From the values of a record; null is absent. The network code has 3 digits when `mncDigits` is 3, and so
+/// has every code above 99, else 2. Absent without a country and a network code.
 [[nodiscard]] std::optional<Plmn> plmnOf(const Value* mcc, const Value* mnc, const Value* mncDigits);
 
 /// From the 3 bytes of the NAS protocols. Absent for other lengths, and for what holds a half byte that is no digit.

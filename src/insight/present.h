@@ -46,7 +46,7 @@ class Present {
  protected:
   /// Of the last event.
   [[nodiscard]] std::int64_t time() const { return clock_.now().value_or(0); }
-  /// Keeps the last of what happened.
+  /// Drops the oldest beyond kMostHappenings.
   void forgetOldHappenings();
 
   DriveClock clock_;

@@ -63,7 +63,7 @@ struct RegistrationReport {
 
 enum class CarrierState : std::uint8_t { released, configured, activated };
 
-/// An element of the carrier aggregation list.
+/// An element of the carrier aggregation list, in the order of its fields.
 struct CarrierReport {
   OptionalNumber<std::int64_t> index;
   std::optional<CarrierState> state;

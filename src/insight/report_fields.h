@@ -26,7 +26,7 @@ using Number = OptionalNumber<double>;
   return integerOf(record, key);
 }
 [[nodiscard]] Integer uarfcnOf(OrderedLookup& record, const Text& key);
-/// `indicated`: the band of a number that two bands have.
+/// `indicated` tells which band is meant where two share the number; absent if nothing says.
 [[nodiscard]] Integer arfcnOf(OrderedLookup& record, std::optional<SharedGsmBand> indicated);
 [[nodiscard]] Integer pciOf(OrderedLookup& record, const Text& key);
 [[nodiscard]] Integer pscOf(OrderedLookup& record, const Text& key);

@@ -1,5 +1,7 @@
 #include "insight/serving_details.h"
 
+#include "insight/rrc_states.h"
+
 namespace vesk::insight {
 
 OptionalNumber<double> ServingDetails::leastLevel() const {
@@ -9,6 +11,7 @@ OptionalNumber<double> ServingDetails::leastLevel() const {
 void ServingDetails::take(const Report& report, const Mobility& mobility, std::int64_t now) {
   if (mobility.technology().value_or(Technology::lte) != Technology::lte) return forget();
   if (report.leastLevel) broadcast_ = {*report.leastLevel, now};
+  if (report.rrc && rrcClassOf(Technology::lte, report.rrc->state) == RrcClass::idle) transmissionMode_.reset();
   if (report.transmissionMode) transmissionMode_ = report.transmissionMode;
   if (report.samplePci) samplePci_ = report.samplePci;
   const auto& cell = mobility.cell();

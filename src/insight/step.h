@@ -11,7 +11,7 @@ namespace vesk::insight {
 /// One metric event's step of the timeline: its moment, and what happened at it, in order.
 class Step {
  public:
-  /// Adds what happens to `happened`, which belongs to nobody else while the step lasts.
+  /// Adds what happens to `happened`, which belongs to nobody else while the step lasts. `moment` outlives the step.
   Step(const Moment& moment, Happenings& happened) : moment_(moment), happened_(happened) {}
 
   [[nodiscard]] std::int64_t now() const { return moment_.time; }

@@ -11,9 +11,9 @@ constexpr std::array kKpisOfTime{Kpi::lteRsrp,         Kpi::lteRsrq,   Kpi::lteS
                                  Kpi::ltePucchTxPower, Kpi::umtsRscp,  Kpi::umtsEcNo, Kpi::umtsTxPower,
                                  Kpi::gsmRxLev,        Kpi::gsmTxPower};
 
-/// Under which of the KPI's times the value counts.
+/// Under which of the KPI's times the value counts; 0, which nobody reads, for one that is neither graded nor a power.
 std::uint8_t placeOfTime(const KpiDescription& kpi, double value) {
-  if (kpi.isTransmitPower) return value >= kHighTxPower ? 1 : 0;
+  if (kpi.isTransmitPower) return value >= kHighTxPower ? KpiSummary::kHigh : KpiSummary::kNotHigh;
   const auto grade = gradeOf(*kpi.quantity, value);
   return grade ? static_cast<std::uint8_t>(*grade) : 0;
 }
@@ -32,7 +32,7 @@ void Summary::pass(std::int64_t passed, std::int64_t from, const Timeline& timel
 
 void Summary::passKpis(std::int64_t passed, std::int64_t from, const KnownKpis& known) {
   for (const Kpi kpi : kKpisOfTime)
-    if (known.isKnown(kpi, from)) kpis_[indexOf(kpi)].times[timed_[indexOf(kpi)]] += passed;
+    if (known.isKnown(kpi, from)) kpis_[indexOf(kpi)].times[placeOfTime_[indexOf(kpi)]] += passed;
 }
 
 void Summary::takeGap(const Gap& gap) {
@@ -47,7 +47,7 @@ void Summary::take(const Report& report, const Step& step, const Timeline& timel
   }
   for (const auto& [kpi, value] : report.kpis) {
     kpis_[indexOf(kpi)].values.add(value);
-    timed_[indexOf(kpi)] = placeOfTime(descriptionOf(kpi), value);
+    placeOfTime_[indexOf(kpi)] = placeOfTime(descriptionOf(kpi), value);
   }
   const auto& serving = timeline.mobility().cell();
   if (!serving) return;

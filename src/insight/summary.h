@@ -26,12 +26,15 @@ struct EventCounts {
 /// What was measured of a KPI on the whole drive.
 struct KpiSummary {
   Histogram values;
-  /// Milliseconds for which it was known: by the grade of its value, or, of transmit power, by whether that was high.
+  /// Milliseconds for which it was known: of a graded KPI by grade, of a transmit power by kNotHigh and kHigh.
   std::array<std::int64_t, 4> times{};
+
+  static constexpr std::uint8_t kNotHigh = 0;
+  static constexpr std::uint8_t kHigh = 1;
 
   [[nodiscard]] std::int64_t known() const { return std::accumulate(times.begin(), times.end(), std::int64_t{}); }
   [[nodiscard]] std::int64_t graded(Grade grade) const { return times[static_cast<std::size_t>(grade)]; }
-  [[nodiscard]] std::int64_t high() const { return times[1]; }
+  [[nodiscard]] std::int64_t high() const { return times[kHigh]; }
 };
 
 /// How the phone changed cells in a technology.
@@ -76,7 +79,7 @@ class Summary {
   VisitedCells cells_;
   std::array<KpiSummary, kKpiCount> kpis_;
   /// Under which of its times a KPI's last value counts.
-  std::array<std::uint8_t, kKpiCount> timed_{};
+  std::array<std::uint8_t, kKpiCount> placeOfTime_{};
   std::array<MobilityCounts, kTechnologies.size()> mobility_;
   std::int64_t carriersConfigured_ = 0;
   std::int64_t carriersActivated_ = 0;

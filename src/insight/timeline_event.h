@@ -175,7 +175,7 @@ struct TimelineEvent {
   EventKind kind;
   EventFields fields;
 
-  /// `told` is one of EventFields.
+  /// `told`: the fields, of the type that `what` has.
   template <class Fields>
   TimelineEvent(const Moment& when, EventKind what, Fields&& told)
       : moment(when), kind(what), fields(std::forward<Fields>(told)) {}

@@ -29,7 +29,7 @@ enum class EventFate {
 struct TakenEvent {
   EventFate fate;
   /// Absent when the event had none.
-  OptionalNumber<std::int64_t> metricId{};
+  std::optional<std::int64_t> metricId{};
   /// What the record had under "timestamp" before that became a date: milliseconds since 1970-01-01 00:00:00 UTC.
   /// Absent unless stored, and where the record has none that fits.
   OptionalNumber<std::int64_t> timestamp{};
@@ -67,7 +67,7 @@ class MetricValidator : public CorvikWrapperDelegate {
   void startAnew();
 
   /// The metric identifier of the latest event; absent when it had none.
-  OptionalNumber<std::int64_t> metricID;
+  std::optional<std::int64_t> metricID;
 
   /// What the events so far have left behind; whoever shows it reads it here.
   Stores stores;

@@ -8,9 +8,10 @@
 
 namespace vesk {
 
-/// A number that may be absent, like std::optional of it, which it may be made of and made into. It is only as large as
-/// the number, so that a processor copies it in one piece: a std::optional just written in two is not ready to be read
-/// in one for a dozen cycles. The least std::int64_t, and a double that is no number, stand for an absent one.
+/// A number that may be absent, like std::optional of it, which it may be made of and made into. It takes no more room
+/// than the number and is copied in one piece; to read a std::optional whole just after its two parts were written
+/// stalls the processor. The least std::int64_t and a NaN stand for absent: it is not for numbers from outside that may
+/// be these. To be compared with its like only, not with a std::optional.
 template <class Number>
 class OptionalNumber {
  public:
@@ -21,14 +22,16 @@ class OptionalNumber {
 
   constexpr operator std::optional<Number>() const { return has_value() ? std::optional(number_) : std::nullopt; }
 
+  // NOLINTBEGIN(readability-identifier-naming): named as they are in std::optional
   [[nodiscard]] constexpr bool has_value() const {
     if constexpr (std::numeric_limits<Number>::has_quiet_NaN) return !std::isnan(number_);
     return number_ != kAbsent;
   }
+  [[nodiscard]] constexpr Number value_or(Number other) const { return has_value() ? number_ : other; }
+  // NOLINTEND(readability-identifier-naming)
   constexpr explicit operator bool() const { return has_value(); }
   /// To be asked for when there is one.
   constexpr const Number& operator*() const { return number_; }
-  [[nodiscard]] constexpr Number value_or(Number other) const { return has_value() ? number_ : other; }
   constexpr void reset() { number_ = kAbsent; }
 
   friend constexpr bool operator==(const OptionalNumber& one, const OptionalNumber& other) {

@@ -21,7 +21,7 @@ class OrderedLookup {
   [[nodiscard]] const Value* findElsewhere(const Text& key);
 
   const Dictionary& dictionary_;
-  /// The one behind that which was found last.
+  /// Behind the entry found last: where the next key is expected.
   const Dictionary::Entry* next_;
   const Dictionary::Entry* end_;
 };

@@ -78,11 +78,13 @@ struct RecyclingAllocator {
   template <class Other>
   RecyclingAllocator(const RecyclingAllocator<Other>& /*other*/) {}
 
+  // NOLINTBEGIN(bugprone-sizeof-expression): a container may keep pointers, too
   [[nodiscard]] T* allocate(std::size_t count) {
     if (count > SIZE_MAX / sizeof(T)) throw std::bad_array_new_length();
     return static_cast<T*>(RecycledMemory::allocate(count * sizeof(T)));
   }
   void deallocate(T* memory, std::size_t count) noexcept { RecycledMemory::release(memory, count * sizeof(T)); }
+  // NOLINTEND(bugprone-sizeof-expression)
 
   friend bool operator==(const RecyclingAllocator& /*a*/, const RecyclingAllocator& /*b*/) { return true; }
 };

@@ -46,19 +46,19 @@ Dictionary::Dictionary(std::initializer_list<Entry> entries) {
 }
 
 const Dictionary::Entry* Dictionary::findEntry(const Text& key, const Entry* from) const {
-  bool areLiterals = key.isLiteral();
-  const auto findAmong = [&areLiterals](const Entry* first, const Entry* last, auto isMeant) {
+  bool areAllLiterals = key.isLiteral();
+  const auto findAmong = [&areAllLiterals](const Entry* first, const Entry* last, auto isMeant) {
     for (; first != last; ++first) {
       if (isMeant(first->key)) return first;
-      areLiterals &= first->key.isLiteral();
+      areAllLiterals &= first->key.isLiteral();
     }
     return static_cast<const Entry*>(nullptr);
   };
-  // A look at the addresses is enough where all keys are literals.
+  // Literals are equal only when they are the same, so addresses decide unless a key is a copy.
   const auto isSame = [&key](const Text& each) { return each.isSameAs(key); };
-  if (const Entry* behind = findAmong(from, end(), isSame)) return behind;
-  if (const Entry* before = findAmong(begin(), from, isSame)) return before;
-  if (areLiterals) return nullptr;
+  if (const Entry* foundBehind = findAmong(from, end(), isSame)) return foundBehind;
+  if (const Entry* foundBefore = findAmong(begin(), from, isSame)) return foundBefore;
+  if (areAllLiterals) return nullptr;
   return findAmong(begin(), end(), [&key](const Text& each) { return each == key; });
 }
 

@@ -35,7 +35,7 @@ class Follower : public corvik::EventStream {
           followed_.intake->startAnew();
           followed_.insight.startAnew();
         },
-        [this] { loop_.stop(); });
+        [this](double /*sinceLastEvent*/) { loop_.stop(); });
     service_.player().setHeld(true);
     service_.connect(*this);
   }

@@ -47,7 +47,8 @@ class RecordedServiceTest : public testing::Test {
       loop_.stop();
     });
     service_->setSeekHandlers([this](bool isFromStart) { ids_ = {isFromStart ? kFromStart : kOn}; },
-                              [this] {
+                              [this](double sinceLastEvent) {
+                                sinceLastEvent_ = sinceLastEvent;
                                 ids_.push_back(kArrived);
                                 loop_.stop();
                               });
@@ -94,6 +95,7 @@ class RecordedServiceTest : public testing::Test {
   vesk::RunLoop loop_{steadyClock_};
   std::optional<vesk::WorkQueue> queue_{"test"};
   Ids ids_;
+  double sinceLastEvent_ = 0;
   std::vector<std::string> badLines_;
   std::optional<std::string> failure_;
   bool isEnded_ = false;
@@ -200,10 +202,15 @@ TEST_F(RecordedServiceTest, GoesToAnyMomentByPlayingUpToItThenOnFromThere) {
   EXPECT_TRUE(player.seek(3));
   EXPECT_EQ(arrival(), (Ids{kOn, 1, 2, 3, kArrived}));
   EXPECT_EQ(service_->state().position, 3);
+  EXPECT_TRUE(player.seek(3.5));
+  EXPECT_EQ(arrival(), (Ids{kOn, kArrived}));
+  EXPECT_EQ(sinceLastEvent_, 1.5);
   EXPECT_TRUE(player.seek(1.5));
   EXPECT_EQ(arrival(), (Ids{kFromStart, 1, kArrived}));
+  EXPECT_EQ(sinceLastEvent_, 0.5);
   EXPECT_TRUE(player.seekToEvent(2));
   EXPECT_EQ(arrival(), (Ids{kOn, 2, kArrived}));
+  EXPECT_EQ(sinceLastEvent_, 0);
   EXPECT_TRUE(player.seek(-7));
   EXPECT_EQ(arrival(), (Ids{kFromStart, kArrived}));
   EXPECT_TRUE(player.seek(3));

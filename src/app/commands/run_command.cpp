@@ -1,6 +1,8 @@
 #include "app/commands/run_command.h"
 
 #include <algorithm>
+#include <chrono>
+#include <cmath>
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -47,7 +49,8 @@ class Run {
                               {[this](const std::string& message) { tell(message); },
                                [this](const std::string& remark) { show("vesk: " + remark); },
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); },
-                               [this](bool isFromStart) { seekBegun(isFromStart); }, [this] { seekEnded(); }});
+                               [this](bool isFromStart) { seekBegun(isFromStart); },
+                               [this](double sinceLastEvent) { seekEnded(sinceLastEvent); }});
     control_.setPlayer(source_.player);
     if (source_.failure) {
       tellUser("vesk: " + *source_.failure);
@@ -202,7 +205,9 @@ class Run {
     isHeld_ = isHeld;
     moment_.keepTime();
     control_.setHeld(isHeld);
-    if (!isOnTheWay_) showMoment();
+    if (isOnTheWay_) return;
+    showMoment();
+    insight_.setLater(moment_.sinceLastEvent());
   }
 
   void changeSpeed(int step) {
@@ -222,8 +227,11 @@ class Run {
     moment_.startAnew();
   }
 
-  void seekEnded() {
+  /// `sinceLastEvent`: how long before the moment the last event came, in seconds.
+  void seekEnded(double sinceLastEvent) {
     isOnTheWay_ = false;
+    moment_.setSinceLastEvent(std::chrono::milliseconds(std::llround(sinceLastEvent * 1000)));
+    insight_.setLater(moment_.sinceLastEvent());
     OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
     showMoment();
     if (auto* table = dynamic_cast<TableViewController*>(root_->topViewController().get()))

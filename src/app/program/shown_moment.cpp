@@ -33,6 +33,10 @@ void ShownMoment::startAnew() {
   time_ = {};
 }
 
+void ShownMoment::setSinceLastEvent(std::chrono::milliseconds passed) {
+  if (const auto& last = drive_.clock().now()) time_.take(*last + passed.count(), clock_.now());
+}
+
 void ShownMoment::keepTime() {
   time_.keep(clock_.now(), pace_());
 }

@@ -29,6 +29,8 @@ class ShownMoment {
   void noteArrival(std::int64_t metricId);
   /// Forgets all that came, for a drive that is followed from its start again.
   void startAnew();
+  /// The source has gone to a moment so long after the drive's last event.
+  void setSinceLastEvent(std::chrono::milliseconds passed);
   /// To be called before the pace becomes another one.
   void keepTime();
 

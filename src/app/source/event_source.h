@@ -59,7 +59,7 @@ struct SourceHandlers {
   std::function<void(const std::optional<std::string>& failure)> ended;
   /// A replay is on its way to another moment; `isFromStart` tells that all events come once more.
   std::function<void(bool isFromStart)> seekBegun;
-  std::function<void()> seekEnded;
+  std::function<void(double sinceLastEvent)> seekEnded;
 };
 
 /// `clock` must outlive the source.

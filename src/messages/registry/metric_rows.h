@@ -21,7 +21,7 @@ class MetricRows {
 
   /// Null when no row has the identifier.
   [[nodiscard]] constexpr const Row* find(std::int64_t metricId) const {
-    const Row& row = rows_[numbers_[placeOf(metricId)]];
+    const Row& row = rows_[rowAtPlace_[placeOf(metricId)]];
     return row.metricId == metricId ? &row : nullptr;
   }
 
@@ -39,23 +39,23 @@ class MetricRows {
     return static_cast<std::uint32_t>(metricId) * multiplier_ >> (32 - kPlaceBits);
   }
 
-  /// Whether the multiplier gives every row a place of its own.
+  /// Whether the multiplier gives every row a place of its own; the first that does is kept.
   constexpr bool spread() {
-    numbers_ = {};
+    rowAtPlace_ = {};
     std::array<bool, 1U << kPlaceBits> isTaken{};
     for (std::size_t index = 0; index < count; ++index) {
       const std::size_t place = placeOf(rows_[index].metricId);
       if (isTaken[place]) return false;
       isTaken[place] = true;
-      numbers_[place] = static_cast<std::uint8_t>(index);
+      rowAtPlace_[place] = static_cast<std::uint8_t>(index);
     }
     return true;
   }
 
   std::array<Row, count> rows_;
   std::uint32_t multiplier_ = kFirstMultiplier;
-  /// Of the row that may be meant, by the place of its identifier.
-  std::array<std::uint8_t, 1U << kPlaceBits> numbers_{};
+  /// Which row may be meant, by the place of its identifier. An empty place names row 0, which find() then refuses.
+  std::array<std::uint8_t, 1U << kPlaceBits> rowAtPlace_{};
 };
 
 }  // namespace vesk

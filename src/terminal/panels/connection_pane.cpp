@@ -50,7 +50,7 @@ ConnectionLine registrationLine(const insight::Present& drive, insight::Registra
   return line;
 }
 
-/// "on 10 of 320 ms, short 80, inactivity 100   TM3".
+/// "on 10 of 320 ms, short 80   TM3   inactivity 100".
 ConnectionLine drxLine(const insight::Present& drive) {
   const auto& parameters = drive.timeline().connectedDrx().parameters();
   const auto& mode = drive.servingDetails().transmissionMode();
@@ -60,8 +60,8 @@ ConnectionLine drxLine(const insight::Present& drive) {
     return number ? std::string(before) + std::to_string(*number) : "";
   };
   return {"C-DRX", "on" + part(" ", parameters->onDuration) + part(" of ", parameters->longCycle) + " ms" +
-                       part(", short ", parameters->shortCycle) + part(", inactivity ", parameters->inactivity) +
-                       transmission};
+                       part(", short ", parameters->shortCycle) + transmission +
+                       part("   inactivity ", parameters->inactivity)};
 }
 
 ConnectionLine carriersLine(const insight::Present& drive) {

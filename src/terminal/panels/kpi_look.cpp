@@ -14,7 +14,7 @@ namespace {
 struct KpiLook {
   Kpi kpi;
   std::string_view label;
-  /// The ends of its level bar.
+  /// The ends of its level bar: empty, full.
   double low;
   double high;
 };
@@ -33,7 +33,7 @@ constexpr std::array<KpiLook, insight::kKpiCount> kLooks{{
     {Kpi::umtsRssi, "RSSI", -110, -50},
     {Kpi::umtsTxPower, "Tx", -50, 24},
     {Kpi::gsmRxLev, "RxLev", -110, -50},
-    {Kpi::gsmRxQual, "RxQual", 0, 7},
+    {Kpi::gsmRxQual, "RxQual", 7, 0},
     {Kpi::gsmTxPower, "Tx", 0, 33},
 }};
 

@@ -109,7 +109,7 @@ std::string detailsText(const insight::Present& drive) {
   std::string out;
   const auto& details = drive.servingDetails();
   const auto level = drive.value(Kpi::lteRsrp);
-  if (const auto& least = details.leastLevel(); least && level) {
+  if (const auto& least = details.leastLevel(); least && level && !otherPci(drive)) {
     const double margin = *level - *least;
     out = "Srxlev " + std::string(margin > 0 ? "+" : "") + insight::numberText(margin) + " dB over QRxLevMin " +
           insight::numberText(*least) + " dBm";
@@ -120,13 +120,20 @@ std::string detailsText(const insight::Present& drive) {
   return out;
 }
 
-/// "best neighbour PCI 62 B4 2000, -104 dBm, -8 dB".
+/// "next PCI 62 B4 2000, -104 dBm, -8 dB". One that was told without its frequency only where there is no other, and
+/// not when it may be the serving cell.
 std::string neighborText(const insight::Present& drive, Technology technology) {
   const auto cells = drive.cellsHeard();
-  const auto isNeighbor = [&](const insight::HeardCell& cell) {
-    return cell.role == insight::HeardRole::neighbor && cell.key.technology == technology && cell.level;
+  const auto& serving = drive.timeline().mobility().cell();
+  const auto findNeighbor = [&](bool hasChannel) {
+    return std::find_if(cells.begin(), cells.end(), [&](const insight::HeardCell& cell) {
+      const bool isNeighbor = cell.role == insight::HeardRole::neighbor && cell.key.technology == technology;
+      return isNeighbor && cell.level && cell.key.channel.has_value() == hasChannel &&
+             (hasChannel || !serving || cell.key.code != serving->identity.code);
+    });
   };
-  const auto best = std::find_if(cells.begin(), cells.end(), isNeighbor);
+  auto best = findNeighbor(true);
+  if (best == cells.end()) best = findNeighbor(false);
   if (best == cells.end()) return {};
   return "next " + textOf(technology, {best->key.channel, best->key.code, std::nullopt}) + ", " +
          insight::numberText(*best->level) + " dBm" +
