@@ -26,6 +26,8 @@ class Present {
   /// passes while none comes.
   void setLater(std::int64_t later) { later_ = later; }
   [[nodiscard]] const DriveClock& clock() const { return clock_; }
+  /// Where that lies in the drive's counted time, without its gaps: milliseconds.
+  [[nodiscard]] std::int64_t position() const { return clock_.counted() + later_; }
   [[nodiscard]] const EventCounts& counts() const { return counts_; }
 
   /// What is known now: technology, serving cell, area, connection, registration, carriers, bearers, C-DRX.

@@ -18,7 +18,7 @@ constexpr std::array kAsciiStands{
     Stand{"←", '<'}, Stand{"→", '>'}, Stand{"│", '|'}, Stand{"█", '#'}, Stand{"×", 'x'}, Stand{"▏", '_'},
     Stand{"–", '-'}, Stand{"░", '.'}, Stand{"▸", '>'}, Stand{"─", '-'}, Stand{"┆", ':'}, Stand{"┌", '+'},
     Stand{"┐", '+'}, Stand{"└", '+'}, Stand{"┘", '+'}, Stand{"├", '+'}, Stand{"┤", '+'}, Stand{"┬", '+'},
-    Stand{"┴", '+'}, Stand{"┼", '+'},
+    Stand{"┴", '+'}, Stand{"┼", '+'}, Stand{"▶", '>'}, Stand{"▮", '|'},
 };
 
 /// Writes cells to a terminal whose cursor and look it keeps track of.

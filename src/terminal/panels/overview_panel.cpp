@@ -108,7 +108,7 @@ void OverviewPanel::drawTrend(const Canvas& canvas) const {
 
 /// How often what is marked happened; what did not comes last.
 void OverviewPanel::drawRecent(const Canvas& canvas) const {
-  const std::int64_t start = drive_.present().clock().counted() - kRecentLength;
+  const std::int64_t start = drive_.present().position() - kRecentLength;
   int line = 0;
   for (const bool isCounted : {true, false}) {
     for (const EventMark& mark : eventMarks()) {

@@ -72,7 +72,7 @@ void drawKpi(const Canvas& canvas, int line, const insight::Present& drive, Kpi 
   const int barEnd = kBarColumn + (isRoomy ? std::clamp(canvas.columns() - kRoomyColumns, 20, 40) : 10);
   drawLevelBar(canvas, kBarColumn, line, barEnd - kBarColumn, kpi, *value);
   const int gradeEnd = canvas.write(barEnd + 1, line, gradeText(kpi, *value), roleOf(kpi, *value));
-  const auto range = valuesSince(drive.trend().points(kpi), drive.clock().counted() - kRangeLength);
+  const auto range = valuesSince(drive.trend().points(kpi), drive.position() - kRangeLength);
   if (!isRoomy || !range) return;
   const std::string text = "60 s " + insight::numberText(range->min) + "…" + insight::numberText(range->max);
   const int column = std::max(gradeEnd + 2, barEnd + kRangeColumn);

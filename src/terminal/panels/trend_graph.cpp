@@ -145,7 +145,7 @@ int TrendGraph::slotsFor(int columns) const {
 }
 
 TrendSpan TrendGraph::spanOf(const insight::Present& drive, int columns) const {
-  return TrendSpan::endingAt(drive.clock().counted(), step, slotsFor(columns));
+  return TrendSpan::endingAt(drive.position(), step, slotsFor(columns));
 }
 
 void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const {

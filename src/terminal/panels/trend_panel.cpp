@@ -19,9 +19,11 @@ namespace {
 constexpr std::array<std::int64_t, 6> kLengths{60'000, 120'000, 300'000, 600'000, 1'800'000, 3'600'000};
 constexpr int kLinesForLegend = 12;
 
-void drawLegend(const Canvas& canvas, int line) {
+/// What the signs stand for that the graph may bear: of the events since `start`.
+void drawLegend(const Canvas& canvas, int line, const insight::Present& drive, std::int64_t start) {
   int column = TrendGraph::kScaleColumns;
   for (const EventMark& mark : eventMarks()) {
+    if (countSince(drive, mark, start) == 0) continue;
     if (column + textWidth(mark.meaning) + 2 > canvas.columns()) return;
     column = canvas.write(column, line, mark.sign, mark.role) + 1;
     column = canvas.write(column, line, mark.meaning, Role::Faint) + 2;
@@ -52,7 +54,7 @@ void TrendPanel::draw(const Canvas& canvas) {
   const int axis = 2 + graphLines;
   canvas.write(TrendGraph::kScaleColumns, axis, "-" + lastingText(span.length()), Role::Faint);
   canvas.writeRight(canvas.columns() - 1, axis, "now", Role::Faint);
-  if (hasLegend) drawLegend(canvas, axis + 1);
+  if (hasLegend) drawLegend(canvas, axis + 1, drive, span.start);
 }
 
 void TrendPanel::drawFigures(const Canvas& canvas, std::int64_t start) const {
