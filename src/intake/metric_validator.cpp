@@ -81,7 +81,9 @@ bool MetricValidator::validateMetric(const Dictionary& event) {
 
 TakenEvent MetricValidator::take(const Dictionary& event) {
   const Value* id = event.find(metricIDKey);
-  metricID = id == nullptr ? std::nullopt : id->integer();
+  metricID.reset();
+  if (id != nullptr)
+    if (const auto number = id->integer()) metricID = *number;
   if (metricID && OutputLines::isOpen()) OutputLines::print({"Metric ID in Hex = ", hexadecimal(*metricID)});
 
   const HandledMetric* metric = metricID ? findHandledMetric(*metricID) : nullptr;

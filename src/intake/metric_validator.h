@@ -29,7 +29,7 @@ enum class EventFate {
 struct TakenEvent {
   EventFate fate;
   /// Absent when the event had none.
-  std::optional<std::int64_t> metricId{};
+  OptionalNumber<std::int64_t> metricId{};
   /// What the record had under "timestamp" before that became a date: milliseconds since 1970-01-01 00:00:00 UTC.
   /// Absent unless stored, and where the record has none that fits.
   OptionalNumber<std::int64_t> timestamp{};
