@@ -48,7 +48,10 @@ class Connections {
   }
   void forget(Technology technology) {
     Connection& connection = connections_[indexOf(technology)];
-    if (connection.state) connection = {};
+    if (!connection.state) return;
+    connection.state.reset();
+    connection.cause.reset();
+    connection.attempt.reset();
   }
 
  private:

@@ -11,7 +11,8 @@ OptionalNumber<double> ServingDetails::leastLevel() const {
 void ServingDetails::take(const Report& report, const Mobility& mobility, std::int64_t now) {
   if (mobility.technology().value_or(Technology::lte) != Technology::lte) return forget();
   if (report.leastLevel) broadcast_ = {*report.leastLevel, now};
-  if (report.rrc && rrcClassOf(Technology::lte, report.rrc->state) == RrcClass::idle) transmissionMode_.reset();
+  if (transmissionMode_ && report.rrc && rrcClassOf(Technology::lte, report.rrc->state) == RrcClass::idle)
+    transmissionMode_.reset();
   if (report.transmissionMode) transmissionMode_ = report.transmissionMode;
   if (report.samplePci) samplePci_ = report.samplePci;
   const auto& cell = mobility.cell();
