@@ -87,7 +87,6 @@ void HeardCells::hear(const HeardKey& key, const OptionalNumber<double>& level, 
 
 void HeardCells::dropOld(std::int64_t now) {
   tidiedAt_ = now;
-  if (rows_.empty()) return;
   std::size_t kept = 0;
   for (std::size_t index = 0; index < rows_.size(); ++index) {
     if (isOld(rows_[index], now)) continue;

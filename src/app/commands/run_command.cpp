@@ -205,9 +205,7 @@ class Run {
     isHeld_ = isHeld;
     moment_.keepTime();
     control_.setHeld(isHeld);
-    if (isOnTheWay_) return;
-    showMoment();
-    insight_.setLater(moment_.sinceLastEvent());
+    if (!isOnTheWay_) showMoment();
   }
 
   void changeSpeed(int step) {
@@ -231,7 +229,6 @@ class Run {
   void seekEnded(double sinceLastEvent) {
     isOnTheWay_ = false;
     moment_.setSinceLastEvent(std::chrono::milliseconds(std::llround(sinceLastEvent * 1000)));
-    insight_.setLater(moment_.sinceLastEvent());
     OutputLines::setSink(std::make_unique<DiagnosticSink>(diagnostics_));
     showMoment();
     if (auto* table = dynamic_cast<TableViewController*>(root_->topViewController().get()))
@@ -240,6 +237,7 @@ class Run {
   }
 
   void showMoment() {
+    insight_.setLater(moment_.sinceLastEvent());
     if (isHeld_) {
       moment_.hold();
     } else {
