@@ -231,6 +231,16 @@ TEST_F(PresenterTest, HoldsTheWholeScreen) {
   EXPECT_EQ(held_, (std::vector<bool>{true, false, true}));
 }
 
+TEST_F(PresenterTest, NamesTheKeysThatDoSomething) {
+  desk_->resize({120, 10});
+  EXPECT_EQ(desk_->line(9), " ? help  Enter open  / filter  Space hold  q quit");
+  surroundings_.isSeekable = true;
+  Desk replay(interface_.stack(), {120, 10}, surroundings_);
+  replay.type(U" ");
+  EXPECT_EQ(replay.line(9),
+            " ? help  Enter open  / filter  Space go on  q quit  < 10 s back  > forward  + faster  - slower");
+}
+
 TEST_F(PresenterTest, ShowsAnotherMomentOnceItHasComeWithSelectionAndPlaceKept) {
   FakeTableScreen& fields = showFields(numbered(30, "then"));
   desk_->press(Key::End);

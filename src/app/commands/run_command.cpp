@@ -171,6 +171,7 @@ class Run {
   Surroundings surroundings(Application& application) {
     Surroundings surroundings{
         .sourceState = [this] { return sourceState(); },
+        .isSeekable = control_.isSeekable(),
         .setHeld = [this](bool isHeld) { setHeld(isHeld); },
         .changeSpeed = [this](int step) { changeSpeed(step); },
         .jump = [this](std::chrono::seconds distance) { control_.jump(distance); },

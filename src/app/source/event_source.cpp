@@ -38,29 +38,8 @@ std::string speedText(const std::optional<double>& speed) {
   return text;
 }
 
-ShownState shown(const corvik::PlaybackState& state, bool isLive) {
-  using Phase = corvik::PlaybackState::Phase;
-  switch (state.phase) {
-    case Phase::notStarted:
-    case Phase::waitingForInput:
-      return {"waiting"};
-    case Phase::ended:
-      return {"ended", false, 0};
-    case Phase::playing:
-      break;
-  }
-  // A pipe is as good as live.
-  if (isLive) return {"live"};
-  const std::string_view sign = state.isSeeking ? "▶▶ " : state.isHeld ? "▮▮ " : "▶ ";
-  std::string text = std::string(sign) + speedText(state.speed) + "  " + playingTime(state.position);
-  if (state.duration) text += " of " + playingTime(*state.duration);
-  if (state.shortenedPause) text += ", shortening a pause of " + playingTime(*state.shortenedPause);
-  const bool isMoving = !state.isHeld || state.isSeeking;
-  return {text, isMoving, isMoving && !state.isSeeking ? state.speed.value_or(0) : 0};
-}
-
 /// "ttyUSB0: 23 packets/s, 2 damaged", and what else has gone wrong.
-ShownState shown(const std::string& port, const diag::PortState& state) {
+ShownState stateOfPort(const std::string& port, const diag::PortState& state) {
   using Phase = diag::PortState::Phase;
   std::string text = port.substr(port.rfind('/') + 1) + ": ";
   switch (state.phase) {
@@ -106,7 +85,7 @@ EventSource makePortSource(const SourceOptions& options, std::unique_ptr<RecordF
   service->setEndHandler([ended = std::move(handlers.ended)](const std::string& failure) { ended(failure); });
   if (file != nullptr) service->setFrameHandler(keepFrames(std::move(file), std::move(handlers.badLine)));
   diag::PortService& watched = *service;
-  return {std::move(service), [&watched, port = *options.port] { return shown(port, watched.state()); }};
+  return {std::move(service), [&watched, port = *options.port] { return stateOfPort(port, watched.state()); }};
 }
 
 EventSource makeSimulatedSource(const SourceOptions& options, const Clock& clock) {
@@ -136,11 +115,36 @@ EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, S
     ended(failure);
   });
   service->setSeekHandlers(std::move(handlers.seekBegun), std::move(handlers.seekEnded));
-  return {std::move(service), [&recorded, &input] { return shown(recorded.state(), input.isLive()); }, std::nullopt,
-          [&recorded] { return recorded.state().position; }, &recorded.player()};
+  return {std::move(service), [&recorded, &input] { return stateOfReplay(recorded.state(), input.isLive()); },
+          std::nullopt, [&recorded] { return recorded.state().position; }, &recorded.player()};
 }
 
 }  // namespace
+
+ShownState stateOfReplay(const corvik::PlaybackState& state, bool isLive) {
+  using Phase = corvik::PlaybackState::Phase;
+  std::string bad;
+  if (state.badLines > 0)
+    bad = ", " + std::to_string(state.badLines) + (state.badLines == 1 ? " bad line" : " bad lines");
+  switch (state.phase) {
+    case Phase::notStarted:
+    case Phase::waitingForInput:
+      return {"waiting" + bad};
+    case Phase::ended:
+      return {"ended" + bad, false, 0};
+    case Phase::playing:
+      break;
+  }
+  // A pipe is as good as live.
+  if (isLive) return {"live" + bad};
+  const std::string_view sign = state.isSeeking ? "▶▶ " : state.isHeld ? "▮▮ " : "▶ ";
+  std::string text = std::string(sign) + speedText(state.speed) + "  " + playingTime(state.position);
+  if (state.duration) text += " of " + playingTime(*state.duration);
+  if (state.shortenedPause) text += ", shortening a pause of " + playingTime(*state.shortenedPause);
+  text += bad;
+  const bool isMoving = !state.isHeld || state.isSeeking;
+  return {text, isMoving, isMoving && !state.isSeeking ? state.speed.value_or(0) : 0};
+}
 
 EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
   std::string reason;

@@ -29,13 +29,16 @@ struct SourceOptions {
 
 /// What a status bar shows of a source.
 struct ShownState {
-  /// "live", "▶ ×1  3:12 of 9:40", "waiting", "ended".
+  /// "live", "▶ ×1  3:12 of 9:40", "waiting", "ended, 2 bad lines".
   std::string text;
   /// Whether the text changes with the seconds.
   bool isMoving = false;
   /// How many seconds of the drive pass in one; 0 where they are not known to pass.
   double pace = 1;
 };
+
+/// `isLive` tells that the replay is of a pipe.
+[[nodiscard]] ShownState stateOfReplay(const corvik::PlaybackState& state, bool isLive);
 
 /// A service with what the program shows of it.
 struct EventSource {

@@ -32,7 +32,7 @@ corvik::Player* ReplayControl::seekable() {
 }
 
 void ReplayControl::setHeld(bool isHeld) {
-  if (player_ != nullptr && player_->state().duration) player_->setHeld(isHeld);
+  if (isSeekable()) player_->setHeld(isHeld);
 }
 
 void ReplayControl::changeSpeed(int step) {

@@ -19,6 +19,8 @@ class ReplayControl {
   /// Null for a source that is no replay. It must outlive this.
   void setPlayer(corvik::Player* player) { player_ = player; }
 
+  /// Whether there is a way back.
+  [[nodiscard]] bool isSeekable() const { return player_ != nullptr && player_->state().duration.has_value(); }
   /// A source that cannot wait, such as a pipe, goes on.
   void setHeld(bool isHeld);
   /// One step faster for +1, slower for -1.

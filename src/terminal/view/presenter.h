@@ -95,6 +95,7 @@ class Presenter {
   [[nodiscard]] std::vector<std::string> titles() const;
   /// The keys that do something where the user is.
   [[nodiscard]] std::vector<Action> hints(const Picture& picture);
+  [[nodiscard]] std::vector<Action> hintsOnTable(const Picture& picture);
   void fillTable(Picture& picture, Clock::Instant now);
   void addHeadlines(Picture& picture, std::string_view area, Clock::Instant now);
   [[nodiscard]] std::string dateBehind(std::string_view status, std::string_view date) const;

@@ -66,7 +66,16 @@ Picture Presenter::picture(Clock::Instant now) {
 
 std::vector<Action> Presenter::hints(const Picture& picture) {
   if (helpStart_) return {Action::Back, Action::Quit};
-  if (panel() != nullptr) return {panel()->hints().begin(), panel()->hints().end()};
+  std::vector<Action> hints =
+      panel() != nullptr ? std::vector(panel()->hints().begin(), panel()->hints().end()) : hintsOnTable(picture);
+  if (surroundings_.isSeekable) {
+    constexpr Action kOfReplay[] = {Action::Backward, Action::Forward, Action::Faster, Action::Slower};
+    hints.insert(hints.end(), std::begin(kOfReplay), std::end(kOfReplay));
+  }
+  return hints;
+}
+
+std::vector<Action> Presenter::hintsOnTable(const Picture& picture) {
   const auto opens = [](const ListLine& line) { return line.isSelected && line.hasDisclosure; };
   const std::pair<Action, bool> needs[] = {
       {Action::Open, std::any_of(picture.lines.begin(), picture.lines.end(), opens)},

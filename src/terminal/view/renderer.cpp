@@ -237,7 +237,8 @@ class Renderer {
     }
     for (const Action action : picture_.hints) {
       const KeyBinding& binding = bindingOf(action);
-      column = drawHint(column, nameOf(*binding.keys.begin()), binding.hint);
+      const bool letsGo = action == Action::Freeze && picture_.isFrozen;
+      column = drawHint(column, nameOf(*binding.keys.begin()), letsGo ? "go on" : binding.hint);
     }
   }
 

@@ -57,6 +57,8 @@ struct Surroundings {
   /// The technology that the handset uses in place of that of a category; empty while it uses that.
   std::function<std::string(std::string_view area, std::string_view category)> technologyInstead{};
 
+  /// Whether the source is a replay that goes back and forth.
+  bool isSeekable = false;
   /// Holds all that shows at the present moment, and the replay with it; or lets it go on.
   std::function<void(bool isHeld)> setHeld{};
   /// One step faster for +1, slower for -1.
