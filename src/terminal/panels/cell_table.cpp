@@ -118,13 +118,15 @@ constexpr std::array kColumns{
     CellColumn{"level", 6, true, 0, levelText, levelRank, true},
     CellColumn{"diff", 6, true, 0, differenceText, differenceRank, true},
     CellColumn{"quality", 7, true, 50, qualityText, qualityRank, true},
-    CellColumn{"", 20, false, 96, nothing},
+    CellColumn{"", 20, false, 104, nothing},
     CellColumn{"age", 6, true, 64, ageText, ageRank},
-    CellColumn{"note", 24, false, 78, nothing, noteRank},
+    CellColumn{"note", 25, false, 78, nothing, noteRank},
 };
 // clang-format on
 constexpr std::size_t kLevelBarColumn = 8;
 constexpr std::size_t kNoteColumn = 10;
+/// All columns but the bar, whose width is what they leave.
+constexpr int kColumnsBesideBar = 96;
 constexpr int kTableGutter = 2;
 
 Role textRole(std::size_t column, const HeardCell& cell) {
@@ -176,8 +178,9 @@ CellTable::CellTable(int columns) {
   for (std::size_t column = 0; column < kColumns.size(); ++column) {
     const CellColumn& each = kColumns[column];
     if (columns < each.fromColumns) continue;
-    places_.push_back({column, start, std::min(start + each.width, columns)});
-    start += each.width + (each.isAtRight ? 1 : 2);
+    const int width = column == kLevelBarColumn ? std::min(each.width, columns - kColumnsBesideBar) : each.width;
+    places_.push_back({column, start, std::min(start + width, columns)});
+    start += width + (each.isAtRight ? 1 : 2);
   }
 }
 
