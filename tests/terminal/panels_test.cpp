@@ -93,11 +93,11 @@ TEST_F(PanelsTest, AnOrdinaryOverviewHasTrendAndEvents) {
 |│  Srxlev +34 dB over QRxLevMin -122 dBm   measured PCI agrees                 │
 |│  next PCI 316 B17 5815, -112 dBm, -24 dB                                     │
 |├─ RSRP dBm, 2 min 24 s ───────────────────────────────────────────────────────┤
-|│  -80                                                                         │
-|│  -90                                                                        ▂│
-|│ -100                                                                 ▃▃▃▃▃▃ █│
-|│ -110                                                                 ██████ █│
-|│ -120                                                            ▆▆▆▆▆██████ █│
+|│  -70                                                                         │
+|│  -80                                                                        ▂│
+|│  -90                                                                 ▃▃▃▃▃▃ █│
+|│ -100                                                                 ██████ █│
+|│ -110                                                            ▆▆▆▆▆██████ █│
 |│                                                                      C    R  │
 |├─ WHAT HAPPENED ──────────────────────────────────────────────────────────────┤
 |│ 21:53:00.200  reestablished  PCI 338 B17 5815 CI 48906257 -> PCI 338 B17 581…│
@@ -296,11 +296,11 @@ TEST(TrendGraph, UsesTheSignsThatTheTerminalHas) {
     Signs signs;
     std::vector<std::string> lines;
   } const cases[] = {
-      {GraphKind::bars, Signs::ascii, {" -100     ███", " -105  ███████"}},
-      {GraphKind::bars, Signs::blocks, {" -100    ▄▄██▄", " -105  ███████"}},
-      {GraphKind::bars, Signs::braille, {" -100   ▂▃▅▆█▃", " -105  ███████"}},
+      {GraphKind::bars, Signs::ascii, {"  -95     ███", " -100  ███████"}},
+      {GraphKind::bars, Signs::blocks, {"  -95    ▄▄██▄", " -100  ███████"}},
+      {GraphKind::bars, Signs::braille, {"  -95   ▂▃▅▆█▃", " -100  ███████"}},
       {GraphKind::line, Signs::braille, {" -100     ⢀⣠⠞⢹", " -105"}},
-      {GraphKind::line, Signs::blocks, {" -100    ▄▄██▄", " -105  ███████"}},
+      {GraphKind::line, Signs::blocks, {"  -95    ▄▄██▄", " -100  ███████"}},
   };
   for (const auto& each : cases) {
     Grid grid({14, 3});

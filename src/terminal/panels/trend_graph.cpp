@@ -109,11 +109,12 @@ void drawDots(const Canvas& canvas, const Slots& slots, const std::vector<bool>&
   dots.draw(canvas, [&](int line) { return roleOf(kpi, scale.low + (canvas.lines() - line - 0.5) * scale.step); });
 }
 
-void drawScale(const Canvas& canvas, const TrendScale& scale, int rows) {
+/// `first` is what the lowest row is labelled with.
+void drawScale(const Canvas& canvas, double first, double step, int rows) {
   constexpr int kMostLabels = 14;
   const int every = rows / kMostLabels + 1;
   for (int row = 0; row < rows; row += every) {
-    const std::string label = insight::numberText(scale.low + row * scale.step);
+    const std::string label = insight::numberText(first + row * step);
     canvas.writeRight(TrendGraph::kScaleColumns - 1, rows - 1 - row, label, Role::Faint);
   }
 }
@@ -167,7 +168,8 @@ void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const
     return;
   }
   const TrendScale scale = TrendScale::covering(range->min, range->max, rows);
-  drawScale(canvas, scale, rows);
+  // A bar that fills a row has its label's value; a line that enters it, too.
+  drawScale(canvas, isDotted() ? scale.low : scale.low + scale.step, scale.step, rows);
   const Canvas field = canvas.part({kScaleColumns, 0, canvas.columns() - kScaleColumns, rows});
   if (isDotted()) {
     std::vector<bool> cuts(slots.size());
