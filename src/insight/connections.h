@@ -48,7 +48,6 @@ class Connections {
   }
   void forget(Technology technology) {
     Connection& connection = connections_[indexOf(technology)];
-    if (!connection.state) return;
     connection.state.reset();
     connection.cause.reset();
     connection.attempt.reset();
@@ -64,7 +63,7 @@ class Connections {
     OptionalNumber<double> level{};
   };
 
-  /// While the state is unknown so is the rest; forget() relies on that.
+  /// While the state is unknown so is the rest.
   struct Connection {
     std::optional<Text> state;
     std::int64_t since = 0;

@@ -105,7 +105,7 @@ void writeMarks(JsonWriter& json, const DriveRecord& record) {
 void writeEvents(JsonWriter& json, const DriveRecord& record) {
   writeJsonArray(json, record.events(), [&](const DriveRecord::Event* each) {
     json.put('[');
-    json.write(each->position);
+    json.write(each->event.moment.position);
     json.put(',');
     json.write(each->event.moment.time);
     json.put(',');

@@ -47,7 +47,7 @@ void DriveRecord::take(const insight::Insight& insight, const insight::Report& r
     courses_[insight::indexOf(kpi)].add({position, position, value, position, value});
   takeServing(insight.timeline().mobility().cell(), position);
   for (const insight::TimelineEvent& event : step)
-    takeEvent(event, position);
+    takeEvent(event);
 }
 
 void DriveRecord::takeServing(const std::optional<insight::ServingCell>& cell, std::int64_t position) {
@@ -70,11 +70,11 @@ std::optional<std::size_t> DriveRecord::numberOf(const insight::ServingCell& cel
   return cells_.size() - 1;
 }
 
-void DriveRecord::takeEvent(const insight::TimelineEvent& event, std::int64_t position) {
-  if (const auto mark = markOf(event)) marks_[static_cast<std::size_t>(*mark)].add({position});
+void DriveRecord::takeEvent(const insight::TimelineEvent& event) {
+  if (const auto mark = markOf(event)) marks_[static_cast<std::size_t>(*mark)].add({event.moment.position});
   auto& ofKind = events_[static_cast<std::size_t>(event.kind)];
   if (ofKind.size() == limits_.eventsOfKind) ofKind.pop_front();
-  ofKind.push_back({position, eventCount_++, event});
+  ofKind.push_back({eventCount_++, event});
 }
 
 void DriveRecord::clear() {

@@ -67,7 +67,6 @@ inline constexpr RecordLimits kWholeDrive{.points = 4096, .changes = 32'768, .ev
 class DriveRecord {
  public:
   struct Event {
-    std::int64_t position;
     /// In which order the events came.
     std::uint64_t number;
     insight::TimelineEvent event;
@@ -104,7 +103,7 @@ class DriveRecord {
 
   void takeServing(const std::optional<insight::ServingCell>& cell, std::int64_t position);
   [[nodiscard]] std::optional<std::size_t> numberOf(const insight::ServingCell& cell);
-  void takeEvent(const insight::TimelineEvent& event, std::int64_t position);
+  void takeEvent(const insight::TimelineEvent& event);
 
   RecordLimits limits_;
   bool hasTaken_ = false;
