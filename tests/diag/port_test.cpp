@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "diag/modem.h"
+#include "diag/port/port_remarks.h"
 #include "diag/port/port_service.h"
 #include "messages/registry/metric_identifiers.h"
 #include "support/manual_clock.h"
@@ -160,6 +161,18 @@ TEST_F(PortServiceTest, SaysOnceWhatIsWrongWithWhatComes) {
     const auto holds = [&part](const std::string& text) { return text.find(part) != std::string::npos; };
     EXPECT_EQ(std::count_if(noted.begin(), noted.end(), holds), 1) << part;
   }
+}
+
+TEST(PortRemarks, TellOnceOfASimThatDoesNotCome) {
+  PacketCounts counts;
+  PortRemarks remarks;
+  std::size_t said = 0;
+  for (int count = 0; count < 1000; ++count) {
+    counts.noteOtherSim();
+    said += remarks.take(counts).size();
+    EXPECT_LE(said, count < 100 ? 0U : 1U);
+  }
+  EXPECT_EQ(said, 1U);
 }
 
 TEST(Port, TellsWhyItCannotBeOpened) {

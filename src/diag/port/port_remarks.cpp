@@ -11,6 +11,8 @@ namespace {
 
 /// Frames among which damaged ones are counted.
 constexpr std::uint64_t kFramesTogether = 1000;
+/// By then a SIM that is in and on has been heard of.
+constexpr std::uint64_t kPacketsOfOtherSims = 200;
 constexpr const char* kAdviceOnDamage =
     "does another program read the port? Stop it; mmcli --inhibit-device=UID keeps ModemManager away";
 
@@ -33,6 +35,9 @@ std::vector<std::string> PortRemarks::take(const PacketCounts& counts) {
     areSaid = true;
     remarks.push_back(*remark);
   }
+  const bool areOnlyOtherSims = counts.sims().empty() && counts.ofOtherSims() >= kPacketsOfOtherSims;
+  if (areOnlyOtherSims && !std::exchange(areOnlyOtherSimsSaid_, true))
+    remarks.emplace_back("so far no packet is of the SIM that --sim chooses; leave it out to see which there are");
   if (counts.hasUnsetClock() && !std::exchange(isClockSaid_, true))
     remarks.emplace_back("the modem's clock is not set yet: until a network sets it, dates are of 1980");
   return remarks;

@@ -18,6 +18,7 @@ class PortRemarks {
   bool isDamageSaid_ = false;
   bool areSimsSaid_ = false;
   bool areMoreSimsSaid_ = false;
+  bool areOnlyOtherSimsSaid_ = false;
   bool isClockSaid_ = false;
   /// Where the frames begin among which damaged ones are counted: trouble that comes late is noticed too.
   std::uint64_t damagedBefore_ = 0;
