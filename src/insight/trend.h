@@ -14,8 +14,8 @@ namespace vesk::insight {
 struct TrendPoint {
   /// When the second began, in counted time of the drive, without its gaps: milliseconds.
   std::int64_t position;
-  /// When it was reported first: milliseconds since 1970-01-01 00:00:00 UTC.
-  std::int64_t time;
+  /// Which of the drive's metric events reported it last.
+  std::uint64_t lastEvent;
   double min;
   double max;
   double sum;

@@ -310,15 +310,17 @@ TEST(TrendGraph, UsesTheSignsThatTheTerminalHas) {
 }
 
 TEST(TrendGraph, ShowsAValueWhileItIsFreshAndNotBeyondABreak) {
-  const Trend::Points points{{1000, 0, -90, -80, -170, 2}, {4000, 0, -100, -100, -100, 1}};
-  const auto shown = [&](std::int64_t step, const std::vector<std::int64_t>& breaks) {
+  const Trend::Points points{{1000, 12, -90, -80, -170, 2}, {4000, 40, -100, -100, -100, 1}};
+  const auto shown = [&](std::int64_t step, const std::vector<Moment>& breaks) {
     std::string out;
     for (const auto& slot : slotValues(points, {0, step, 18}, breaks))
       out += slot ? slot->mean() == -85 ? 'a' : 'b' : '.';
     return out;
   };
   EXPECT_EQ(shown(1000, {}), ".aaabbbbbbbbbb....");
-  EXPECT_EQ(shown(1000, {2500, 6000}), ".aa.bb............");
+  EXPECT_EQ(shown(1000, {{.event = 25, .position = 2500}, {.event = 60, .position = 6000}}), ".aa.bb............");
+  // No time passes in a gap: only the event tells what came before it.
+  EXPECT_EQ(shown(1000, {{.event = 12, .position = 1000}, {.event = 41, .position = 4000}}), ".aaab.............");
   EXPECT_EQ(shown(500, {}), "..aaaaaabbbbbbbbbb");
   EXPECT_EQ(valuesSince(points, 2000)->count, 1U);
   EXPECT_FALSE(valuesSince(points, 5000));

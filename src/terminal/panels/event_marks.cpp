@@ -77,10 +77,10 @@ void drawMarks(const Canvas& canvas, int column, int line, const insight::Presen
       canvas.write(column + static_cast<int>(index), line, marks[index]->sign, marks[index]->role);
 }
 
-std::vector<std::int64_t> breaksOf(const insight::Present& drive) {
-  std::vector<std::int64_t> breaks;
+std::vector<insight::Moment> breaksOf(const insight::Present& drive) {
+  std::vector<insight::Moment> breaks;
   for (const auto& each : drive.happenings())
-    if (each.kind == EventKind::gap || each.kind == EventKind::technology) breaks.push_back(each.moment.position);
+    if (each.kind == EventKind::gap || each.kind == EventKind::technology) breaks.push_back(each.moment);
   return breaks;
 }
 

@@ -39,7 +39,7 @@ void drawMarks(const Canvas& canvas, int column, int line, const insight::Presen
                int slotsPerColumn);
 
 /// Where values were forgotten, in order.
-[[nodiscard]] std::vector<std::int64_t> breaksOf(const insight::Present& drive);
+[[nodiscard]] std::vector<insight::Moment> breaksOf(const insight::Present& drive);
 
 /// How many events with that mark happened from a position on.
 [[nodiscard]] std::size_t countSince(const insight::Present& drive, const EventMark& mark, std::int64_t start);

@@ -154,7 +154,7 @@ void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const
   const int rows = canvas.lines() - 1;
   if (rows < 1) return;
   drawMarks(canvas, kScaleColumns, rows, drive, span, isDotted() ? kDotColumns : 1);
-  const std::vector<std::int64_t> breaks = breaksOf(drive);
+  const std::vector<insight::Moment> breaks = breaksOf(drive);
   const Slots slots = slotValues(drive.trend().points(kpi), span, breaks);
   std::optional<TrendValues> range;
   for (const auto& values : slots) {
@@ -173,8 +173,8 @@ void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const
   const Canvas field = canvas.part({kScaleColumns, 0, canvas.columns() - kScaleColumns, rows});
   if (isDotted()) {
     std::vector<bool> cuts(slots.size());
-    for (const std::int64_t each : breaks)
-      if (const auto slot = span.slotOf(each)) cuts[static_cast<std::size_t>(*slot)] = true;
+    for (const insight::Moment& each : breaks)
+      if (const auto slot = span.slotOf(each.position)) cuts[static_cast<std::size_t>(*slot)] = true;
     drawDots(field, slots, cuts, scale, kpi);
   } else {
     drawBars(field, slots, scale, kpi, signs);

@@ -33,7 +33,7 @@ void TrendValues::add(const insight::TrendPoint& point) {
 }
 
 std::vector<std::optional<TrendValues>> slotValues(const insight::Trend::Points& points, const TrendSpan& span,
-                                                   const std::vector<std::int64_t>& breaks) {
+                                                   const std::vector<insight::Moment>& breaks) {
   std::vector<std::optional<TrendValues>> slots(static_cast<std::size_t>(span.slots));
   for (auto point = firstFrom(points, span.start - kFresh); point != points.end(); ++point) {
     if (const auto slot = span.slotOf(point->position)) {
@@ -42,8 +42,11 @@ std::vector<std::optional<TrendValues>> slotValues(const insight::Trend::Points&
       values->add(*point);
     }
     std::int64_t end = point->position + kFresh;
-    const auto cut = std::lower_bound(breaks.begin(), breaks.end(), point->position);
-    if (cut != breaks.end()) end = std::min(end, *cut);
+    // What a value is reported with, it does not end.
+    const auto cut =
+        std::upper_bound(breaks.begin(), breaks.end(), point->lastEvent,
+                         [](std::uint64_t event, const insight::Moment& each) { return event < each.event; });
+    if (cut != breaks.end()) end = std::min(end, cut->position);
     // The slot of the next report is that report's.
     const auto next = std::next(point);
     if (next != points.end()) end = std::min(end, next->position - next->position % span.step);

@@ -37,7 +37,7 @@ struct TrendValues {
 /// `breaks`, which are in order: there values are forgotten.
 [[nodiscard]] std::vector<std::optional<TrendValues>> slotValues(const insight::Trend::Points& points,
                                                                  const TrendSpan& span,
-                                                                 const std::vector<std::int64_t>& breaks);
+                                                                 const std::vector<insight::Moment>& breaks);
 
 /// Of all that was reported from `start` on; absent when nothing was.
 [[nodiscard]] std::optional<TrendValues> valuesSince(const insight::Trend::Points& points, std::int64_t start);
