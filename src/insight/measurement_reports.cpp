@@ -1,29 +1,10 @@
 #include "insight/report_fields.h"
 #include "insight/report_steps.h"
+#include "insight/umts_chain.h"
 
 namespace vesk::insight {
 
 namespace {
-
-/// A receive chain of UMTS.
-struct UmtsChain {
-  Number rscp;
-  Number ecNo;
-  Number rssi;
-};
-
-/// Ec/N0 is RSCP / RSSI: where the RSCP is not reported, the two tell it.
-UmtsChain umtsChainOf(const Record& element) {
-  OrderedLookup record(element);
-  UmtsChain chain{std::nullopt, decodedLevel(kEcNo, record.find("rsrq_range"_text), 0.5, -24.5),
-                  levelOf(kRssi, record, "rssi"_text)};
-  if (const Value* code = record.find("rsrp_range"_text)) {
-    chain.rscp = decodedLevel(kRscp, code, 1, -116);
-  } else if (chain.rssi && chain.ecNo && isPossible(kRscp, *chain.rssi + *chain.ecNo)) {
-    chain.rscp = *chain.rssi + *chain.ecNo;
-  }
-  return chain;
-}
 
 /// Under which keys a list has what is known of a cell.
 struct NeighborKeys {

@@ -51,11 +51,7 @@ std::optional<Reading> readByCode(const ReadingRule& rule, const Value& value, c
   return rule.readCode(*code);
 }
 
-std::optional<Reading> readLevel(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {
-  const std::optional<double> code = value.number();
-  if (!code) return std::nullopt;
-  const double number = *code * rule.scale + rule.offset;
-  const Quantity& quantity = *rule.quantity;
+Reading levelReading(const Quantity& quantity, double number) {
   if (!isPossible(quantity, number)) return impossibleReading();
   Reading reading{.text = withUnit(number, quantity.unit),
                   .value = number,
@@ -69,6 +65,12 @@ std::optional<Reading> readLevel(const ReadingRule& rule, const Value& value, co
     reading.text += nameOf(*reading.grade);
   }
   return reading;
+}
+
+std::optional<Reading> readLevel(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {
+  const std::optional<double> code = value.number();
+  if (!code) return std::nullopt;
+  return levelReading(*rule.quantity, *code * rule.scale + rule.offset);
 }
 
 std::optional<Reading> readNumber(const ReadingRule& rule, const Value& value, const Dictionary& /*record*/) {

@@ -53,6 +53,9 @@ struct Reading {
 /// The reading of a value that cannot be.
 [[nodiscard]] Reading impossibleReading();
 
+/// The reading of a level, in the quantity's unit: "-96 dBm, fair".
+[[nodiscard]] Reading levelReading(const Quantity& quantity, double number);
+
 /// Writes {"text":"-96 dBm, fair","value":-96,"unit":"dBm","grade":"fair"}, with "mark", "band", "dl_mhz", "ul_mhz",
 /// "duplex", "enb", "sector", "rnc", "cell", "plmn" and "code" where they apply.
 void writeReading(JsonWriter& json, const Reading& reading);

@@ -1,10 +1,11 @@
 #include "app/program/headlines.h"
 
-#include <algorithm>
 #include <array>
 #include <optional>
+#include <utility>
 
 #include "insight/readings.h"
+#include "insight/umts_chain.h"
 #include "screens/detail_text.h"
 
 namespace vesk {
@@ -24,6 +25,7 @@ constexpr std::array kTelling{
     Telling{"KCellularLteRrcState", "state"},
     Telling{"KCellularLteScellInfo", "phy_cell_id", "PCI "},
     Telling{"RsrpRsrqSinr", "rsrp0"},
+    Telling{"RsrpRsrqSinr", "rsrp1"},
     Telling{"TxPowerInfo", "pusch_tx_power"},
     Telling{"KCellularLteCdrxConfig", "cdrx_config_status"},
     Telling{"EgwErrcNbrEutraMeas", "nbr_rsrp"},
@@ -35,7 +37,6 @@ constexpr std::array kTelling{
     Telling{"KCellularWcdmaRrcConnectionState", "state"},
     Telling{"KCellularWcdmaRrcConfiguration", "drx_cycle_length_ms"},
     Telling{"KCellularWcdmaCellInfo", "psc", "PSC "},
-    Telling{"RxInfo", "rsrp_range"},
     Telling{"LteCellMeasResult", "rsrp"},
     Telling{"UtraCellMeasResult", "rscp"},
     Telling{"GsmCellMeasResult", "rxlev"},
@@ -67,18 +68,26 @@ std::optional<Headline> headlineOf(const Telling& telling, const Record& record)
   return std::nullopt;
 }
 
+/// The RSCP of a receive chain of UMTS, which may have to be reckoned from two keys.
+std::optional<Headline> headlineOfChain(const Record& chain) {
+  const auto rscp = insight::umtsChainOf(chain).rscp;
+  if (!rscp) return std::nullopt;
+  return Headline{insight::levelReading(insight::kRscp, *rscp).text, *rscp};
+}
+
 }  // namespace
 
 std::string headlineOf(const CategorySource& source, const Stores& stores) {
-  const auto* telling = std::find_if(kTelling.begin(), kTelling.end(),
-                                     [&](const Telling& each) { return each.messageClass == messageClassOf(source); });
   const RecordList records = shownRecords(source, stores);
+  const std::string_view messageClass = messageClassOf(source);
   std::optional<Headline> greatest;
-  if (telling != kTelling.end()) {
-    for (const Record& record : records) {
-      auto headline = headlineOf(*telling, record);
-      if (headline && (!greatest || headline->value > greatest->value)) greatest = std::move(headline);
-    }
+  const auto take = [&](std::optional<Headline> headline) {
+    if (headline && (!greatest || headline->value > greatest->value)) greatest = std::move(headline);
+  };
+  for (const Record& record : records) {
+    if (messageClass == "RxInfo") take(headlineOfChain(record));
+    for (const Telling& telling : kTelling)
+      if (telling.messageClass == messageClass) take(headlineOf(telling, record));
   }
   if (greatest) return greatest->text;
   if (source.kind != SourceKind::storeList || records.size() == 0) return {};
