@@ -2,7 +2,6 @@
 #include <string>
 #include <vector>
 
-#include "app/source/event_source.h"
 #include "app/source/replay_control.h"
 #include "corvik/recorded_service.h"
 #include "handset/driven_events.h"
@@ -96,27 +95,6 @@ TEST(LookBack, LeavesWhatPlayingUpToThereLeaves) {
   EXPECT_LT(follower.arrive().insight.counts().all, count);
   follower.player().seekToEvent(count);
   expectTheSame(follower.arrive());
-}
-
-TEST(ReplayStatus, TellsWhereTheReplayIsAndWhatIsWrong) {
-  using Phase = corvik::PlaybackState::Phase;
-  corvik::PlaybackState state;
-  const auto text = [&](bool isLive = false) { return stateOfReplay(state, isLive).text; };
-  EXPECT_EQ(text(), "waiting");
-  state.phase = Phase::playing;
-  state.speed = 10;
-  state.position = 192.9;
-  state.duration = 3700;
-  EXPECT_EQ(text(), "▶ ×10  3:12 of 1:01:40");
-  state.isHeld = true;
-  state.badLines = 1;
-  EXPECT_EQ(text(), "▮▮ ×10  3:12 of 1:01:40, 1 bad line");
-  state.isSeeking = true;
-  state.badLines = 2;
-  EXPECT_EQ(text(), "▶▶ ×10  3:12 of 1:01:40, 2 bad lines");
-  EXPECT_EQ(text(true), "live, 2 bad lines");
-  state.phase = Phase::ended;
-  EXPECT_EQ(text(), "ended, 2 bad lines");
 }
 
 TEST(LookBack, IsRefusedInOneLineWhereThereIsNoWayBack) {

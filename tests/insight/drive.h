@@ -243,6 +243,8 @@ class Drive {
     return out;
   }
 
+  [[nodiscard]] const Stores& stores() const { return intake_->stores; }
+
   Insight insight;
   std::vector<TimelineEvent> timeline;
 

@@ -37,7 +37,7 @@ struct ShownState {
   double pace = 1;
 };
 
-/// `isLive` tells that the replay is of a pipe.
+/// How far a replay is, and what has gone wrong; `isLive` tells that it is of a pipe.
 [[nodiscard]] ShownState stateOfReplay(const corvik::PlaybackState& state, bool isLive);
 
 /// A service with what the program shows of it.
