@@ -141,7 +141,7 @@ TEST_F(PanelsTest, WideOverviewsAreFilled) {
   EXPECT_NE(
       lineWith("▸ LTE   B17           5815  742.5   338    -88             -9 ██████████████░░░░░░   0.0 s serving"),
       "");
-  EXPECT_NE(lineWith("742.5   316   -112    -24     -15 ██████░░░░░░░░░░░░░░  24.0 s served 15.0 s ago"), "");
+  EXPECT_NE(lineWith("742.5   316   -112   -24      -15 ██████░░░░░░░░░░░░░░  24.0 s served 15.0 s ago"), "");
 }
 
 TEST_F(PanelsTest, TheOverviewTellsOfTheServingCellWhatIsTrueOfIt) {
@@ -152,7 +152,7 @@ TEST_F(PanelsTest, TheOverviewTellsOfTheServingCellWhatIsTrueOfIt) {
   EXPECT_NE(lineWith("age 0.0 s, of PCI 338"), "");
   EXPECT_EQ(lineWith("Srxlev"), "") << "what the cell before has broadcast";
   EXPECT_EQ(lineWith("agrees"), "");
-  EXPECT_NE(lineWith("338    -88    +30      -9 ██████████████░░░░░░   5.1 s re-established 9.9 s ago"), "");
+  EXPECT_NE(lineWith("338    -88   +30       -9 ██████████████░░░░░░   5.1 s re-established 9.9 s ago"), "");
   drive_.play({lteCell(31'000, 2000, 63), lteNeighbors(31'100, {{2000, 62, -100}, {2000, 7, -99, 36}}),
                lteLevel(31'200, -90, -12)});
   EXPECT_NE(lineWith("0.1 s served 0.2 s ago"), "");

@@ -238,7 +238,7 @@ TEST_F(PresenterTest, NamesTheKeysThatDoSomething) {
   Desk replay(interface_.stack(), {120, 10}, surroundings_);
   replay.type(U" ");
   EXPECT_EQ(replay.line(9),
-            " ? help  Enter open  / filter  Space go on  q quit  < 10 s back  > forward  + faster  - slower");
+            " ? help  Enter open  / filter  Space go on  q quit  < 10 s back  > 10 s forward  + faster  - slower");
 }
 
 TEST_F(PresenterTest, ShowsAnotherMomentOnceItHasComeWithSelectionAndPlaceKept) {

@@ -21,7 +21,7 @@ const KeyBinding kBindings[] = {
     {Action::Filter, {letter(U'/')}, "filter", "show only rows with what is typed"},
     {Action::Freeze, {letter(U' '), letter(U'f')}, "hold", "hold all that shows, and the replay; intake goes on"},
     {Action::Backward, {letter(U'<')}, "10 s back", "10 s back in the replay"},
-    {Action::Forward, {letter(U'>')}, "forward", "10 s forward in the replay"},
+    {Action::Forward, {letter(U'>')}, "10 s forward", "10 s forward in the replay"},
     {Action::Faster, {letter(U'+')}, "faster", "a faster replay"},
     {Action::Slower, {letter(U'-')}, "slower", "a slower replay"},
     {Action::Readings, {letter(U'u')}, "", "show or hide what the values mean"},

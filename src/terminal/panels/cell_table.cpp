@@ -116,8 +116,8 @@ constexpr std::array kColumns{
     CellColumn{"MHz", 6, true, 60, frequencyText, frequencyRank},
     CellColumn{"code", 5, true, 0, codeText, codeRank},
     CellColumn{"level", 6, true, 0, levelText, levelRank, true},
-    CellColumn{"diff", 6, true, 0, differenceText, differenceRank, true},
-    CellColumn{"quality", 7, true, 50, qualityText, qualityRank, true},
+    CellColumn{"diff", 5, true, 0, differenceText, differenceRank, true},
+    CellColumn{"quality", 8, true, 50, qualityText, qualityRank, true},
     CellColumn{"", 20, false, 104, nothing},
     CellColumn{"age", 6, true, 64, ageText, ageRank},
     CellColumn{"note", 25, false, 78, nothing, noteRank},
@@ -125,9 +125,20 @@ constexpr std::array kColumns{
 // clang-format on
 constexpr std::size_t kLevelBarColumn = 8;
 constexpr std::size_t kNoteColumn = 10;
-/// All columns but the bar, whose width is what they leave.
-constexpr int kColumnsBesideBar = 96;
 constexpr int kTableGutter = 2;
+
+constexpr int gapAfter(const CellColumn& column) {
+  return column.isAtRight ? 1 : 2;
+}
+
+/// What all columns take but the bar, whose width is what they leave.
+constexpr int kBesideBar = [] {
+  int columns = kTableGutter - kColumns[kLevelBarColumn].width - gapAfter(kColumns.back());
+  for (const CellColumn& column : kColumns)
+    columns += column.width + gapAfter(column);
+  return columns;
+}();
+static_assert(kColumns[kLevelBarColumn].fromColumns > kBesideBar, "a bar has some width wherever there is one");
 
 Role textRole(std::size_t column, const HeardCell& cell) {
   constexpr std::size_t kLevel = 5;
@@ -178,9 +189,9 @@ CellTable::CellTable(int columns) {
   for (std::size_t column = 0; column < kColumns.size(); ++column) {
     const CellColumn& each = kColumns[column];
     if (columns < each.fromColumns) continue;
-    const int width = column == kLevelBarColumn ? std::min(each.width, columns - kColumnsBesideBar) : each.width;
+    const int width = column == kLevelBarColumn ? std::min(each.width, columns - kBesideBar) : each.width;
     places_.push_back({column, start, std::min(start + width, columns)});
-    start += width + (each.isAtRight ? 1 : 2);
+    start += width + gapAfter(each);
   }
 }
 

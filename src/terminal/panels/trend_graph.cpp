@@ -168,7 +168,7 @@ void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const
     return;
   }
   const TrendScale scale = TrendScale::covering(range->min, range->max, rows);
-  // A bar that fills a row has its label's value; a line that enters it, too.
+  // A bar has the label's value where it fills the row, a line where it enters the row.
   drawScale(canvas, isDotted() ? scale.low : scale.low + scale.step, scale.step, rows);
   const Canvas field = canvas.part({kScaleColumns, 0, canvas.columns() - kScaleColumns, rows});
   if (isDotted()) {
