@@ -182,13 +182,13 @@ TEST(Picture, ShowsTheHelpFromTheTableOfKeys) {
   Desk desk(interface.stack(), {80, 32});
   desk.type(U"?");
   EXPECT_EQ(desk.line(1), "  Keys");
-  EXPECT_EQ(desk.line(4), "  Esc ← h Backspace  clear the filter, go back");
-  EXPECT_EQ(desk.line(6), "  Space f            hold all that shows, and the replay; intake goes on");
+  EXPECT_EQ(desk.line(4), "  Esc Left h Backspace  clear the filter, go back");
+  EXPECT_EQ(desk.line(6), "  Space f               hold all that shows, and the replay; intake goes on");
   EXPECT_EQ(desk.line(31), " Esc back  q quit");
   desk.resize({40, 10});
   desk.type(U"GG");
-  EXPECT_EQ(desk.line(7), "                     there");
-  EXPECT_EQ(desk.line(8), "  wheel, drag        scroll");
+  EXPECT_EQ(desk.line(7), "                        bar: go there");
+  EXPECT_EQ(desk.line(8), "  wheel, drag           scroll");
   desk.press(Key::Escape);
   EXPECT_EQ(desk.line(2), "  Device Info                        ›");
   Surroundings dated;

@@ -15,10 +15,10 @@ struct Stand {
 /// What a terminal for ASCII shows in the place of this program's own signs.
 constexpr std::array kAsciiStands{
     Stand{"›", '>'}, Stand{"•", '*'}, Stand{"…", '~'}, Stand{"·", '-'}, Stand{"↑", '^'}, Stand{"↓", 'v'},
-    Stand{"←", '<'}, Stand{"→", '>'}, Stand{"│", '|'}, Stand{"█", '#'}, Stand{"×", 'x'}, Stand{"▏", '_'},
-    Stand{"–", '-'}, Stand{"░", '.'}, Stand{"▸", '>'}, Stand{"─", '-'}, Stand{"┆", ':'}, Stand{"┌", '+'},
-    Stand{"┐", '+'}, Stand{"└", '+'}, Stand{"┘", '+'}, Stand{"├", '+'}, Stand{"┤", '+'}, Stand{"┬", '+'},
-    Stand{"┴", '+'}, Stand{"┼", '+'}, Stand{"▶", '>'}, Stand{"▮", '|'},
+    Stand{"│", '|'}, Stand{"█", '#'}, Stand{"×", 'x'}, Stand{"▏", '_'}, Stand{"–", '-'}, Stand{"░", '.'},
+    Stand{"▸", '>'}, Stand{"─", '-'}, Stand{"┆", ':'}, Stand{"┌", '+'}, Stand{"┐", '+'}, Stand{"└", '+'},
+    Stand{"┘", '+'}, Stand{"├", '+'}, Stand{"┤", '+'}, Stand{"┬", '+'}, Stand{"┴", '+'}, Stand{"┼", '+'},
+    Stand{"▶", '>'}, Stand{"▮", '|'},
 };
 
 /// Writes cells to a terminal whose cursor and look it keeps track of.

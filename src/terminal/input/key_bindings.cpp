@@ -108,13 +108,13 @@ std::string nameOf(const BoundKey& key) {
     case Key::Tab:
       return "Tab";
     case Key::Up:
-      return "↑";
+      return "Up";
     case Key::Down:
-      return "↓";
+      return "Down";
     case Key::Left:
-      return "←";
+      return "Left";
     case Key::Right:
-      return "→";
+      return "Right";
     case Key::PageUp:
       return "PgUp";
     case Key::PageDown:

@@ -78,7 +78,7 @@ struct TypingBinding {
 
 [[nodiscard]] std::optional<Action> actionOf(const KeyEvent& event);
 
-/// "Enter", "↑", "f".
+/// "Enter", "Up", "f".
 [[nodiscard]] std::string nameOf(const BoundKey& key);
 /// The names of all keys of a binding, with blanks between them.
 [[nodiscard]] std::string namesOf(const KeyBinding& binding);
