@@ -93,13 +93,17 @@ TEST(LookBack, LeavesWhatPlayingUpToThereLeaves) {
   expectTheSame(follower.arrive());
   follower.player().seek(20);
   EXPECT_LT(follower.arrive().insight.counts().all, count);
-  follower.player().seekToEvent(count);
+  ReplayControl control([](const std::string& line) { FAIL() << line; });
+  control.setPlayer(&follower.player());
+  follower.player().setSpeed(std::nullopt);
+  control.goTo({.event = count - 1});
   expectTheSame(follower.arrive());
+  EXPECT_EQ(follower.player().state().speed, 1.0) << "it would not stay at that moment";
 }
 
 TEST(LookBack, IsRefusedInOneLineWhereThereIsNoWayBack) {
-  std::vector<std::string> refusals;
-  ReplayControl control([&](const std::string& reason) { refusals.push_back(reason); });
+  std::vector<std::string> lines;
+  ReplayControl control([&](const std::string& line) { lines.push_back(line); });
   control.jump(std::chrono::seconds(10));
   control.changeSpeed(1);
   const SteadyClock clock;
@@ -114,8 +118,10 @@ TEST(LookBack, IsRefusedInOneLineWhereThereIsNoWayBack) {
     control.changeSpeed(step);
   EXPECT_EQ(player.state().speed, 5.0);
   const std::string pipeHasNone = "a pipe has no way back; replay a file to go back and forth";
-  EXPECT_EQ(refusals, (std::vector<std::string>{"only a replay goes back and forth", "only a replay has another speed",
-                                                pipeHasNone, pipeHasNone}));
+  const std::string speed = "the replay's speed: ";
+  EXPECT_EQ(lines, (std::vector<std::string>{"only a replay goes back and forth", "only a replay has another speed",
+                                             pipeHasNone, pipeHasNone, speed + "×2", speed + "×5", speed + "×10",
+                                             speed + "×5"}));
   EXPECT_EQ(nextSpeed(1000.0, 1), std::nullopt);
   EXPECT_EQ(nextSpeed(std::nullopt, -1), 1000.0);
   EXPECT_EQ(nextSpeed(0.05, -1), 0.05);

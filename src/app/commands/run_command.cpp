@@ -284,8 +284,8 @@ class Run {
   EventSource source_;
   insight::Insight insight_;
   ShownMoment moment_{clock_, insight_, [this] { return source_.state().pace; }};
-  ReplayControl control_{[this](const std::string& reason) {
-    if (terminal_ != nullptr) terminal_->tell(reason, false);
+  ReplayControl control_{[this](const std::string& line) {
+    if (terminal_ != nullptr) terminal_->tell(line, false);
   }};
   /// By the user.
   bool isHeld_ = false;

@@ -8,6 +8,7 @@
 #include "app/source/events_input.h"
 #include "app/source/recording_input.h"
 #include "app/source/recording_service.h"
+#include "app/source/replay_control.h"
 #include "diag/framing/frame.h"
 #include "diag/port/port_service.h"
 #include "handset/handset_service.h"
@@ -27,14 +28,6 @@ std::string playingTime(double seconds) {
   } else {
     std::snprintf(text, sizeof text, "%ld:%02ld:%02ld", whole / 3600, whole / 60 % 60, whole % 60);
   }
-  return text;
-}
-
-/// "×1", "×0.5", "×max".
-std::string speedText(const std::optional<double>& speed) {
-  if (!speed) return "×max";
-  char text[32];
-  std::snprintf(text, sizeof text, "×%g", *speed);
   return text;
 }
 

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cstdio>
 
 namespace vesk {
 
@@ -10,6 +11,13 @@ namespace {
 constexpr std::array kSpeeds{0.1, 0.2, 0.5, 1.0, 2.0, 5.0, 10.0, 20.0, 50.0, 100.0, 200.0, 500.0, 1000.0};
 
 }  // namespace
+
+std::string speedText(const std::optional<double>& speed) {
+  if (!speed) return "×max";
+  char text[32];
+  std::snprintf(text, sizeof text, "×%g", *speed);
+  return text;
+}
 
 std::optional<double> nextSpeed(std::optional<double> speed, int step) {
   if (step > 0) {
@@ -20,12 +28,14 @@ std::optional<double> nextSpeed(std::optional<double> speed, int step) {
   return notSlower == kSpeeds.begin() ? std::min(*speed, kSpeeds.front()) : *(notSlower - 1);
 }
 
-corvik::Player* ReplayControl::seekable() {
+corvik::Player* ReplayControl::readyToSeek() {
   if (player_ == nullptr) {
-    refuse_("only a replay goes back and forth");
-  } else if (!player_->state().duration) {
-    refuse_("a pipe has no way back; replay a file to go back and forth");
+    tell_("only a replay goes back and forth");
+  } else if (!isSeekable()) {
+    tell_("a pipe has no way back; replay a file to go back and forth");
   } else {
+    // One that never waits would leave the moment at once.
+    if (!player_->state().speed) player_->setSpeed(1.0);
     return player_;
   }
   return nullptr;
@@ -36,17 +46,21 @@ void ReplayControl::setHeld(bool isHeld) {
 }
 
 void ReplayControl::changeSpeed(int step) {
-  if (player_ == nullptr) return refuse_("only a replay has another speed");
-  player_->setSpeed(nextSpeed(player_->state().speed, step));
+  if (player_ == nullptr) return tell_("only a replay has another speed");
+  const corvik::PlaybackState before = player_->state();
+  const std::optional<double> speed = nextSpeed(before.speed, step);
+  player_->setSpeed(speed);
+  const bool isShown = before.phase == corvik::PlaybackState::Phase::playing && before.duration;
+  if (!isShown) tell_("the replay's speed: " + speedText(speed));
 }
 
 void ReplayControl::jump(std::chrono::seconds distance) {
-  corvik::Player* player = seekable();
+  corvik::Player* player = readyToSeek();
   if (player != nullptr) player->seek(player->state().position + static_cast<double>(distance.count()));
 }
 
 void ReplayControl::goTo(const insight::Moment& moment) {
-  corvik::Player* player = seekable();
+  corvik::Player* player = readyToSeek();
   if (player != nullptr) player->seekToEvent(moment.event + 1);
 }
 

@@ -62,19 +62,16 @@ bool isNotable(EventKind kind) {
   return std::find(kOrdinary.begin(), kOrdinary.end(), kind) == kOrdinary.end();
 }
 
-void drawMarks(const Canvas& canvas, int column, int line, const insight::Present& drive, const TrendSpan& span,
-               int slotsPerColumn) {
-  std::vector<const EventMark*> marks(static_cast<std::size_t>(span.slots / slotsPerColumn), nullptr);
+std::vector<const EventMark*> marksOf(const insight::Present& drive, const TrendSpan& span, int slotsPerPlace) {
+  std::vector<const EventMark*> marks(static_cast<std::size_t>(span.slots / slotsPerPlace), nullptr);
   for (auto each = firstSince(drive, span.start); each != drive.happenings().end(); ++each) {
     const auto slot = span.slotOf(each->moment.position);
     const EventMark* mark = markOf(*each);
     if (!slot || mark == nullptr) continue;
-    const EventMark*& place = marks[static_cast<std::size_t>(*slot / slotsPerColumn)];
+    const EventMark*& place = marks[static_cast<std::size_t>(*slot / slotsPerPlace)];
     if (place == nullptr || mark < place) place = mark;
   }
-  for (std::size_t index = 0; index < marks.size(); ++index)
-    if (marks[index] != nullptr)
-      canvas.write(column + static_cast<int>(index), line, marks[index]->sign, marks[index]->role);
+  return marks;
 }
 
 std::vector<insight::Moment> breaksOf(const insight::Present& drive) {

@@ -33,10 +33,10 @@ struct EventMark {
 /// bearers come and go all the time.
 [[nodiscard]] bool isNotable(insight::EventKind kind);
 
-/// Draws on one line which events happened when: of those in one place the mark that matters most. A place is
-/// `slotsPerColumn` slots of the span.
-void drawMarks(const Canvas& canvas, int column, int line, const insight::Present& drive, const TrendSpan& span,
-               int slotsPerColumn);
+/// Which events happened when: of those in one place the mark that matters most, null where there is none. A place is
+/// `slotsPerPlace` slots of the span.
+[[nodiscard]] std::vector<const EventMark*> marksOf(const insight::Present& drive, const TrendSpan& span,
+                                                    int slotsPerPlace);
 
 /// Where values were forgotten, in order.
 [[nodiscard]] std::vector<insight::Moment> breaksOf(const insight::Present& drive);

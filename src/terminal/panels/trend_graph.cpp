@@ -119,6 +119,12 @@ void drawScale(const Canvas& canvas, double first, double step, int rows) {
   }
 }
 
+void drawMarks(const Canvas& canvas, int line, const std::vector<const EventMark*>& marks) {
+  for (std::size_t place = 0; place < marks.size(); ++place)
+    if (const EventMark* mark = marks[place])
+      canvas.write(TrendGraph::kScaleColumns + static_cast<int>(place), line, mark->sign, mark->role);
+}
+
 }  // namespace
 
 TrendScale TrendScale::covering(double min, double max, int rows) {
@@ -149,11 +155,15 @@ TrendSpan TrendGraph::spanOf(const insight::Present& drive, int columns) const {
   return TrendSpan::endingAt(drive.position(), step, slotsFor(columns));
 }
 
+std::vector<const EventMark*> TrendGraph::marks(const insight::Present& drive, int columns) const {
+  return marksOf(drive, spanOf(drive, columns), isDotted() ? kDotColumns : 1);
+}
+
 void TrendGraph::draw(const Canvas& canvas, const insight::Present& drive) const {
   const TrendSpan span = spanOf(drive, canvas.columns());
   const int rows = canvas.lines() - 1;
   if (rows < 1) return;
-  drawMarks(canvas, kScaleColumns, rows, drive, span, isDotted() ? kDotColumns : 1);
+  drawMarks(canvas, rows, marks(drive, canvas.columns()));
   const std::vector<insight::Moment> breaks = breaksOf(drive);
   const Slots slots = slotValues(drive.trend().points(kpi), span, breaks);
   std::optional<TrendValues> range;

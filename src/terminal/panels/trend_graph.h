@@ -7,6 +7,7 @@
 #include "insight/present.h"
 #include "terminal/device/signs.h"
 #include "terminal/panels/canvas.h"
+#include "terminal/panels/event_marks.h"
 #include "terminal/panels/trend_span.h"
 
 namespace vesk {
@@ -41,6 +42,8 @@ struct TrendGraph {
   /// Slots for a graph that takes `columns` with its scale.
   [[nodiscard]] int slotsFor(int columns) const;
   [[nodiscard]] TrendSpan spanOf(const insight::Present& drive, int columns) const;
+  /// What stands below it, by column; null where nothing does.
+  [[nodiscard]] std::vector<const EventMark*> marks(const insight::Present& drive, int columns) const;
   void draw(const Canvas& canvas, const insight::Present& drive) const;
 
  private:

@@ -4,10 +4,10 @@
 #include <array>
 #include <cmath>
 #include <string>
+#include <vector>
 
 #include "insight/text_forms.h"
 #include "terminal/panels/cell_words.h"
-#include "terminal/panels/event_marks.h"
 #include "terminal/panels/kpi_look.h"
 #include "terminal/panels/trend_graph.h"
 
@@ -19,11 +19,11 @@ namespace {
 constexpr std::array<std::int64_t, 6> kLengths{60'000, 120'000, 300'000, 600'000, 1'800'000, 3'600'000};
 constexpr int kLinesForLegend = 12;
 
-/// What the signs stand for that the graph may bear: of the events since `start`.
-void drawLegend(const Canvas& canvas, int line, const insight::Present& drive, std::int64_t start) {
+/// What the signs stand for that the graph bears.
+void drawLegend(const Canvas& canvas, int line, const std::vector<const EventMark*>& marks) {
   int column = TrendGraph::kScaleColumns;
   for (const EventMark& mark : eventMarks()) {
-    if (countSince(drive, mark, start) == 0) continue;
+    if (std::find(marks.begin(), marks.end(), &mark) == marks.end()) continue;
     if (column + textWidth(mark.meaning) + 2 > canvas.columns()) return;
     column = canvas.write(column, line, mark.sign, mark.role) + 1;
     column = canvas.write(column, line, mark.meaning, Role::Faint) + 2;
@@ -54,7 +54,7 @@ void TrendPanel::draw(const Canvas& canvas) {
   const int axis = 2 + graphLines;
   canvas.write(TrendGraph::kScaleColumns, axis, "-" + lastingText(span.length()), Role::Faint);
   canvas.writeRight(canvas.columns() - 1, axis, "now", Role::Faint);
-  if (hasLegend) drawLegend(canvas, axis + 1, drive, span.start);
+  if (hasLegend) drawLegend(canvas, axis + 1, graph.marks(drive, canvas.columns() - 1));
 }
 
 void TrendPanel::drawFigures(const Canvas& canvas, std::int64_t start) const {
