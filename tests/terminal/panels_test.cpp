@@ -201,10 +201,12 @@ TEST_F(PanelsTest, LieOverTheTablesAndGoBackToThem) {
 }
 
 TEST_F(PanelsTest, HeldPanelsStandStillWhileTheDriveGoesOn) {
-  show(smallDrive(), {80, 24});
+  surroundings_.isSeekable = true;
+  show(smallDrive(), {100, 24});
   desk_->type(U"of");
   const std::string held = desk_->picture();
   EXPECT_NE(held.find("HELD"), std::string::npos);
+  EXPECT_NE(held.find("c cells  Space go on  q quit  < 10 s back"), std::string::npos);
   drive_.play({lteLevel(26'000, -70)});
   EXPECT_EQ(desk_->picture(), held);
   desk_->type(U"f");

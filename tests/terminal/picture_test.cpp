@@ -101,6 +101,8 @@ TEST(Picture, TellsHowOldTheRowsAreInTheDrivesTimeAndHowOftenTheMetricCame) {
   surroundings.driveMoment = [&] { return moment; };
   Desk desk(interface.stack(), {40, 10}, surroundings);
   EXPECT_EQ(desk.line(1), "  Tx Power  never");
+  arrivals = Arrivals{moment.time, 1};
+  EXPECT_EQ(desk.line(1), "  Tx Power  arrived, not shown yet");
   EXPECT_EQ(asked, "LTE/Tx Power");
   EXPECT_EQ(desk.presenter().nextChange(), std::nullopt);
 

@@ -96,7 +96,7 @@ class Run {
     root_ = &root;
     if (!isHeadless_) openTerminal(application, root);
     std::optional<Timer> aging;
-    if (!isHeadless_) aging.emplace(loop_, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { growOlder(); });
+    if (!isHeadless_) aging.emplace(loop_, std::chrono::seconds(1), RunLoopMode::defaultMode, [this] { showAging(); });
     if (isJudging_ || !isHeadless_) insight_.observeEventsOf(*MetricValidator::shared());
     const std::optional<std::string> reason = whyNoMetricArrives(root);
     if (reason) tell(*reason);
@@ -121,10 +121,11 @@ class Run {
 
   /// What is known grows old while no event comes, too.
   void growOlder() {
-    const std::int64_t later = moment_.sinceLastEvent();
-    if (isOnTheWay_ || later == 0) return;
-    insight_.setLater(later);
-    terminal_->setNeedsDisplay();
+    if (!isOnTheWay_) insight_.setLater(moment_.sinceLastEvent());
+  }
+
+  void showAging() {
+    if (!isOnTheWay_ && moment_.sinceLastEvent() > 0) terminal_->setNeedsDisplay();
   }
 
   void openTerminal(Application& application, NavigationController& root) {
@@ -165,11 +166,15 @@ class Run {
     MetricValidator::shared()->setArrivalObserver(nullptr);
     terminal_.reset();
     // What only the diagnostic lines have told is seen by nobody any more.
-    if (!isHeadless_ && firstFault_) tellUser(*firstFault_);
+    if (isHeadless_ || faults_ == 0) return;
+    tellUser(firstFault_);
+    const std::string more = std::to_string(faults_ - 1) + (faults_ == 2 ? " more fault" : " more faults");
+    if (faults_ > 1) tellUser("vesk: " + more + "; --headless tells each");
   }
 
   Surroundings surroundings(Application& application) {
     Surroundings surroundings{
+        .growOlder = [this] { growOlder(); },
         .sourceState = [this] { return sourceState(); },
         .isSeekable = control_.isSeekable(),
         .setHeld = [this](bool isHeld) { setHeld(isHeld); },
@@ -249,7 +254,7 @@ class Run {
   /// To the user where there are no screens, and to the diagnostic lines where there are.
   void tell(const std::string& line) {
     outcome_ = Outcome::failed;
-    if (!firstFault_) firstFault_ = line;
+    if (faults_++ == 0) firstFault_ = line;
     show(line);
   }
 
@@ -276,7 +281,8 @@ class Run {
   /// When nobody is waited for any more; absent for never.
   std::optional<Clock::Instant> end_;
   Outcome outcome_ = Outcome::done;
-  std::optional<std::string> firstFault_;
+  std::size_t faults_ = 0;
+  std::string firstFault_;
   RunLoop loop_{clock_};
   const WakeUp& stopSignal_ = stopMainLoopOnSignals();
   DiagnosticLines diagnostics_;

@@ -33,6 +33,7 @@ void Presenter::expectChange(std::optional<Clock::Instant> when) {
 }
 
 Picture Presenter::picture(Clock::Instant now) {
+  if (surroundings_.growOlder) surroundings_.growOlder();
   followStack();
   nextChange_.reset();
   Picture picture{.size = size_};
@@ -98,7 +99,11 @@ void Presenter::fillTable(Picture& picture, Clock::Instant now) {
   const std::vector<std::string> titles = this->titles();
   if (!titles.empty()) picture.title = titles.back();
   if (titles.size() == kDepthOfMetrics && screens_.back().arrivals) {
-    picture.freshness = timeBound(freshnessOf(*screens_.back().arrivals, driveTime()), now);
+    const Arrivals& shown = *screens_.back().arrivals;
+    // The rows are taken over every few seconds only.
+    const bool isToCome =
+        !shown.last && !isHolding() && surroundings_.arrivals(titles[1], titles[2]).value_or(Arrivals{}).last;
+    picture.freshness = isToCome ? "arrived, not shown yet" : timeBound(freshnessOf(shown, driveTime()), now);
     const std::string instead = technologyInstead(titles[1], titles[2]);
     if (!instead.empty()) picture.freshness += ", the handset is on " + instead;
   }

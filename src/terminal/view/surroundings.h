@@ -43,6 +43,8 @@ struct Arrivals {
 /// What the terminal shows besides the screens, and whom it tells. Every member is optional; all are called
 /// on the main queue.
 struct Surroundings {
+  /// Called before everything that is drawn: what grows old by itself is to be as of now.
+  std::function<void()> growOlder{};
   std::function<SourceState()> sourceState{};
   /// Absent for an area and category that no metric feeds.
   std::function<std::optional<Arrivals>(std::string_view area, std::string_view category)> arrivals{};
