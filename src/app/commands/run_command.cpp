@@ -168,8 +168,9 @@ class Run {
     // What only the diagnostic lines have told is seen by nobody any more.
     if (isHeadless_ || faults_ == 0) return;
     tellUser(firstFault_);
+    if (faults_ == 1) return;
     const std::string more = std::to_string(faults_ - 1) + (faults_ == 2 ? " more fault" : " more faults");
-    if (faults_ > 1) tellUser("vesk: " + more + "; --headless tells each");
+    tellUser("vesk: " + more + "; --headless tells each");
   }
 
   Surroundings surroundings(Application& application) {

@@ -25,7 +25,8 @@ class ReplayControl {
   void setHeld(bool isHeld);
   /// One step faster for +1, slower for -1.
   void changeSpeed(int step);
-  /// From a replay that does not wait, this and the next go on at the drive's own speed.
+  /// Forward, or back. A replay that never waits goes on from there at the drive's own speed, and so it does from
+  /// where goTo() leads.
   void jump(std::chrono::seconds distance);
   /// To the moment at which its metric event had just come.
   void goTo(const insight::Moment& moment);
