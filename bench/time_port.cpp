@@ -133,7 +133,8 @@ std::vector<Instant::duration> timeProgram(std::size_t frames) {
   const EventSource source = makeEventSource(
       options, clock,
       {fail, [](const std::string& /*remark*/) {},
-       [&](const std::optional<std::string>& failure) { fail(failure.value_or("")); }, nullptr, nullptr});
+       [&](const std::optional<std::string>& failure) { fail(failure.value_or("")); }, nullptr, nullptr},
+      nullptr);
   if (source.failure) stop(*source.failure);
   corvik::installService(source.service);
 

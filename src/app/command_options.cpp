@@ -105,9 +105,7 @@ void addFile(CLI::App& command, RecordingInput& input, const std::string& descri
 }
 
 void addRedactOption(CLI::App& command, bool& isRedacted) {
-  CLI::Option* redact = command.add_flag("--redact", isRedacted, "Without the subscriber's identities and addresses");
-  // What is kept is what came, identities included.
-  if (CLI::Option* record = command.get_option_no_throw("--record")) redact->excludes(record);
+  command.add_flag("--redact", isRedacted, "Without the subscriber's identities and addresses");
 }
 
 /// Each --rule takes one.

@@ -2,6 +2,8 @@
 
 #include "app/vesk_program.h"
 #include "diag/framing/frame.h"
+#include "messages/nas/nas.h"
+#include "messages/registry/metric_identifiers.h"
 #include "support/bytes.h"
 
 namespace vesk {
@@ -97,6 +99,21 @@ TEST(Capture, IsReadForTheSimThatIsChosen) {
     EXPECT_EQ(run(both, {"--sim", "2"}).output, run(second, {}).output) << command[0];
     EXPECT_NE(run(recording, {"--sim", "2"}).error.find(" is a recording"), std::string::npos) << command[0];
   }
+}
+
+TEST(Record, KeepsNoIdentitiesWhereTheyAreLeftOut) {
+  const auto bearer = std::make_shared<metrics::BearerContext>();
+  bearer->setApn("private.mnc410"_text);
+  metrics::KCellularActivatedBearerContexts bearers;
+  bearers.addBearerContexts(bearer);
+  const TemporaryFile recording(recorded(0, K_CELLULAR_ACTIVE_BEARER, bearers));
+  const TemporaryFile kept("");
+  EXPECT_EQ(
+      vesk({"--headless", "--speed", "max", "--redact", "--replay", recording.path(), "--record", kept.path()}).status,
+      0);
+  const std::string events = vesk({"decode", kept.path()}).output;
+  EXPECT_NE(events.find("xxxxxxx.mnc410"), std::string::npos) << events;
+  EXPECT_EQ(events, vesk({"decode", "--redact", recording.path()}).output);
 }
 
 TEST(Record, KeepsWhatComesAndOverwritesNothing) {

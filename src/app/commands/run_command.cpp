@@ -50,15 +50,14 @@ class Run {
                                [this](const std::string& remark) { show("vesk: " + remark); },
                                [this](const std::optional<std::string>& failure) { sourceEnded(failure); },
                                [this](bool isFromStart) { seekBegun(isFromStart); },
-                               [this](double sinceLastEvent) { seekEnded(sinceLastEvent); }});
+                               [this](double sinceLastEvent) { seekEnded(sinceLastEvent); }},
+                              options_.isRedacted ? &redaction_ : nullptr);
     control_.setPlayer(source_.player);
     if (source_.failure) {
       tellUser("vesk: " + *source_.failure);
       return Outcome::failed;
     }
-    const std::shared_ptr<corvik::Service> service =
-        options_.isRedacted ? makeRedactedService(source_.service, redaction_) : source_.service;
-    corvik::installService(service);
+    corvik::installService(source_.service);
     if (isHeadless_) {
       printLines();
     } else {
@@ -68,7 +67,7 @@ class Run {
     const int status = application.run([&](NavigationController& root) { mainLoop(application, root); });
     if (status != 0) outcome_ = Outcome::failed;
     // The connection outlives all that the service was made of here.
-    service->shutDown();
+    source_.service->shutDown();
     redaction_.tellLeftOut();
     OutputLines::setSink(nullptr);
     return isHeadless_ && insight_.alerts() > 0 ? Outcome::ruleFired : outcome_;

@@ -48,18 +48,17 @@ class Serving {
                                [this](const std::optional<std::string>& failure) {
                                  if (failure) fail("vesk: " + *failure);
                                },
-                               nullptr, nullptr});
+                               nullptr, nullptr},
+                              options_.isRedacted ? &redaction_ : nullptr);
     if (source_.failure) {
       fail("vesk: " + *source_.failure);
       return outcome_;
     }
-    const std::shared_ptr<corvik::Service> service =
-        options_.isRedacted ? makeRedactedService(source_.service, redaction_) : source_.service;
-    corvik::installService(service);
+    corvik::installService(source_.service);
     Application application(veskInterface(), delegate_);
     if (application.run([this](NavigationController& root) { mainLoop(root); }) != 0) outcome_ = Outcome::failed;
     // The connection outlives all that the service was made of here.
-    service->shutDown();
+    source_.service->shutDown();
     redaction_.tellLeftOut();
     return insight_.alerts() > 0 ? Outcome::ruleFired : outcome_;
   }

@@ -57,6 +57,10 @@ ShownState stateOfPort(const std::string& port, const diag::PortState& state) {
   return {text, true};
 }
 
+double secondsOf(const Clock& clock) {
+  return std::chrono::duration<double>(clock.now().time_since_epoch()).count();
+}
+
 /// Keeps every frame in `file`; `failed` is told, on the main queue, when that is no longer possible.
 diag::PortService::FrameHandler keepFrames(std::shared_ptr<RecordFile> file,
                                            std::function<void(const std::string&)> failed) {
@@ -78,15 +82,15 @@ EventSource makePortSource(const SourceOptions& options, std::unique_ptr<RecordF
   service->setEndHandler([ended = std::move(handlers.ended)](const std::string& failure) { ended(failure); });
   if (file != nullptr) service->setFrameHandler(keepFrames(std::move(file), std::move(handlers.badLine)));
   diag::PortService& watched = *service;
-  return {std::move(service), [&watched, port = *options.port] { return stateOfPort(port, watched.state()); }};
+  return {std::move(service), [&watched, port = *options.port] { return stateOfPort(port, watched.state()); },
+          std::nullopt, [&clock] { return secondsOf(clock); }};
 }
 
 EventSource makeSimulatedSource(const SourceOptions& options, const Clock& clock) {
   const auto sinceEpoch = std::chrono::system_clock::now().time_since_epoch();
   const auto now = std::chrono::duration_cast<std::chrono::milliseconds>(sinceEpoch).count();
   return {std::make_shared<handset::HandsetService>(options.seed, static_cast<std::uint64_t>(now), clock),
-          [] { return ShownState{"simulated"}; }, std::nullopt,
-          [&clock] { return std::chrono::duration<double>(clock.now().time_since_epoch()).count(); }};
+          [] { return ShownState{"simulated"}; }, std::nullopt, [&clock] { return secondsOf(clock); }};
 }
 
 EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
@@ -139,17 +143,23 @@ ShownState stateOfReplay(const corvik::PlaybackState& state, bool isLive) {
   return {text, isMoving, isMoving && !state.isSeeking ? state.speed.value_or(0) : 0};
 }
 
-EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers) {
+EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers,
+                            Redaction* redaction) {
   std::string reason;
   std::unique_ptr<RecordFile> file;
   if (options.record) {
     file = RecordFile::create(*options.record, reason);
     if (file == nullptr) return {nullptr, nullptr, reason};
   }
-  if (options.port) return makePortSource(options, std::move(file), clock, std::move(handlers));
+  // A capture has identities: where they are to be left out, a recording is kept instead.
+  std::unique_ptr<RecordFile> capture;
+  if (options.port && redaction == nullptr) capture = std::move(file);
   const auto failed = handlers.badLine;
-  EventSource source =
-      options.replay ? makeReplaySource(options, clock, std::move(handlers)) : makeSimulatedSource(options, clock);
+  EventSource source = options.port     ? makePortSource(options, std::move(capture), clock, std::move(handlers))
+                       : options.replay ? makeReplaySource(options, clock, std::move(handlers))
+                                        : makeSimulatedSource(options, clock);
+  if (source.failure) return source;
+  if (redaction != nullptr) source.service = makeRedactedService(std::move(source.service), *redaction);
   if (file != nullptr)
     source.service = std::make_shared<RecordingService>(source.service, std::move(file), source.seconds, failed);
   return source;

@@ -6,6 +6,7 @@
 #include <optional>
 #include <string>
 
+#include "app/source/redaction.h"
 #include "corvik/recorded_service.h"
 #include "corvik/service.h"
 #include "system/clock.h"
@@ -20,7 +21,7 @@ struct SourceOptions {
   std::optional<std::string> port;
   /// Which SIM of a port or a capture; absent for all.
   std::optional<std::uint32_t> sim;
-  /// Where what comes is kept: of a port the capture, of anything else a recording. Absent for nowhere.
+  /// Where what comes is kept: of a port the capture, of anything else, and redacted, a recording. Absent for nowhere.
   std::optional<std::string> record;
   /// Which drive of the handset.
   std::uint64_t seed = 1;
@@ -46,7 +47,7 @@ struct EventSource {
   std::function<ShownState()> state;
   /// Why the recording cannot be read at all, the port not be opened, or nothing be kept.
   std::optional<std::string> failure{};
-  /// How far its own time has come, in seconds from some start; from any thread. Null for a port, whose packets know.
+  /// How far its own time has come, in seconds from some start; from any thread.
   std::function<double()> seconds{};
   /// What steers it; null for a source that is no replay.
   corvik::Player* player = nullptr;
@@ -65,7 +66,9 @@ struct SourceHandlers {
   std::function<void(double sinceLastEvent)> seekEnded;
 };
 
-/// `clock` must outlive the source.
-[[nodiscard]] EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers);
+/// With `redaction`, all that comes is redacted before anybody sees or keeps it; null for what comes as it is. `clock`
+/// and `redaction` must outlive the source.
+[[nodiscard]] EventSource makeEventSource(const SourceOptions& options, const Clock& clock, SourceHandlers handlers,
+                                          Redaction* redaction);
 
 }  // namespace vesk
