@@ -25,12 +25,12 @@ struct Stores {
   friend bool operator==(const Stores&, const Stores&) = default;
 };
 
-/// Whether an event of that metric was stored.
-[[nodiscard]] inline bool hasArrived(const Stores& stores, std::int64_t metric) {
+/// The latest record of that metric; null where no event of it was stored.
+[[nodiscard]] inline const Record* latestRecordOf(const Stores& stores, std::int64_t metric) {
 #define DECODED_METRIC(constant, identifier, Message, record) \
-  if (metric == (identifier)) return stores.record.has_value();
+  if (metric == (identifier)) return stores.record ? &*stores.record : nullptr;
 #include "messages/registry/metrics.def"
-  return false;
+  return nullptr;
 }
 
 /// Calls `visit(name, record)` for the latest record of each kind of metric, in the order of the table of metrics.

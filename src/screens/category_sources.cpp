@@ -36,23 +36,25 @@ constexpr CategorySource record(std::string_view area, std::string_view category
           .metric = metric};
 }
 
-/// A list of a technology store, with a section for each element.
+/// A list of a technology store, with a section for each element: what the metric has under `listKey`.
 template <auto store, auto field, class Element>
 constexpr CategorySource list(std::string_view area, std::string_view category, std::string_view headerPrefix,
-                              std::int64_t metric) {
+                              std::string_view listKey, std::int64_t metric) {
   return {.area = area,
           .category = category,
           .kind = SourceKind::storeList,
           .list = [](const Stores& stores) { return stores.*store.*field; },
           .headerPrefix = headerPrefix,
           .elementClass = Element::kClassName,
+          .listKey = listKey,
           .metric = metric};
 }
 
 /// The first element of such a list.
 template <auto store, auto field, class Element>
-constexpr CategorySource first(std::string_view area, std::string_view category, std::int64_t metric) {
-  CategorySource source = list<store, field, Element>(area, category, {}, metric);
+constexpr CategorySource first(std::string_view area, std::string_view category, std::string_view listKey,
+                               std::int64_t metric) {
+  CategorySource source = list<store, field, Element>(area, category, {}, listKey, metric);
   source.kind = SourceKind::firstElement;
   return source;
 }
@@ -71,44 +73,51 @@ constexpr auto common = &Stores::myCommon;
 constexpr std::array kSources{
     placeholder("Device Info", "IMSI"),
     placeholder("Device Info", "IMEISV"),
-    list<common, &Common::simContents, ElementaryFile>("Device Info", "SIM Files", "SIM Content ", K_SIM_FILE_INFO),
+    list<common, &Common::simContents, ElementaryFile>(
+        "Device Info", "SIM Files", "SIM Content ", "ef_list", K_SIM_FILE_INFO),
 
     latest<&Stores::myLTEEMMContextDict>("LTE", "NAS"),
     latest<&Stores::myLTERRCStateDict>("LTE", "RRC State"),
     latest<&Stores::myLTESCellInfoDict>("LTE", "Serving Cell Info"),
-    first<lte, &LTE::RsrpRsrqSinr, RsrpRsrqSinr>("LTE", "Serving Cell Meas", K_LTE_RSRP_RSRQ_SINR),
-    list<lte, &LTE::TxPower, TxPowerInfo>("LTE", "Tx Power", "TxPowerInfo ", K_LTE_TX_POWER),
+    first<lte, &LTE::RsrpRsrqSinr, RsrpRsrqSinr>("LTE", "Serving Cell Meas", "inst_values", K_LTE_RSRP_RSRQ_SINR),
+    list<lte, &LTE::TxPower, TxPowerInfo>("LTE", "Tx Power", "TxPowerInfo ", "tx_power_info", K_LTE_TX_POWER),
     record<lte, &LTE::SelReselCellInfo>("LTE", "Sel Resel Parameters", K_LTE_SEL_RESEL_INFO),
-    list<lte, &LTE::EutraNbrs, NbrEutra>("LTE", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_LTE_SEL_RESEL_INFO),
+    list<lte, &LTE::EutraNbrs, NbrEutra>(
+        "LTE", "EUTRA Neighbor Info", "EUTRA Neighbor ", "nbr_eutra", K_LTE_SEL_RESEL_INFO),
     latest<&Stores::myLTECDRXConfigDict>("LTE", "C-DRX"),
     list<lte, &LTE::EutraNbrsMeas, EgwErrcNbrEutraMeas>(
-        "LTE", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_LTE_INTRARAT_MEAS),
+        "LTE", "LTE Neighbor Cell Meas", "LTE Neighbor ", "meas_nbr_eutra", K_LTE_INTRARAT_MEAS),
     list<lte, &LTE::UtraNbrsMeas, EgwErrcNbrUtraMeas>(
-        "LTE", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_LTE_INTERRAT_MEAS),
+        "LTE", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", "meas_nbr_utra", K_LTE_INTERRAT_MEAS),
     list<lte, &LTE::GeraNbrsMeas, EgwErrcNbrGeranMeas>(
-        "LTE", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_LTE_INTERRAT_MEAS),
-    list<lte, &LTE::CAStatusList, SecondaryComponentCarrier>("LTE", "CA Status", "Component Carrier ", K_LTE_CA_STATUS),
-    list<common, &Common::activeBearer, BearerContext>("LTE", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
+        "LTE", "GSM Neighbor Cell Meas", "GSM Neighbor ", "meas_nbr_geran", K_LTE_INTERRAT_MEAS),
+    list<lte, &LTE::CAStatusList, SecondaryComponentCarrier>(
+        "LTE", "CA Status", "Component Carrier ", "scc_list", K_LTE_CA_STATUS),
+    list<common, &Common::activeBearer, BearerContext>(
+        "LTE", "Active Bearers", "PDP ", "bearer_contexts", K_CELLULAR_ACTIVE_BEARER),
 
     latest<&Stores::myGMMContextDict>("UMTS", "NAS GMM"),
     latest<&Stores::myMMContextDict>("UMTS", "NAS MM"),
     latest<&Stores::myUMTSRRCStateDict>("UMTS", "RRC State"),
     latest<&Stores::myUMTSRRCConfigDict>("UMTS", "RRC Configuration"),
     latest<&Stores::myUMTSCellInfoDict>("UMTS", "Serving Cell Info"),
-    list<umts, &UMTS::rXInfo, RxInfo>("UMTS", "Serving Cell Meas", "RxInfo ", K_UMTS_SCELL_MEAS),
-    list<umts, &UMTS::TxPower, TxPowerInfo>("UMTS", "Tx Power", "TxPowerInfo ", K_UMTS_TX_POWER),
+    list<umts, &UMTS::rXInfo, RxInfo>("UMTS", "Serving Cell Meas", "RxInfo ", "rx_info", K_UMTS_SCELL_MEAS),
+    list<umts, &UMTS::TxPower, TxPowerInfo>("UMTS", "Tx Power", "TxPowerInfo ", "tx_power_info", K_UMTS_TX_POWER),
     record<umts, &UMTS::SelReselCellInfo>("UMTS", "Sel Resel Parameters", K_UMTS_SEL_RESEL_INFO),
     list<umts, &UMTS::eUtraNbrs, EutraFreqInfo>(
-        "UMTS", "EUTRA Neighbor Info", "EUTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::utraNbrs, UtraFreqInfo>("UMTS", "UTRA Neighbor Info", "UTRA Neighbor ", K_UMTS_SEL_RESEL_INFO),
-    list<umts, &UMTS::geraNbrs, GsmFreqInfo>("UMTS", "GSM Neighbor Info", "GSM Neighbor ", K_UMTS_SEL_RESEL_INFO),
+        "UMTS", "EUTRA Neighbor Info", "EUTRA Neighbor ", "eutra_prio_info", K_UMTS_SEL_RESEL_INFO),
+    list<umts, &UMTS::utraNbrs, UtraFreqInfo>(
+        "UMTS", "UTRA Neighbor Info", "UTRA Neighbor ", "utra_prio_info", K_UMTS_SEL_RESEL_INFO),
+    list<umts, &UMTS::geraNbrs, GsmFreqInfo>(
+        "UMTS", "GSM Neighbor Info", "GSM Neighbor ", "gsm_prio_info", K_UMTS_SEL_RESEL_INFO),
     list<umts, &UMTS::eUtraNbrMeas, LteCellMeasResult>(
-        "UMTS", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_UMTS_NCELL_MEAS),
+        "UMTS", "LTE Neighbor Cell Meas", "LTE Neighbor ", "meas_lte_result", K_UMTS_NCELL_MEAS),
     list<umts, &UMTS::utraNbrMeas, UtraCellMeasResult>(
-        "UMTS", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_UMTS_NCELL_MEAS),
+        "UMTS", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", "meas_utra_result", K_UMTS_NCELL_MEAS),
     list<umts, &UMTS::geraNbrMeas, GsmCellMeasResult>(
-        "UMTS", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_UMTS_NCELL_MEAS),
-    list<common, &Common::activeBearer, BearerContext>("UMTS", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
+        "UMTS", "GSM Neighbor Cell Meas", "GSM Neighbor ", "meas_gsm_result", K_UMTS_NCELL_MEAS),
+    list<common, &Common::activeBearer, BearerContext>(
+        "UMTS", "Active Bearers", "PDP ", "bearer_contexts", K_CELLULAR_ACTIVE_BEARER),
 
     latest<&Stores::myGMMContextDict>("GSM", "NAS GMM"),
     latest<&Stores::myMMContextDict>("GSM", "NAS MM"),
@@ -117,10 +126,14 @@ constexpr std::array kSources{
     latest<&Stores::myGSMIdleScellMeasDict>("GSM", "Idle Serv Cell Meas"),
     latest<&Stores::myGSMConnRfMeasDict>("GSM", "Connected Serv Cell Meas"),
     latest<&Stores::myGSMGPRSConfigDict>("GSM", "GSM GPRS Config"),
-    list<gsm, &GSM::eUtraNbrMeas, LteNcellMeas>("GSM", "LTE Neighbor Cell Meas", "LTE Neighbor ", K_GSM_NCELL_MEAS),
-    list<gsm, &GSM::utraNbrMeas, UmtsNcellMeas>("GSM", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", K_GSM_NCELL_MEAS),
-    list<gsm, &GSM::geraNbrMeas, GsmNcellMeas>("GSM", "GSM Neighbor Cell Meas", "GSM Neighbor ", K_GSM_NCELL_MEAS),
-    list<common, &Common::activeBearer, BearerContext>("GSM", "Active Bearers", "PDP ", K_CELLULAR_ACTIVE_BEARER),
+    list<gsm, &GSM::eUtraNbrMeas, LteNcellMeas>(
+        "GSM", "LTE Neighbor Cell Meas", "LTE Neighbor ", "lte_ncell_meas", K_GSM_NCELL_MEAS),
+    list<gsm, &GSM::utraNbrMeas, UmtsNcellMeas>(
+        "GSM", "UMTS Neighbor Cell Meas", "UMTS Neighbor ", "umts_ncell_meas", K_GSM_NCELL_MEAS),
+    list<gsm, &GSM::geraNbrMeas, GsmNcellMeas>(
+        "GSM", "GSM Neighbor Cell Meas", "GSM Neighbor ", "gsm_ncell_meas", K_GSM_NCELL_MEAS),
+    list<common, &Common::activeBearer, BearerContext>(
+        "GSM", "Active Bearers", "PDP ", "bearer_contexts", K_CELLULAR_ACTIVE_BEARER),
 };
 // clang-format on
 
@@ -163,6 +176,13 @@ RecordList shownRecords(const CategorySource& source, const Stores& stores) {
       break;
   }
   return records;
+}
+
+bool isFilledBy(const CategorySource& source, const Record& record) {
+  if (source.list == nullptr) return true;
+  const auto* found = std::find_if(record.begin(), record.end(),
+                                   [&](const Dictionary::Entry& entry) { return entry.key.view() == source.listKey; });
+  return found != record.end() && found->value.array() != nullptr;
 }
 
 bool isListFilled(const CategorySource& source, const Stores& stores) {

@@ -36,6 +36,8 @@ struct CategorySource {
   std::string_view headerPrefix{};
   /// The message class of a list's elements.
   std::string_view elementClass{};
+  /// What the metric's record has the list under.
+  std::string_view listKey{};
   /// The metric that changes the source; absent for a placeholder.
   std::optional<std::int64_t> metric{};
 };
@@ -52,6 +54,9 @@ struct CategorySource {
 /// The records that the source's screen shows, one a section; none for a placeholder, and for a kind of metric that has
 /// not come.
 [[nodiscard]] RecordList shownRecords(const CategorySource& source, const Stores& stores);
+
+/// Whether that record of the source's metric changed what the source shows: a list stays where a record has none.
+[[nodiscard]] bool isFilledBy(const CategorySource& source, const Record& record);
 
 /// False while no metric has filled the source's list, which then has nothing or only what stands in for an element.
 /// True for a source that is no list.

@@ -140,7 +140,7 @@ class Run {
       return;
     }
     MetricValidator::shared()->setArrivalObserver([this](std::int64_t metricId) {
-      moment_.noteArrival(metricId);
+      moment_.noteArrival(metricId, MetricValidator::shared()->stores);
       terminal_->setNeedsDisplay();
     });
     showStart(root);

@@ -145,7 +145,7 @@ bool checkLabels(const ShowOptions& options) {
 void tellMissingList(const ShowOptions& options) {
   const Stores& stores = MetricValidator::shared()->stores;
   const CategorySource& source = sourceOf(options.area, options.category);
-  if (source.metric && hasArrived(stores, *source.metric) && !isListFilled(source, stores))
+  if (source.metric && latestRecordOf(stores, *source.metric) != nullptr && !isListFilled(source, stores))
     tellUser("vesk: what fills " + options.area + ", " + options.category + " came, but without this list");
 }
 

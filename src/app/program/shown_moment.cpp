@@ -22,10 +22,11 @@ bool isCommon(const CategorySource& source) {
 
 }  // namespace
 
-void ShownMoment::noteArrival(std::int64_t metricId) {
+void ShownMoment::noteArrival(std::int64_t metricId, const Stores& stores) {
   const Clock::Instant now = clock_.now();
   time_.take(drive_.now(), now);
-  arrivals_.note(metricId, time_.at(now, pace_()).time);
+  if (const Record* record = latestRecordOf(stores, metricId))
+    arrivals_.note(metricId, *record, time_.at(now, pace_()).time);
 }
 
 void ShownMoment::startAnew() {
@@ -57,9 +58,7 @@ void ShownMoment::release() {
 }
 
 std::optional<Arrivals> ShownMoment::arrivals(std::string_view area, std::string_view category) const {
-  std::optional<Arrivals> arrivals = (held_ ? held_->arrivals : arrivals_).of(area, category);
-  if (arrivals && arrivals->count > 0) arrivals->isWithoutList = !isListFilled(sourceOf(area, category), shownStores());
-  return arrivals;
+  return (held_ ? held_->arrivals : arrivals_).of(area, category);
 }
 
 DriveMoment ShownMoment::time() const {

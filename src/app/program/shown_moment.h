@@ -9,6 +9,7 @@
 #include "app/program/drive_time.h"
 #include "app/program/metric_arrivals.h"
 #include "insight/present.h"
+#include "intake/stores.h"
 #include "system/clock.h"
 #include "terminal/view/surroundings.h"
 
@@ -26,7 +27,7 @@ class ShownMoment {
   ~ShownMoment() { release(); }
 
   /// A metric was stored, and the drive has taken it.
-  void noteArrival(std::int64_t metricId);
+  void noteArrival(std::int64_t metricId, const Stores& stores);
   /// Forgets all that came, for a drive that is followed from its start again.
   void startAnew();
   /// The source has gone to a moment so long after the drive's last event.
