@@ -117,7 +117,7 @@ HeardCells::Row* HeardCells::findOrAdd(const HeardKey& key, const OptionalNumber
     return &rows_.emplace_back(heard);
   }
   row = weakest();
-  if (strengthOf(row->level) >= strengthOf(level)) return nullptr;
+  if (key != serving_ && strengthOf(row->level) >= strengthOf(level)) return nullptr;
   digests_[static_cast<std::size_t>(row - rows_.data())] = digestOf(key);
   *row = heard;
   return row;

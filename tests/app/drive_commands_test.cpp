@@ -60,7 +60,8 @@ TEST(DriveCommands, GoOnBehindLinesThatAreNoEvent) {
 }
 
 TEST(DriveCommands, RefuseRulesThatAreNone) {
-  const TemporaryFile rules("# Weak\n\n  lte.rsrp < -110 for 10 s  # for long\n lte.rsrp for 10 s\nevent alert\n");
+  const TemporaryFile rules(
+      "\xEF\xBB\xBF# Weak\n\n  lte.rsrp < -110 for 10 s  # for long\n lte.rsrp for 10 s\nevent alert\n");
   const Finished file = vesk({"timeline", "--rules", rules.path()}, kDrive);
   EXPECT_EQ(file.output, "");
   EXPECT_EQ(file.error, "vesk: " + rules.path() + ":4:11: expected <, <=, >, >=, == or !=, got for\n" +

@@ -234,6 +234,9 @@ TEST_F(PanelsTest, TheTimelineFiltersAndTellsAllFields) {
   EXPECT_EQ(lineWith("stay_ms"), "  stay_ms     10000");
   EXPECT_EQ(lineWith("  to  "), R"(  to          {"channel":5815,"code":338,"cell_id":48906257})");
   EXPECT_TRUE(wentTo_.empty());
+  desk_->resize({60, 12});
+  EXPECT_NE(lineWith("stay_ms"), "") << "what the row does not tell comes first";
+  EXPECT_NE(selectedLine().find("handover"), std::string::npos);
   desk_->press(Key::Enter);
   EXPECT_EQ(wentTo_, std::vector<std::uint64_t>{5});
   desk_->press(Key::Escape);

@@ -318,6 +318,10 @@ TEST_F(PresenterTest, ShowsANoticeForItsTime) {
   desk_->presenter().tell("a pipe has no way back", desk_->now() + std::chrono::seconds(5));
   EXPECT_EQ(desk_->line(9), " a pipe has no way back");
   EXPECT_EQ(desk_->presenter().nextChange(), desk_->now() + std::chrono::seconds(5));
+  desk_->type(U"/");
+  EXPECT_EQ(desk_->line(9).substr(0, 5), " /▏");
+  desk_->press(Key::Escape);
+  EXPECT_EQ(desk_->line(9), " a pipe has no way back");
   desk_->wait(std::chrono::seconds(5));
   EXPECT_EQ(desk_->line(9).substr(0, 7), " ? help");
 }

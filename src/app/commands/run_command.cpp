@@ -222,7 +222,11 @@ class Run {
   /// What was shown stays until the moment that is sought has come.
   void seekBegun(bool isFromStart) {
     isOnTheWay_ = true;
-    if (terminal_ != nullptr) terminal_->setOnTheWay(true);
+    if (terminal_ != nullptr) {
+      terminal_->setOnTheWay(true);
+      // What stands there is of the moment that is left.
+      terminal_->tell({}, false);
+    }
     if (!moment_.isHeld()) moment_.hold();
     OutputLines::setSink(nullptr);
     if (!isFromStart) return;

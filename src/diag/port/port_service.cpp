@@ -123,13 +123,16 @@ bool PortService::sendAndTell(Session& session, EventStream& events) {
     tell(port_.path() + ": " + remark, events);
   for (const std::string& remark : remarks_.take(receiver_.counts()))
     tell(port_.path() + ": " + remark, events);
-  if (session.phase() == Session::Phase::watching) {
-    if (state().phase == PortState::Phase::starting)
-      SystemLog::write("%s: watching the logs of firmware %s", port_.path().c_str(), session.firmware().c_str());
-    hasWatched_ = true;
-    note(session.isSilent() ? PortState::Phase::silent : PortState::Phase::watching);
-  }
+  noteWatching(session);
   return true;
+}
+
+void PortService::noteWatching(const Session& session) {
+  if (session.phase() != Session::Phase::watching) return;
+  if (state().phase == PortState::Phase::starting)
+    SystemLog::write("%s: watching the logs of firmware %s", port_.path().c_str(), session.firmware().c_str());
+  hasWatched_ = true;
+  note(session.isSilent() ? PortState::Phase::silent : PortState::Phase::watching);
 }
 
 bool PortService::readSome(FrameReader& frames, Session& session, const std::stop_token& stop) {
@@ -139,7 +142,7 @@ bool PortService::readSome(FrameReader& frames, Session& session, const std::sto
   while (const std::optional<Frame> frame = frames.next()) {
     if (frame->isSound) {
       take(frame->content, session, stop);
-    } else if (hasWatched_ || session.phase() == Session::Phase::watching) {
+    } else if (hasWatched_) {
       // Before that, it is what a program before this one has left there.
       receiver_.noteDamagedFrame();
       // Known before the events behind it come.
@@ -161,6 +164,8 @@ void PortService::take(std::span<const std::uint8_t> content, Session& session, 
     session.noteEncryptedLog();
   } else if (!packet.content.empty()) {
     session.takeAnswer(packet.content, now);
+    // Known before the first log comes.
+    noteWatching(session);
   }
   for (const Event& event : receiver_.take(packet))
     queue_.add(event, stop);

@@ -82,6 +82,7 @@ class PortService final : public ::corvik::Service {
   [[nodiscard]] Ending watch(const std::stop_token& stop, ::corvik::EventStream& events);
   /// False when the port is gone.
   [[nodiscard]] bool sendAndTell(Session& session, ::corvik::EventStream& events);
+  void noteWatching(const Session& session);
   [[nodiscard]] bool readSome(FrameReader& frames, Session& session, const std::stop_token& stop);
   void take(std::span<const std::uint8_t> content, Session& session, const std::stop_token& stop);
   /// False when a stop was requested.

@@ -46,7 +46,9 @@ void TimelinePanel::keepSelected() {
 }
 
 void TimelinePanel::draw(const Canvas& canvas) {
-  const int detailLines = hasDetails_ ? std::min(canvas.lines() / 2, 12) : 0;
+  // Of the list at least the selected event stays.
+  constexpr int kDetailLines = 12;
+  const int detailLines = hasDetails_ ? std::min(kDetailLines, canvas.lines() - 2) : 0;
   height_ = canvas.lines() - 1 - detailLines;
   refresh();
   std::string head = "Timeline, " + std::to_string(rows_.size());
@@ -67,7 +69,9 @@ void TimelinePanel::draw(const Canvas& canvas) {
 void TimelinePanel::drawDetails(const Canvas& canvas) const {
   canvas.fill(0, Role::PaneHeader);
   canvas.write(1, 0, goToEvent_ ? "Fields; Enter goes to this moment" : "Fields", Role::PaneHeader);
-  const auto fields = fieldsOf(eventOf(rows_[static_cast<std::size_t>(window_.selected())]));
+  auto fields = fieldsOf(eventOf(rows_[static_cast<std::size_t>(window_.selected())]));
+  // Timestamp, number, kind and text, which the event's row tells, come last, where lines may be short.
+  std::rotate(fields.begin(), fields.begin() + 4, fields.end());
   int keyWidth = 0;
   for (const auto& [key, value] : fields)
     keyWidth = std::max(keyWidth, textWidth(key));

@@ -220,7 +220,8 @@ class Renderer {
   void drawHints() {
     const int line = regions_.hints;
     int column = kBarMargin;
-    if (!picture_.notice.empty()) {
+    // What is being typed is to be seen.
+    if (!picture_.notice.empty() && !picture_.isTypingFilter) {
       writeCut(column, line, picture_.notice, Role::Alarm, width());
       return;
     }
