@@ -32,6 +32,8 @@ readme    bsdutils            script
 captures  jq                  jq
 captures  diffutils           cmp
 readme    protobuf-compiler   protoc
+drives    jq                  jq
+drives    diffutils           cmp
 load      time                /usr/bin/time
 load      diffutils           cmp
 page      chromium            chromium
