@@ -5,6 +5,7 @@
 
 #include "insight/summary_form.h"
 #include "insight/text_forms.h"
+#include "values/text_form.h"
 
 namespace vesk::insight {
 
@@ -42,11 +43,6 @@ std::string left(std::string text, std::size_t width) {
 void appendUpTo(std::string& line, std::size_t column, const std::string& text) {
   const std::size_t taken = line.size() + text.size();
   line.append(taken < column ? column - taken : 1, ' ').append(text);
-}
-
-template <class Number>
-std::string counted(Number number, std::string_view one, std::string_view more) {
-  return std::to_string(number) + " " + std::string(number == 1 ? one : more);
 }
 
 /// A day of the calendar.

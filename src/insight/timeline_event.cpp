@@ -6,6 +6,7 @@
 #include "insight/enumeration_names.h"
 #include "insight/json_fields.h"
 #include "insight/text_forms.h"
+#include "values/text_form.h"
 
 namespace vesk::insight {
 
@@ -127,9 +128,7 @@ struct TextWriter {
     return out.empty() ? "on" : out.substr(2);
   }
 
-  std::string operator()(const SimRead& sim) const {
-    return std::to_string(sim.files) + (sim.files == 1 ? " file" : " files");
-  }
+  std::string operator()(const SimRead& sim) const { return counted(sim.files, "file", "files"); }
 
   std::string operator()(const Alert& alert) const {
     if (!alert.value) return alert.rule;

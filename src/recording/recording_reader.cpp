@@ -5,11 +5,12 @@
 #include <unistd.h>
 #include <utility>
 
+#include "values/utf8.h"
+
 namespace vesk {
 
 namespace {
 
-constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 /// How far from the end of a file its last event is looked for.
 constexpr off_t kTail = 65536;
 
@@ -19,7 +20,7 @@ std::string_view asText(std::span<char> line) {
 
 /// What a recording starts with is no part of its first line.
 std::span<char> withoutByteOrderMark(std::span<char> line) {
-  return asText(line).starts_with(kByteOrderMark) ? line.subspan(kByteOrderMark.size()) : line;
+  return line.subspan(byteOrderMarkSize(asText(line)));
 }
 
 bool isBlank(std::string_view line) {

@@ -180,9 +180,8 @@ RecordList shownRecords(const CategorySource& source, const Stores& stores) {
 
 bool isFilledBy(const CategorySource& source, const Record& record) {
   if (source.list == nullptr) return true;
-  const auto* found = std::find_if(record.begin(), record.end(),
-                                   [&](const Dictionary::Entry& entry) { return entry.key.view() == source.listKey; });
-  return found != record.end() && found->value.array() != nullptr;
+  const Value* list = record.find(source.listKey);
+  return list != nullptr && list->array() != nullptr;
 }
 
 bool isListFilled(const CategorySource& source, const Stores& stores) {

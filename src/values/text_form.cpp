@@ -69,6 +69,10 @@ struct TextForm {
 
 }  // namespace
 
+std::string counted(std::uint64_t count, std::string_view one, std::string_view more) {
+  return std::to_string(count) + " " + std::string(count == 1 ? one : more);
+}
+
 void appendDecimal(std::string& out, std::int64_t number) {
   appendInteger(out, number);
 }

@@ -1,7 +1,9 @@
 #pragma once
 
+#include <cstdint>
 #include <span>
 #include <string>
+#include <string_view>
 
 #include "values/value.h"
 
@@ -19,6 +21,9 @@ template <class Shown>
   appendText(out, shown);
   return out;
 }
+
+/// "1 stretch", "2 stretches".
+[[nodiscard]] std::string counted(std::uint64_t count, std::string_view one, std::string_view more);
 
 /// Appends `number` in decimal.
 void appendDecimal(std::string& out, std::int64_t number);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -17,6 +18,12 @@ void appendUtf8(std::string& out, std::string_view bytes);
 
 /// Appends the character of `codePoint`, at most U+10FFFF.
 void appendCodePoint(std::string& out, char32_t codePoint);
+
+/// How many bytes the byte order mark takes that `bytes` starts with; 0 when it starts with none.
+[[nodiscard]] constexpr std::size_t byteOrderMarkSize(std::string_view bytes) {
+  constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+  return bytes.starts_with(kByteOrderMark) ? kByteOrderMark.size() : 0;
+}
 
 /// Whether `codePoint` acts on a terminal instead of being shown: U+0000 to U+001F, U+007F to U+009F.
 [[nodiscard]] constexpr bool isControl(char32_t codePoint) {

@@ -7,6 +7,7 @@
 
 #include "app/output/outcome.h"
 #include "system/file.h"
+#include "values/utf8.h"
 
 namespace vesk {
 
@@ -34,8 +35,7 @@ class RuleReading {
     if (!content) return tell(path + ": " + std::strerror(errno));
     const auto bytes = content->bytes();
     std::string_view rest(reinterpret_cast<const char*>(bytes.data()), bytes.size());
-    constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
-    if (rest.starts_with(kByteOrderMark)) rest.remove_prefix(kByteOrderMark.size());
+    rest.remove_prefix(byteOrderMarkSize(rest));
     for (std::size_t number = 1; !rest.empty(); ++number) {
       const std::string_view line = rest.substr(0, rest.find('\n'));
       rest.remove_prefix(std::min(line.size() + 1, rest.size()));

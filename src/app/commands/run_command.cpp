@@ -26,6 +26,7 @@
 #include "system/timer.h"
 #include "terminal/terminal.h"
 #include "toolkit/application.h"
+#include "values/text_form.h"
 
 namespace vesk {
 
@@ -167,9 +168,7 @@ class Run {
     // What only the diagnostic lines have told is seen by nobody any more.
     if (isHeadless_ || faults_ == 0) return;
     tellUser(firstFault_);
-    if (faults_ == 1) return;
-    const std::string more = std::to_string(faults_ - 1) + (faults_ == 2 ? " more fault" : " more faults");
-    tellUser("vesk: " + more + "; --headless tells each");
+    if (faults_ > 1) tellUser("vesk: " + counted(faults_ - 1, "more fault", "more faults") + "; --headless tells each");
   }
 
   Surroundings surroundings(Application& application) {
@@ -247,7 +246,7 @@ class Run {
   }
 
   void showMoment() {
-    insight_.setLater(moment_.sinceLastEvent());
+    growOlder();
     if (isHeld_) {
       moment_.hold();
     } else {

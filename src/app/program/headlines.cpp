@@ -7,10 +7,23 @@
 #include "insight/readings.h"
 #include "insight/umts_chain.h"
 #include "screens/detail_text.h"
+#include "values/text_form.h"
 
 namespace vesk {
 
 namespace {
+
+struct Headline {
+  std::string text;
+  std::optional<double> value;
+};
+
+/// The RSCP of a receive chain of UMTS, which may have to be reckoned from two keys.
+std::optional<Headline> headlineOfChain(const Record& chain) {
+  const auto rscp = insight::umtsChainOf(chain).rscp;
+  if (!rscp) return std::nullopt;
+  return Headline{insight::levelReading(insight::kRscp, *rscp).text, *rscp};
+}
 
 /// What tells most about the records of a message class.
 struct Telling {
@@ -18,6 +31,8 @@ struct Telling {
   std::string_view key;
   /// What stands before the value; empty where the value's reading says it all, and stands in its place.
   std::string_view prefix{};
+  /// Null where the key tells it.
+  std::optional<Headline> (*reckon)(const Record& record) = nullptr;
 };
 
 constexpr std::array kTelling{
@@ -37,6 +52,7 @@ constexpr std::array kTelling{
     Telling{"KCellularWcdmaRrcConnectionState", "state"},
     Telling{"KCellularWcdmaRrcConfiguration", "drx_cycle_length_ms"},
     Telling{"KCellularWcdmaCellInfo", "psc", "PSC "},
+    Telling{.messageClass = "RxInfo", .key = {}, .reckon = headlineOfChain},
     Telling{"LteCellMeasResult", "rsrp"},
     Telling{"UtraCellMeasResult", "rscp"},
     Telling{"GsmCellMeasResult", "rxlev"},
@@ -50,12 +66,8 @@ constexpr std::array kTelling{
     Telling{"LteNcellMeas", "rsrp"},
 };
 
-struct Headline {
-  std::string text;
-  std::optional<double> value;
-};
-
 std::optional<Headline> headlineOf(const Telling& telling, const Record& record) {
+  if (telling.reckon != nullptr) return telling.reckon(record);
   for (const Dictionary::Entry& entry : record) {
     if (entry.key.view() != telling.key) continue;
     if (!telling.prefix.empty()) {
@@ -68,30 +80,22 @@ std::optional<Headline> headlineOf(const Telling& telling, const Record& record)
   return std::nullopt;
 }
 
-/// The RSCP of a receive chain of UMTS, which may have to be reckoned from two keys.
-std::optional<Headline> headlineOfChain(const Record& chain) {
-  const auto rscp = insight::umtsChainOf(chain).rscp;
-  if (!rscp) return std::nullopt;
-  return Headline{insight::levelReading(insight::kRscp, *rscp).text, *rscp};
-}
-
 }  // namespace
 
 std::string headlineOf(const CategorySource& source, const Stores& stores) {
   const RecordList records = shownRecords(source, stores);
   const std::string_view messageClass = messageClassOf(source);
   std::optional<Headline> greatest;
-  const auto take = [&](std::optional<Headline> headline) {
-    if (headline && (!greatest || headline->value > greatest->value)) greatest = std::move(headline);
-  };
-  for (const Record& record : records) {
-    if (messageClass == "RxInfo") take(headlineOfChain(record));
-    for (const Telling& telling : kTelling)
-      if (telling.messageClass == messageClass) take(headlineOf(telling, record));
+  for (const Telling& telling : kTelling) {
+    if (telling.messageClass != messageClass) continue;
+    for (const Record& record : records) {
+      auto headline = headlineOf(telling, record);
+      if (headline && (!greatest || headline->value > greatest->value)) greatest = std::move(headline);
+    }
   }
   if (greatest) return greatest->text;
   if (source.kind != SourceKind::storeList || records.size() == 0) return {};
-  return std::to_string(records.size()) + (records.size() == 1 ? " entry" : " entries");
+  return counted(records.size(), "entry", "entries");
 }
 
 std::string readingOfRow(const CategorySource& source, const Stores& stores, IndexPath at, std::string_view name) {

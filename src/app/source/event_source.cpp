@@ -14,6 +14,7 @@
 #include "handset/handset_service.h"
 #include "recording/record_file.h"
 #include "system/main_queue.h"
+#include "values/text_form.h"
 
 namespace vesk {
 
@@ -120,9 +121,7 @@ EventSource makeReplaySource(const SourceOptions& options, const Clock& clock, S
 
 ShownState stateOfReplay(const corvik::PlaybackState& state, bool isLive) {
   using Phase = corvik::PlaybackState::Phase;
-  std::string bad;
-  if (state.badLines > 0)
-    bad = ", " + std::to_string(state.badLines) + (state.badLines == 1 ? " bad line" : " bad lines");
+  const std::string bad = state.badLines > 0 ? ", " + counted(state.badLines, "bad line", "bad lines") : "";
   switch (state.phase) {
     case Phase::notStarted:
     case Phase::waitingForInput:
