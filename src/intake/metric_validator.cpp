@@ -81,6 +81,7 @@ bool MetricValidator::validateMetric(const Dictionary& event) {
 
 TakenEvent MetricValidator::take(const Dictionary& event) {
   const Value* id = event.find(metricIDKey);
+  // In its parts: to copy an optional just after its two parts were written stalls the processor.
   metricID.reset();
   if (id != nullptr)
     if (const auto number = id->integer()) metricID = *number;
